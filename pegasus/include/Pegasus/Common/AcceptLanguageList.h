@@ -1,0 +1,10 @@
+#pragma once
+
+#include <Pegasus/Common/Config.h>
+
+PEGASUS_NAMESPACE_BEGIN
+
+/// Placeholder for the language list of a request or response; always empty.
+class PEGASUS_COMMON_LINKAGE AcceptLanguageList {};
+
+PEGASUS_NAMESPACE_END

@@ -1,0 +1,30 @@
+#pragma once
+
+#include <Pegasus/Common/Config.h>
+
+PEGASUS_NAMESPACE_BEGIN
+
+enum CIMType {
+  CIMTYPE_BOOLEAN = 0,
+  CIMTYPE_UINT8 = 1,
+  CIMTYPE_SINT8 = 2,
+  CIMTYPE_UINT16 = 3,
+  CIMTYPE_SINT16 = 4,
+  CIMTYPE_UINT32 = 5,
+  CIMTYPE_SINT32 = 6,
+  CIMTYPE_UINT64 = 7,
+  CIMTYPE_SINT64 = 8,
+  CIMTYPE_REAL32 = 9,
+  CIMTYPE_REAL64 = 10,
+  CIMTYPE_CHAR16 = 11,
+  CIMTYPE_STRING = 12,
+  CIMTYPE_DATETIME = 13,
+  CIMTYPE_REFERENCE = 14,
+  CIMTYPE_OBJECT = 15,
+  CIMTYPE_INSTANCE = 16
+};
+
+/// The keyword of the type in class declarations, such as "uint8".
+PEGASUS_COMMON_LINKAGE const char* cimTypeToString(const CIMType type);
+
+PEGASUS_NAMESPACE_END
