@@ -1,0 +1,8 @@
+#include "hostinfo.h"
+
+int hostInit(void) {
+  hostFileSystemCount();
+  hostNetworkPortCount();
+  hostIPEndpointCount();
+  return 0;
+}
