@@ -1,0 +1,102 @@
+#include "engine/Registry.h"
+
+#include "diagnostics/debug.h"
+
+#include <string_view>
+#include <unordered_map>
+#include <vector>
+
+namespace {
+
+/// Objects in order of registration, with the first of each name at hand.
+template <class T>
+class NamedList {
+ public:
+  T* find(std::string_view name) const {
+    const auto found = byName_.find(name);
+    return found == byName_.end() ? nullptr : found->second;
+  }
+
+  T* add(std::unique_ptr<T> object) {
+    objects_.push_back(std::move(object));
+    T* added = objects_.back().get();
+    byName_.emplace(added->getName(), added);
+    return added;
+  }
+
+  void clear() {
+    byName_.clear();
+    // In order of registration; the objects are out of the list while they go.
+    std::vector<std::unique_ptr<T>> going = std::move(objects_);
+    objects_.clear();
+    for (auto& object : going) object.reset();
+  }
+
+  const std::vector<std::unique_ptr<T>>& objects() const { return objects_; }
+
+ private:
+  std::vector<std::unique_ptr<T>> objects_;
+  std::unordered_map<std::string_view, T*> byName_;  // the names belong to the objects
+};
+
+NamedList<ProviderDefModule>& modules() {
+  static NamedList<ProviderDefModule> list;
+  return list;
+}
+
+NamedList<ProviderDefFunction>& functions() {
+  static NamedList<ProviderDefFunction> list;
+  return list;
+}
+
+std::vector<std::unique_ptr<ProviderDefFunctionCall>>& initCalls() {
+  static std::vector<std::unique_ptr<ProviderDefFunctionCall>> list;
+  return list;
+}
+
+}  // namespace
+
+ProviderDefModule* getModule(const std::string& name) {
+  ProviderDefModule* module = modules().find(name);
+  // Not const on purpose: this overload writes to standard output.
+  static char miss[] = "Can not find module\n";
+  if (module == nullptr) debug(9, miss);
+  return module;
+}
+
+ProviderDefFunction* getFunction(const std::string& name) {
+  ProviderDefFunction* function = functions().find(name);
+  static char miss[] = "Can not find a function\n";
+  if (function == nullptr) debug(9, miss);
+  return function;
+}
+
+ProviderDefModule* registerModule(std::unique_ptr<ProviderDefModule> module) {
+  return modules().add(std::move(module));
+}
+
+ProviderDefFunction* registerFunction(std::unique_ptr<ProviderDefFunction> function) {
+  return functions().add(std::move(function));
+}
+
+ProviderDefFunctionCall* keepInitCall(std::unique_ptr<ProviderDefFunctionCall> call) {
+  initCalls().push_back(std::move(call));
+  return initCalls().back().get();
+}
+
+size_t functionCount() { return functions().objects().size(); }
+
+void replaceModule(const ProviderDefModule* from, ProviderDefModule* to, size_t first) {
+  const auto& all = functions().objects();
+  for (size_t i = first; i < all.size(); ++i) {
+    if (all[i]->getModule() == from) all[i]->setModule(to);
+  }
+}
+
+void releaseFunctions() { functions().clear(); }
+
+void releaseModules() {
+  modules().clear();
+  releaseDefinitions();
+  initCalls().clear();
+}
