@@ -1,0 +1,241 @@
+#include <gmock/gmock.h>
+#include <mntent.h>
+#include <sys/statvfs.h>
+
+#include <algorithm>
+#include <climits>
+#include <cmath>
+#include <set>
+
+#include "tests/examples/hostinfo/FakeHost.h"
+#include "tests/examples/hostinfo/HostinfoLibrary.h"
+
+using testing::ElementsAre;
+using testing::IsEmpty;
+using testing::SizeIs;
+
+namespace {
+
+// What the C library's own reader of the mount table finds.
+std::set<std::string> mountPointsWithBlocks() {
+  std::set<std::string> result;
+  FILE* file = setmntent("/proc/self/mounts", "r");
+  while (const mntent* entry = getmntent(file)) {
+    struct statvfs space {};
+    const bool real = statvfs(entry->mnt_dir, &space) == 0 && space.f_blocks != 0;
+    if (real && std::strcmp(entry->mnt_type, "autofs") != 0) result.insert(entry->mnt_dir);
+  }
+  endmntent(file);
+  return result;
+}
+
+long kib(fsblkcnt_t blocks, const struct statvfs& space) {
+  const long double value = std::floor(static_cast<long double>(blocks) * space.f_frsize / 1024);
+  return static_cast<long>(std::min<long double>(value, LONG_MAX));
+}
+
+TEST(FileSystems, AreThoseOfTheMountTable) {
+  HostinfoLibrary library;
+  const auto names = library.textsOfAll("hostFileSystemCount", "hostFileSystemName");
+  const std::set<std::string> distinct(names.begin(), names.end());
+  EXPECT_EQ(distinct, mountPointsWithBlocks());
+  EXPECT_EQ(distinct.size(), names.size());
+}
+
+TEST(FileSystems, HaveTheSizesThatStatvfsTells) {
+  HostinfoLibrary library;
+  const int count = library.count("hostFileSystemCount");
+  ASSERT_GT(count, 0);
+  for (int i = 0; i < count; ++i) {
+    const std::string name = library.text("hostFileSystemName", i);
+    SCOPED_TRACE(name);
+    struct statvfs space {};
+    ASSERT_EQ(statvfs(name.c_str(), &space), 0);
+    EXPECT_EQ(library.longInteger("hostFileSystemSizeKiB", i), kib(space.f_blocks, space));
+    const long free = library.longInteger("hostFileSystemFreeKiB", i);
+    EXPECT_NEAR(static_cast<double>(free), static_cast<double>(kib(space.f_bavail, space)), 262144);
+    const auto used = static_cast<double>(space.f_blocks - space.f_bfree);
+    const double percent = 100 * used / (used + static_cast<double>(space.f_bavail));
+    EXPECT_NEAR(library.integer("hostFileSystemPercentUsed", i), percent, 1.5);
+    EXPECT_EQ(library.integer("hostFileSystemReadOnly", i) != 0, (space.f_flag & ST_RDONLY) != 0);
+  }
+}
+
+TEST(FileSystems, AMountOverAnotherReplacesIt) {
+  FakeHost host;
+  const std::string a = host.makeDirectory("a");
+  const std::string b = host.makeDirectory("b");
+  host.writeMounts("/dev/one " + a + " ext4 rw 0 0\n/dev/two " + b + " xfs rw 0 0\n/dev/three " +
+                   a + " vfat ro 0 0\n");
+  HostinfoLibrary library;
+  EXPECT_THAT(library.textsOfAll("hostFileSystemCount", "hostFileSystemName"), ElementsAre(b, a));
+  EXPECT_EQ(library.text("hostFileSystemDevice", 1), "/dev/three");
+  EXPECT_EQ(library.text("hostFileSystemType", 1), "vfat");
+  EXPECT_EQ(library.integer("hostFileSystemReadOnly", 0), 0);
+  EXPECT_EQ(library.integer("hostFileSystemReadOnly", 1), 1);
+}
+
+TEST(FileSystems, AnEscapedMountPointIsFoundAndTold) {
+  FakeHost host;
+  const std::string directory = host.makeDirectory("my disk\t#1\\2");
+  host.writeMounts("/dev/x " + host.makeDirectory("my") + "\\040disk\\011#1\\1342 ext4 rw 0 0\n");
+  HostinfoLibrary library;
+  EXPECT_THAT(library.textsOfAll("hostFileSystemCount", "hostFileSystemName"),
+              ElementsAre(directory));
+}
+
+TEST(FileSystems, AMountPointThatIsNoUtf8IsMeasuredUnderItsRealName) {
+  FakeHost host;
+  const std::string directory = host.makeDirectory("caf\xE9");
+  host.writeMounts("/dev/x " + directory + " ext4 rw 0 0\n");
+  HostinfoLibrary library;
+  ASSERT_EQ(library.count("hostFileSystemCount"), 1);
+  EXPECT_EQ(library.text("hostFileSystemName", 0),
+            directory.substr(0, directory.size() - 1) + "\xEF\xBF\xBD");
+  EXPECT_GT(library.longInteger("hostFileSystemSizeKiB", 0), 0);
+}
+
+struct IgnoredCase {
+  const char* name;
+  std::string mounts;
+};
+
+class IgnoredMounts : public testing::TestWithParam<IgnoredCase> {};
+
+TEST_P(IgnoredMounts, DoNotHideTheOthers) {
+  FakeHost host;
+  host.writeMounts(GetParam().mounts + "good / ext4 rw 0 0\n");
+  HostinfoLibrary library;
+  EXPECT_THAT(library.textsOfAll("hostFileSystemCount", "hostFileSystemDevice"),
+              ElementsAre("good"));
+}
+
+const std::string kDeepPath = [] {
+  std::string path;
+  for (int i = 0; i < 600; ++i) path += "/.";  // "/" for the kernel, too long for a buffer
+  return path;
+}();
+
+INSTANTIATE_TEST_SUITE_P(
+    Lines, IgnoredMounts,
+    testing::Values(IgnoredCase{"NoBlocks", "proc /proc proc rw 0 0\n"},
+                    IgnoredCase{"Automounter", "map /tmp autofs rw 0 0\n"},
+                    IgnoredCase{"NotThere", "x /no/such/directory ext4 rw 0 0\n"},
+                    IgnoredCase{"EmptyLine", "\n"}, IgnoredCase{"DeviceOnly", "/dev/x\n"},
+                    IgnoredCase{"NoOptions", "/dev/x /tmp ext4\n"},
+                    IgnoredCase{"OnlyBlanks", "        \n"},
+                    IgnoredCase{"NulByte", std::string("/dev/x\0 /tmp ext4 rw\n", 21)},
+                    IgnoredCase{"NameTooLong", "/dev/x " + kDeepPath + " ext4 rw 0 0\n"},
+                    IgnoredCase{"LineTooLong",
+                                "/dev/x /tmp ext4 " + std::string(70000, 'o') + " 0 0\n"}),
+    [](const auto& testCase) { return testCase.param.name; });
+
+TEST(FileSystems, AnUnfinishedLastLineDoesNotCount) {
+  FakeHost host;
+  host.writeMounts("good / ext4 rw 0 0\ncut /tmp ext4 r");
+  HostinfoLibrary library;
+  EXPECT_EQ(library.count("hostFileSystemCount"), 1);
+}
+
+TEST(FileSystems, NoMountTableMeansNoInstance) {
+  FakeHost host;
+  HostinfoLibrary library;
+  EXPECT_EQ(library.count("hostFileSystemCount"), 0);
+}
+
+struct CleanCase {
+  const char* name;
+  std::string inFile, told;
+};
+
+class CleanText : public testing::TestWithParam<CleanCase> {};
+
+TEST_P(CleanText, IsUtf8ThatXmlCanCarry) {
+  FakeHost host;
+  host.writeMounts(GetParam().inFile + " / ext4 rw 0 0\n");
+  HostinfoLibrary library;
+  ASSERT_EQ(library.count("hostFileSystemCount"), 1);
+  EXPECT_EQ(library.text("hostFileSystemDevice", 0), GetParam().told);
+}
+
+const std::string kBad = "\xEF\xBF\xBD";  // U+FFFD
+
+std::string repeated(const std::string& text, int times) {
+  std::string result;
+  for (int i = 0; i < times; ++i) result += text;
+  return result;
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Devices, CleanText,
+    testing::Values(CleanCase{"Escapes", "\\040\\134040\\", " \\040\\"},
+                    CleanCase{"NoEscape", "\\04\\08x\\400\\000", "\\04\\08x\\400\\000"},
+                    CleanCase{"TwoToFourBytes", "\xC3\xA9\xE2\x82\xAC\xF0\x9F\x98\x80",
+                              "\xC3\xA9\xE2\x82\xAC\xF0\x9F\x98\x80"},
+                    CleanCase{"EscapedUtf8", "\\303\\251", "\xC3\xA9"},
+                    CleanCase{"LoneLead", "\xC3", kBad},
+                    CleanCase{"LeadThenText", "\xE2\x82z", kBad + kBad + "z"},
+                    CleanCase{"LoneContinuation", "\x80z", kBad + "z"},
+                    CleanCase{"Overlong", "\xC0\xAF", kBad + kBad},
+                    CleanCase{"OverlongThree", "\xE0\x80\xAF", kBad + kBad + kBad},
+                    CleanCase{"Surrogate", "\xED\xA0\x80", kBad + kBad + kBad},
+                    CleanCase{"BeyondUnicode", "\xF4\x90\x80\x80", kBad + kBad + kBad + kBad},
+                    CleanCase{"ControlCharacter", "a\\001b\\011c", "a" + kBad + "b\tc"},
+                    CleanCase{"NotACharacter", "\xEF\xBF\xBF", kBad + kBad + kBad},
+                    CleanCase{"PercentSigns", "%n%s%99999d", "%n%s%99999d"},
+                    CleanCase{"CutAtTheBuffer", std::string(5000, 'x'), std::string(1023, 'x')},
+                    CleanCase{"CutBetweenCharacters", "x" + repeated("\xE2\x82\xAC", 400),
+                              "x" + repeated("\xE2\x82\xAC", 340)},
+                    CleanCase{"GrowingWhenCleaned", std::string(1023, '\xFF'),
+                              repeated(kBad, 341)}),
+    [](const auto& testCase) { return testCase.param.name; });
+
+class MountOptions : public testing::Test {
+ protected:
+  std::string bytesFor(const std::string& options) {
+    host_.writeMounts("x / ext4 " + options + " 0 0\n");
+    EXPECT_EQ(library_.count("hostFileSystemCount"), 1);
+    return library_.bytes("hostFileSystemMountOptions", 0);
+  }
+  std::vector<std::string> textsFor(const std::string& options) {
+    bytesFor(options);
+    return library_.texts("hostFileSystemMountOptions", 0);
+  }
+
+  FakeHost host_;
+  HostinfoLibrary library_;
+};
+
+TEST_F(MountOptions, LieAsTheProviderReadsThem) {
+  const std::string bytes = bytesFor("rw,nosuid,x=1");
+  EXPECT_EQ(bytes.substr(0, 8), std::string("\3\0\0\0\3\0\0\0", 8));
+  EXPECT_EQ(bytes.substr(8, 11), std::string("\1\0\0\0\2\0\0\0rw\0", 11));
+  EXPECT_EQ(bytes.substr(8 + 35, 15), std::string("\1\0\0\0\6\0\0\0nosuid\0", 15));
+  EXPECT_EQ(bytes.substr(8 + 35 + 39, 12), std::string("\1\0\0\0\3\0\0\0x=1\0", 12));
+}
+
+TEST_F(MountOptions, ThousandsFillTheBufferAndNoMore) {
+  std::string options = "rw";
+  for (int i = 0; i < 5000; ++i) options += ",o" + std::to_string(1000 + i);
+  const auto texts = textsFor(options);
+  // 8 bytes, then 35 for "rw" and 38 for each other, the last without its 24 bytes of gap.
+  EXPECT_THAT(texts, SizeIs(1 + (1024 - 8 - 35 + 24) / 38));
+  EXPECT_EQ(texts.back(), "o1025");
+}
+
+TEST_F(MountOptions, OneThatDoesNotFitLeavesRoomForTheOthers) {
+  EXPECT_THAT(textsFor(std::string(1007, 'l')), ElementsAre(std::string(1007, 'l')));
+  EXPECT_THAT(textsFor(std::string(1008, 'l') + ",rw"), ElementsAre("rw"));
+  EXPECT_THAT(textsFor("ro," + std::string(5000, 'l') + ",sync"), ElementsAre("ro", "sync"));
+}
+
+TEST_F(MountOptions, AreUnescapedAfterTheSplit) {
+  EXPECT_THAT(textsFor("a\\054b,,c\\040d,ro\\040"), ElementsAre("a,b", "c d", "ro "));
+  EXPECT_EQ(library_.integer("hostFileSystemReadOnly", 0), 0);
+}
+
+TEST_F(MountOptions, AnEmptyFieldIsAnEmptyArray) {
+  EXPECT_THAT(textsFor(""), IsEmpty());
+}
+
+}  // namespace

@@ -1,0 +1,172 @@
+#include <gmock/gmock.h>
+#include <ifaddrs.h>
+#include <net/if.h>
+#include <netpacket/packet.h>
+#include <sys/ioctl.h>
+#include <sys/socket.h>
+#include <unistd.h>
+
+#include <climits>
+#include <cstdio>
+#include <map>
+
+#include "tests/examples/hostinfo/FakeHost.h"
+#include "tests/examples/hostinfo/HostinfoLibrary.h"
+
+using testing::ElementsAre;
+using testing::ElementsAreArray;
+
+namespace {
+
+// Names by interface index, in that order.
+std::vector<std::string> kernelNames() {
+  std::map<unsigned, std::string> byIndex;
+  struct if_nameindex* all = if_nameindex();
+  for (struct if_nameindex* each = all; each->if_name != nullptr; ++each) {
+    byIndex[each->if_index] = each->if_name;
+  }
+  if_freenameindex(all);
+  std::vector<std::string> result;
+  for (const auto& [index, name] : byIndex) result.push_back(name);
+  return result;
+}
+
+ifreq ask(unsigned long request, const std::string& name) {
+  ifreq answer{};
+  name.copy(answer.ifr_name, IFNAMSIZ - 1);
+  const int socketNumber = socket(AF_INET, SOCK_DGRAM, 0);
+  EXPECT_EQ(ioctl(socketNumber, request, &answer), 0) << name;
+  close(socketNumber);
+  return answer;
+}
+
+std::map<std::string, std::string> linkAddresses() {
+  std::map<std::string, std::string> result;
+  ifaddrs* all = nullptr;
+  EXPECT_EQ(getifaddrs(&all), 0);
+  for (const ifaddrs* each = all; each != nullptr; each = each->ifa_next) {
+    if (each->ifa_addr == nullptr || each->ifa_addr->sa_family != AF_PACKET) continue;
+    sockaddr_ll link{};
+    std::memcpy(&link, each->ifa_addr, sizeof link);
+    std::string& text = result[each->ifa_name];
+    for (int i = 0; i < link.sll_halen && i < 8; ++i) {
+      char byte[4];
+      std::snprintf(byte, sizeof byte, i == 0 ? "%02x" : ":%02x", link.sll_addr[i]);
+      text += byte;
+    }
+  }
+  freeifaddrs(all);
+  return result;
+}
+
+TEST(NetworkPorts, AreTheKernelsInTheKernelsOrder) {
+  HostinfoLibrary library;
+  EXPECT_THAT(library.textsOfAll("hostNetworkPortCount", "hostNetworkPortName"),
+              ElementsAreArray(kernelNames()));
+}
+
+TEST(NetworkPorts, TellWhatSystemCallsTell) {
+  HostinfoLibrary library;
+  const auto addresses = linkAddresses();
+  const int count = library.count("hostNetworkPortCount");
+  ASSERT_GT(count, 0);
+  for (int i = 0; i < count; ++i) {
+    const std::string name = library.text("hostNetworkPortName", i);
+    SCOPED_TRACE(name);
+    EXPECT_EQ(library.integer("hostNetworkPortMTU", i), ask(SIOCGIFMTU, name).ifr_mtu);
+    EXPECT_EQ(library.integer("hostNetworkPortUp", i) != 0,
+              (ask(SIOCGIFFLAGS, name).ifr_flags & IFF_UP) != 0);
+    EXPECT_EQ(library.text("hostNetworkPortCurrentAddress", i), addresses.at(name));
+    EXPECT_EQ(library.integers("hostNetworkPortTraffic", i).size(), 4u);
+  }
+}
+
+class FakePorts : public testing::Test {
+ protected:
+  void attribute(const std::string& port, const std::string& name, const std::string& text) {
+    host_.write("/sys/class/net/" + port + "/" + name, text);
+  }
+
+  FakeHost host_;
+  HostinfoLibrary library_;
+};
+
+TEST_F(FakePorts, AreSortedByIndexAndSkipWhatIsNone) {
+  attribute("zeta", "ifindex", "2\n");
+  attribute("alpha", "ifindex", "10\n");
+  attribute("nothing", "mtu", "1500\n");
+  attribute("odd", "ifindex", "none\n");
+  host_.write("/sys/class/net/bonding_masters", "bond0\n");
+  EXPECT_THAT(library_.textsOfAll("hostNetworkPortCount", "hostNetworkPortName"),
+              ElementsAre("zeta", "alpha"));
+}
+
+TEST_F(FakePorts, ANameIsToldAsUtf8) {
+  attribute("p\xFF%s", "ifindex", "1\n");
+  EXPECT_THAT(library_.textsOfAll("hostNetworkPortCount", "hostNetworkPortName"),
+              ElementsAre("p\xEF\xBF\xBD%s"));
+}
+
+TEST_F(FakePorts, AnAddressThatWasSetIsNotPermanent) {
+  for (const char* port : {"real", "made", "mute"}) {
+    attribute(port, "address", "02:00:00:00:00:01\n");
+  }
+  attribute("real", "ifindex", "1\n");
+  attribute("real", "addr_assign_type", "0\n");
+  attribute("made", "ifindex", "2\n");
+  attribute("made", "addr_assign_type", "3\n");
+  attribute("mute", "ifindex", "3\n");
+  EXPECT_THAT(library_.textsOfAll("hostNetworkPortCount", "hostNetworkPortPermanentAddress"),
+              ElementsAre("02:00:00:00:00:01", "", ""));
+  EXPECT_EQ(library_.text("hostNetworkPortCurrentAddress", 1), "02:00:00:00:00:01");
+}
+
+struct NumberCase {
+  const char* name;
+  const char* text;
+  int expected;
+};
+
+class PortNumbers : public FakePorts, public testing::WithParamInterface<NumberCase> {};
+
+TEST_P(PortNumbers, StayInTheRangeOfInt) {
+  attribute("p", "ifindex", "1\n");
+  attribute("p", "speed", GetParam().text);
+  attribute("p", "statistics/rx_packets", GetParam().text);
+  ASSERT_EQ(library_.count("hostNetworkPortCount"), 1);
+  EXPECT_EQ(library_.integer("hostNetworkPortSpeedMbps", 0), GetParam().expected);
+  EXPECT_THAT(library_.integers("hostNetworkPortTraffic", 0),
+              ElementsAre(0, 0, GetParam().expected, 0));
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Texts, PortNumbers,
+    testing::Values(NumberCase{"Plain", "1000\n", 1000}, NumberCase{"NoNewline", "1000", 1000},
+                    NumberCase{"NoLink", "-1\n", 0},
+                    NumberCase{"LargestInt", "2147483647\n", INT_MAX},
+                    NumberCase{"BeyondInt", "2147483648\n", INT_MAX},
+                    NumberCase{"Unsigned64", "18446744073709551615\n", INT_MAX},
+                    NumberCase{"Beyond64", "99999999999999999999999\n", INT_MAX},
+                    NumberCase{"Empty", "", 0}, NumberCase{"Text", "unknown\n", 0}),
+    [](const auto& testCase) { return testCase.param.name; });
+
+TEST_F(FakePorts, BytesAreToldInKiBAndFlagsInHexadecimal) {
+  attribute("p", "ifindex", "1\n");
+  attribute("p", "flags", "0x1043\n");
+  attribute("p", "statistics/rx_bytes", "10240\n");
+  attribute("p", "statistics/tx_bytes", "2047\n");
+  attribute("q", "ifindex", "2\n");
+  attribute("q", "flags", "0x1042\n");
+  ASSERT_EQ(library_.count("hostNetworkPortCount"), 2);
+  EXPECT_EQ(library_.integer("hostNetworkPortUp", 0), 1);
+  EXPECT_EQ(library_.integer("hostNetworkPortUp", 1), 0);
+  EXPECT_EQ(library_.bytes("hostNetworkPortTraffic", 0).substr(0, 40),
+            std::string("\2\0\0\0\4\0\0\0"
+                        "\0\0\0\0\x0A\0\0\0"
+                        "\0\0\0\0\1\0\0\0"
+                        "\0\0\0\0\0\0\0\0"
+                        "\0\0\0\0\0\0\0\0",
+                        40));
+}
+
+}  // namespace
