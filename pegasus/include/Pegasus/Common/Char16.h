@@ -7,15 +7,15 @@ PEGASUS_NAMESPACE_BEGIN
 /// One UTF-16 code unit.
 class PEGASUS_COMMON_LINKAGE Char16 {
  public:
-  Char16() : unit_(0) {}
-  Char16(Uint16 x) : unit_(x) {}
+  constexpr Char16() : unit_(0) {}
+  constexpr Char16(Uint16 x) : unit_(x) {}
 
   Char16& operator=(Uint16 x) {
     unit_ = x;
     return *this;
   }
 
-  operator Uint16() const { return unit_; }
+  constexpr operator Uint16() const { return unit_; }
 
  private:
   Uint16 unit_;

@@ -8,6 +8,7 @@
 PEGASUS_NAMESPACE_BEGIN
 
 class String;
+struct EmptyString;
 
 /// Owns a NUL-terminated UTF-8 copy of a String; null by default. The pointer that it converts to
 /// lives as long as this object, which String::getCString() returns by value.
@@ -91,6 +92,7 @@ class PEGASUS_COMMON_LINKAGE String {
   static Boolean equalNoCase(const String& s1, const String& s2);
 
  private:
+  friend struct EmptyString;
   struct Rep;
   static Rep* allocate(Uint32 capacity);
   static Rep* copyOf(const Char16* units, Uint32 size, Uint32 capacity);

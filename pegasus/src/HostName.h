@@ -1,0 +1,10 @@
+#pragma once
+
+#include <Pegasus/Common/String.h>
+
+PEGASUS_NAMESPACE_BEGIN
+
+/// A dotted host name or IPv4 address, or an IPv6 address in brackets, then an optional port.
+bool isLegalHost(const String& host);
+
+PEGASUS_NAMESPACE_END
