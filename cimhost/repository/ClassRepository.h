@@ -1,5 +1,7 @@
 #pragma once
 
+#include "cimhost/repository/QualifierScope.h"
+
 #include <Pegasus/Common/CIMClass.h>
 #include <Pegasus/Common/CIMName.h>
 #include <Pegasus/Common/CIMPropertyList.h>
@@ -29,17 +31,22 @@ class ClassRepository {
 
   /// Adds a class as declared: own features only, superclass by name. Resolves inheritance at once;
   /// the superclass must be there (else CIM_ERR_INVALID_SUPERCLASS). A name that exists already in
-  /// the namespace is CIM_ERR_ALREADY_EXISTS.
+  /// the namespace is CIM_ERR_ALREADY_EXISTS, another fault CIM_ERR_INVALID_PARAMETER; all three are
+  /// ClassDeclarationError, which tells the part at fault. A qualifier without any flavor has that
+  /// of its declaration. `declared` is not kept; one that was refused leaves no trace.
   void addClass(const Pegasus::CIMNamespaceName& nameSpace, const Pegasus::CIMClass& declared);
 
-  /// Declares a qualifier: default value and flavor for the whole namespace.
+  /// Declares a qualifier for classes that are added to the namespace from now on: type, default
+  /// value, flavor and the QualifierScope bits of the elements on which it may stand. Replaces a
+  /// standard qualifier and an earlier declaration.
   void addQualifier(const Pegasus::CIMNamespaceName& nameSpace,
-                    const Pegasus::CIMQualifier& declaration);
+                    const Pegasus::CIMQualifier& declaration,
+                    unsigned scope = QualifierScope::kAny);
 
   bool hasNamespace(const Pegasus::CIMNamespaceName& nameSpace) const;
   std::vector<Pegasus::CIMNamespaceName> namespaces() const;
 
-  /// The declaration of a qualifier, or an uninitialized handle.
+  /// The declaration of a qualifier (a copy), or an uninitialized handle.
   Pegasus::CIMQualifier findQualifier(const Pegasus::CIMNamespaceName& nameSpace,
                                       const Pegasus::CIMName& name) const;
 
@@ -58,7 +65,7 @@ class ClassRepository {
   std::vector<Pegasus::CIMName> subclassNames(const Pegasus::CIMNamespaceName& nameSpace,
                                               const Pegasus::CIMName& name, bool deep) const;
 
-  /// True when `name` is `ancestor` or inherits from it.
+  /// True when `name` is `ancestor` or inherits from it; false when there is no such class.
   bool isSubclass(const Pegasus::CIMNamespaceName& nameSpace, const Pegasus::CIMName& name,
                   const Pegasus::CIMName& ancestor) const;
 
