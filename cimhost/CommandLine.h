@@ -1,0 +1,46 @@
+#pragma once
+
+#include "cimhost/output/ResultWriter.h"
+
+#include <Pegasus/Common/CIMObjectPath.h>
+#include <Pegasus/Common/CIMPropertyList.h>
+
+#include <optional>
+#include <ostream>
+#include <string>
+
+namespace cimhost {
+
+/// Exit codes of the program. An operation that fails with CIM status c gives kOperation + c.
+struct ExitCode {
+  static constexpr int kOk = 0;
+  static constexpr int kProblems = 1;     ///< check found errors
+  static constexpr int kUsage = 2;        ///< command line, malformed path
+  static constexpr int kCannotStart = 3;  ///< home directory or provider library
+  static constexpr int kOutput = 4;       ///< results could not be written
+  static constexpr int kOperation = 10;
+};
+
+/// What the program is asked to do, checked as far as possible without a home directory.
+struct CommandLine {
+  enum class Command { enumerate, names, get, declaration, classes, check };
+
+  Command command = Command::check;
+  std::string home;
+  std::string providerFile;  ///< Empty: search for it.
+  OutputFormat format = OutputFormat::table;
+  bool trace = false;
+  Pegasus::CIMObjectPath target;  ///< Host empty; class null for `classes NS`; nothing for `check`.
+  bool deep = true;
+  bool localOnly = false;
+  bool includeQualifiers = false;
+  bool includeClassOrigin = false;
+  Pegasus::CIMPropertyList properties;  ///< Null unless given.
+};
+
+/// Reads the command line. No value: help was asked for and went to `out` (exitCode kOk), or the
+/// arguments are wrong and `error` got one message (kUsage).
+std::optional<CommandLine> parseCommandLine(int argc, const char* const* argv, std::ostream& out,
+                                            std::ostream& error, int& exitCode);
+
+}  // namespace cimhost

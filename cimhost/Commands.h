@@ -1,0 +1,20 @@
+#pragma once
+
+#include "cimhost/CommandLine.h"
+#include "cimhost/Host.h"
+
+#include <ostream>
+
+namespace cimhost {
+
+/// True when the command asks the provider for something.
+bool needsProvider(CommandLine::Command command);
+
+/// Runs one command; results go to `out`, messages to `error`. Returns the exit code. Does not
+/// throw.
+int runCommand(const CommandLine& line, const Host& host, std::ostream& out, std::ostream& error);
+
+/// All that is wrong in the home directory's files, and a line that counts it; kOk without errors.
+int runCheck(const Host& host, std::ostream& out);
+
+}  // namespace cimhost

@@ -1,0 +1,71 @@
+#include "cimhost/DefinitionFiles.h"
+
+#include "cimhost/OperationStatus.h"
+#include "cimhost/Text.h"
+
+#include "definition/DefinitionCheck.h"
+
+#include <dirent.h>
+
+#include <memory>
+
+namespace cimhost {
+
+namespace {
+
+ServedClass toServedClass(const definition::Served& served, const std::string& file) {
+  ServedClass result;
+  if (!served.nameSpace.empty()) {
+    result.nameSpace = Pegasus::CIMNamespaceName(fromUtf8(served.nameSpace));
+  }
+  result.className = Pegasus::CIMName(fromUtf8(served.className));
+  result.association = served.association;
+  result.hasMethods = served.hasMethods;
+  result.file = file;
+  return result;
+}
+
+Diagnostic toDiagnostic(const definition::Problem& problem, const std::string& folder) {
+  Diagnostic diagnostic;
+  diagnostic.file = folder + problem.file;
+  diagnostic.line = problem.line;
+  diagnostic.column = problem.column;
+  diagnostic.message = problem.message;
+  if (problem.line > 0) diagnostic.source = readSourceLine(problem.file, problem.line);
+  return diagnostic;
+}
+
+}  // namespace
+
+std::vector<std::string> findDefinitionFiles(const std::string& directory) {
+  std::vector<std::string> files;
+  const std::unique_ptr<DIR, int (*)(DIR*)> open(opendir(directory.c_str()), closedir);
+  if (open == nullptr) return files;
+  while (const dirent* entry = readdir(open.get())) {
+    const std::string name = entry->d_name;
+    if (name.find(".xml") != std::string::npos) files.push_back(name);
+  }
+  return files;
+}
+
+std::vector<Diagnostic> readDefinitions(const std::string& folder, ServedClasses& served) {
+  std::vector<Diagnostic> diagnostics;
+  const definition::CheckResult result = definition::checkDefinitionFiles(findDefinitionFiles("."));
+  for (const definition::Problem& problem : result.problems) {
+    diagnostics.push_back(toDiagnostic(problem, folder));
+  }
+  for (const definition::Served& entry : result.served) {
+    const std::string file = folder + entry.file;
+    const OperationStatus status = runOperation([&] { served.add(toServedClass(entry, file)); });
+    if (status.ok()) continue;
+    diagnostics.push_back({Diagnostic::Severity::error,
+                           file,
+                           0,
+                           0,
+                           "class " + entry.className + " is not served: " + status.message,
+                           {}});
+  }
+  return diagnostics;
+}
+
+}  // namespace cimhost

@@ -1,0 +1,25 @@
+#pragma once
+
+#include <Pegasus/Common/String.h>
+
+#include <cstdint>
+#include <string>
+
+namespace cimhost {
+
+/// Always valid UTF-8, unlike getCString(): embedded NULs stay, a lone surrogate becomes U+FFFD.
+std::string toUtf8(const Pegasus::String& text);
+
+/// Throws Pegasus::Exception for bytes that are not UTF-8. Embedded NULs stay.
+Pegasus::String fromUtf8(const std::string& text);
+
+/// The text with every byte that is not UTF-8 replaced by U+FFFD.
+std::string toValidUtf8(const std::string& text);
+
+/// Appends the UTF-8 form of one code point up to U+10FFFF.
+void appendUtf8(std::string& text, std::uint32_t codePoint);
+
+/// Reads the code point at `position` and moves it behind; a malformed byte moves one and gives -1.
+std::int32_t nextCodePoint(const std::string& text, std::size_t& position);
+
+}  // namespace cimhost

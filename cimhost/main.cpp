@@ -1,0 +1,37 @@
+#include "cimhost/CommandLine.h"
+#include "cimhost/Commands.h"
+#include "cimhost/Host.h"
+#include "cimhost/HostError.h"
+#include "cimhost/OperationStatus.h"
+#include "cimhost/ResultStream.h"
+#include "cimhost/output/DisplayText.h"
+
+#include <iostream>
+
+using namespace cimhost;
+
+namespace {
+
+int run(const CommandLine& line) {
+  const std::string library = findProviderLibrary(line.providerFile);
+  ResultStream results(line.trace);
+  Host host(line.home);
+  if (needsProvider(line.command)) host.loadProvider(library);
+  const int code = runCommand(line, host, results.stream(), std::cerr);
+  host.unloadProvider();
+  return code;
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+  int code = ExitCode::kOk;
+  const auto line = parseCommandLine(argc, argv, std::cout, std::cerr, code);
+  if (!line) return code;
+  try {
+    return run(*line);
+  } catch (...) {
+    std::cerr << "cimhost: " << displayText(currentExceptionStatus().message) << '\n';
+    return ExitCode::kCannotStart;
+  }
+}

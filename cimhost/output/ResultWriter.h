@@ -1,0 +1,34 @@
+#pragma once
+
+#include "cimhost/Sinks.h"
+
+#include <memory>
+#include <ostream>
+
+namespace cimhost {
+
+enum class OutputFormat { table, mof, json };
+
+/// Prints what an operation delivers. UTF-8 whatever the data; nothing is printed before the first
+/// object or finish(). One result kind per writer.
+class ResultWriter : public InstanceSink,
+                     public ObjectPathSink,
+                     public ClassSink,
+                     public ClassNameSink {
+ public:
+  /// Ends the output; call it once. Not called when an operation failed before it delivered.
+  virtual void finish() = 0;
+};
+
+/// `list` is several objects (a table with a row for each, a JSON array); `single` is one (a table
+/// of its properties, a JSON object). The stream must outlive the writer; when it fails, the writer
+/// asks for no more.
+enum class ResultForm { list, single };
+
+std::unique_ptr<ResultWriter> makeTableWriter(std::ostream& out, ResultForm form);
+std::unique_ptr<ResultWriter> makeMofWriter(std::ostream& out);
+std::unique_ptr<ResultWriter> makeJsonWriter(std::ostream& out, ResultForm form);
+std::unique_ptr<ResultWriter> makeResultWriter(OutputFormat format, std::ostream& out,
+                                               ResultForm form);
+
+}  // namespace cimhost
