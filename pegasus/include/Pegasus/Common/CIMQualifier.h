@@ -32,7 +32,7 @@ class PEGASUS_COMMON_LINKAGE QualifierReader {
 
  protected:
   QualifierReader() = default;
-  explicit QualifierReader(const Ref<QualifierRep>& rep) : rep_(rep) {}
+  explicit QualifierReader(Ref<QualifierRep> rep) : rep_(std::move(rep)) {}
   QualifierRep& rep() const;
 
   friend struct HandleAccess;
@@ -57,7 +57,7 @@ class PEGASUS_COMMON_LINKAGE CIMQualifier : public QualifierReader {
 
  private:
   friend struct HandleAccess;
-  explicit CIMQualifier(const Ref<QualifierRep>& rep) : QualifierReader(rep) {}
+  explicit CIMQualifier(Ref<QualifierRep> rep) : QualifierReader(std::move(rep)) {}
 };
 
 /// A handle that can only read.
@@ -68,7 +68,7 @@ class PEGASUS_COMMON_LINKAGE CIMConstQualifier : public QualifierReader {
 
  private:
   friend struct HandleAccess;
-  explicit CIMConstQualifier(const Ref<QualifierRep>& rep) : QualifierReader(rep) {}
+  explicit CIMConstQualifier(Ref<QualifierRep> rep) : QualifierReader(std::move(rep)) {}
 };
 
 template <class X, class Reader>

@@ -27,6 +27,8 @@ class PEGASUS_COMMON_LINKAGE CIMValue {
   CIMValue();
   /// A null value; `arraySize` is the declared size of a fixed array.
   CIMValue(CIMType type, Boolean isArray, Uint32 arraySize = 0);
+  CIMValue(const CIMValue& x) = default;
+  CIMValue(CIMValue&& x) noexcept;
   CIMValue(Boolean x);
   CIMValue(Uint8 x);
   CIMValue(Sint8 x);
@@ -61,6 +63,9 @@ class PEGASUS_COMMON_LINKAGE CIMValue {
   CIMValue(const Array<CIMObjectPath>& x);
   CIMValue(const Array<CIMObject>& x);
   CIMValue(const Array<CIMInstance>& x);
+
+  CIMValue& operator=(const CIMValue& x) = default;
+  CIMValue& operator=(CIMValue&& x) noexcept;
 
   void assign(const CIMValue& value);
   /// Leaves what CIMValue() constructs.

@@ -25,7 +25,7 @@ class PEGASUS_COMMON_LINKAGE QualifiedReader {
 
  protected:
   QualifiedReader() = default;
-  explicit QualifiedReader(const Ref<QualifiedRep>& rep) : rep_(rep) {}
+  explicit QualifiedReader(Ref<QualifiedRep> rep) : rep_(std::move(rep)) {}
   ~QualifiedReader() = default;
   QualifiedReader(const QualifiedReader&) = default;
   QualifiedReader(QualifiedReader&&) = default;

@@ -45,6 +45,10 @@ class Ref {
   Ref(Ref&& other) noexcept : object_(std::exchange(other.object_, nullptr)) {}
   template <class Derived>
   Ref(const Ref<Derived>& other) noexcept : Ref(other.get()) {}
+  template <class Derived>
+  Ref(Ref<Derived>&& other) noexcept : object_(other.get()) {
+    other.object_ = nullptr;
+  }
   ~Ref() {
     if (object_) object_->release();
   }
@@ -60,6 +64,9 @@ class Ref {
   bool isOnlyReference() const noexcept { return object_->isOnlyReference(); }
 
  private:
+  template <class Other>
+  friend class Ref;
+
   // Held as the base so that copying and destroying need no complete T.
   Shareable* object_ = nullptr;
 };
