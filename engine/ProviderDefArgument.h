@@ -5,6 +5,7 @@
 
 #include <string>
 
+class ElementReader;
 class ProviderDefFunctionCall;
 class ProviderDefModule;
 
@@ -44,6 +45,8 @@ class ProviderDefArgument {
   ProviderDefValue evaluate(int index) const;
 
  private:
+  void readElement(ElementReader& reader, ProviderDefModule* module);
+
   int type_ = kIndex;
   int elementType_ = kConstant;
   ProviderDefValue constant_;

@@ -8,6 +8,8 @@
 #include <string_view>
 #include <vector>
 
+class ElementReader;
+
 /// A CIM class that the provider serves: its instances, properties and methods.
 class ProviderDefClass {
  public:
@@ -27,6 +29,8 @@ class ProviderDefClass {
   int getNumberOfInstances() const;
 
  private:
+  void readInstances(ElementReader& reader, ProviderDefModule* module);
+
   std::string name_;
   std::string namespace_;
   std::vector<ProviderDefProperty> properties_;

@@ -5,6 +5,8 @@
 
 #include <string>
 
+class ElementReader;
+
 /// How one property of a class is read and written.
 class ProviderDefProperty {
  public:
@@ -23,6 +25,9 @@ class ProviderDefProperty {
   int setValue(const ProviderDefValue& value, int index) const;
 
  private:
+  void readGet(ElementReader& reader, ProviderDefModule* module);
+  void readSet(ElementReader& reader, ProviderDefModule* module);
+
   bool hasSet_ = false;
   bool getFromFunction_ = false;
   bool setFromFunction_ = false;

@@ -1,0 +1,95 @@
+#include "definition/DefinitionCheck.h"
+
+#include "definition/DefinitionFile.h"
+#include "definition/DefinitionRegistry.h"
+#include "definition/ElementReader.h"
+#include "diagnostics/debug.h"
+#include "engine/Registry.h"
+
+#include <algorithm>
+
+namespace definition {
+namespace {
+
+constexpr size_t kMaxSourceLine = 200;
+
+Problem problemAt(const std::string& file, const std::string& text, size_t position,
+                  const std::string& message) {
+  const size_t before = position == 0 ? std::string::npos : text.rfind('\n', position - 1);
+  const size_t lineStart = before == std::string::npos ? 0 : before + 1;
+  Problem problem;
+  problem.file = file;
+  problem.line =
+      1 + static_cast<int>(std::count(text.begin(), text.begin() + static_cast<long>(lineStart), '\n'));
+  problem.column = static_cast<int>(position - lineStart) + 1;
+  problem.message = message;
+  const size_t lineEnd = std::min(text.find('\n', lineStart), lineStart + kMaxSourceLine);
+  problem.source = text.substr(lineStart, lineEnd - lineStart);
+  return problem;
+}
+
+size_t skipSpaces(const std::string& text, size_t position) {
+  while (position < text.size() && isSpace(static_cast<unsigned char>(text[position]))) ++position;
+  return position;
+}
+
+// What the reader passes over in silence: a text that is no definition file, or elements behind the
+// place where it stopped.
+void checkEnd(const std::string& file, const std::string& text, int stopped,
+              std::vector<Problem>& problems) {
+  const ElementReader start(text.data(), static_cast<int>(text.size()));
+  const size_t place = skipSpaces(text, static_cast<size_t>(stopped));
+  const ElementReader end(text.data() + place, static_cast<int>(text.size() - place));
+  if (!start.isStart("plugin")) {
+    problems.push_back(problemAt(file, text, skipSpaces(text, 0),
+                                 "not a definition file: it must begin with the plugin element"));
+  } else if (place == text.size()) {
+    problems.push_back(problemAt(file, text, place, "the end of plugin element missing"));
+  } else if (!end.isEnd("plugin")) {
+    problems.push_back(problemAt(
+        file, text, place,
+        "unexpected " + end.unit().getName() +
+            ": the rest of the file is not read (module, then classes, then associations)"));
+  }
+}
+
+void checkFile(const std::string& file, CheckResult& result) {
+  std::string error;
+  const std::string text = loadFile(file, error);
+  if (!error.empty()) {
+    result.problems.push_back({file, 0, 0, error, std::string()});
+    return;
+  }
+  const size_t firstClass = registeredClasses().size();
+  const size_t firstAssociation = registeredAssociations().size();
+  try {
+    checkEnd(file, text, readText(text), result.problems);
+  } catch (const ProviderDefXMLError& syntax) {
+    const auto position = ElementReader::lastErrorPosition() - text.data();
+    result.problems.push_back(
+        problemAt(file, text, static_cast<size_t>(position), syntax.getMessage()));
+  }
+  for (size_t i = firstClass; i < registeredClasses().size(); ++i) {
+    const ProviderDefClass& read = registeredClasses()[i];
+    result.served.push_back(
+        {read.getNamespace(), read.getName(), false, !read.getMethods().empty(), file});
+  }
+  for (size_t i = firstAssociation; i < registeredAssociations().size(); ++i) {
+    const ProviderDefAssociation& read = registeredAssociations()[i];
+    result.served.push_back({read.getNamespace(), read.getName(), true, false, file});
+  }
+}
+
+}  // namespace
+
+CheckResult checkDefinitionFiles(const std::vector<std::string>& files) {
+  configRead.store(1);
+  LOG_LEVEL.store(0);
+  CheckResult result;
+  for (const std::string& file : files) checkFile(file, result);
+  releaseFunctions();
+  releaseModules();
+  return result;
+}
+
+}  // namespace definition

@@ -1,0 +1,39 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+namespace definition {
+
+/// Something wrong in a definition file, with its place. Line and column count from 1, the column in
+/// bytes; both are 0 where the file as a whole is meant.
+struct Problem {
+  std::string file;
+  int line = 0;
+  int column = 0;
+  std::string message;
+  std::string source;  ///< The line's text, at most 200 bytes; "" without a place.
+};
+
+/// A class or association class that a definition file declares.
+struct Served {
+  std::string nameSpace;
+  std::string className;
+  bool association = false;
+  bool hasMethods = false;
+  std::string file;
+};
+
+struct CheckResult {
+  std::vector<Problem> problems;
+  std::vector<Served> served;
+};
+
+/// Reads definition files as the provider does, for a program that wants to know what they declare.
+///
+/// Problems are syntax errors, files that cannot be read or are no definition files, and elements
+/// behind which the rest of a file is not read. Uses the process's registries and leaves them empty;
+/// switches this process's diagnostic log off. Not for use by several threads at once.
+CheckResult checkDefinitionFiles(const std::vector<std::string>& files);
+
+}  // namespace definition
