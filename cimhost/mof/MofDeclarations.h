@@ -37,7 +37,14 @@ struct MofInitializer {
   std::vector<MofLiteral> literals;  ///< Exactly one unless isArray.
 };
 
-enum class MofFlavor { enableOverride, disableOverride, toSubclass, restricted, translatable, toInstance };
+enum class MofFlavor {
+  enableOverride,
+  disableOverride,
+  toSubclass,
+  restricted,
+  translatable,
+  toInstance
+};
 
 struct MofQualifier {
   MofName name;

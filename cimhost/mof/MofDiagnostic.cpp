@@ -9,4 +9,11 @@ std::string MofDiagnostic::toString() const {
   return file + place + ": error: " + message + '\n' + source + '\n' + padding + '^';
 }
 
+MofDiagnostic wholeFileDiagnostic(const std::string& file, const std::string& message) {
+  MofDiagnostic diagnostic;
+  diagnostic.file = file;
+  diagnostic.message = message;
+  return diagnostic;
+}
+
 }  // namespace cimhost

@@ -19,4 +19,7 @@ struct MofDiagnostic {
   std::string toString() const;
 };
 
+/// One without a place, for a file that cannot be read at all.
+MofDiagnostic wholeFileDiagnostic(const std::string& file, const std::string& message);
+
 }  // namespace cimhost

@@ -25,16 +25,16 @@ constexpr Keyword<MofFlavor> kFlavors[] = {
     {"tosubclass", MofFlavor::toSubclass},         {"restricted", MofFlavor::restricted},
     {"translatable", MofFlavor::translatable},     {"toinstance", MofFlavor::toInstance}};
 
-constexpr Keyword<unsigned> kScopes[] = {{"schema", QualifierScope::kSchema},
-                                         {"class", QualifierScope::kClass},
-                                         {"association", QualifierScope::kAssociation},
-                                         {"indication", QualifierScope::kIndication},
-                                         {"qualifier", QualifierScope::kQualifier},
-                                         {"property", QualifierScope::kProperty},
-                                         {"reference", QualifierScope::kReference},
-                                         {"method", QualifierScope::kMethod},
-                                         {"parameter", QualifierScope::kParameter},
-                                         {"any", QualifierScope::kAny}};
+constexpr Keyword<unsigned> kScopes[] = {
+    {"schema", QualifierScope::kSchema},           {"class", QualifierScope::kClass},
+    {"association", QualifierScope::kAssociation}, {"indication", QualifierScope::kIndication},
+    {"qualifier", QualifierScope::kQualifier},     {"property", QualifierScope::kProperty},
+    {"reference", QualifierScope::kReference},     {"method", QualifierScope::kMethod},
+    {"parameter", QualifierScope::kParameter},     {"any", QualifierScope::kAny}};
+
+char lowered(char c) {
+  return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
+}
 
 template <class Meaning, std::size_t N>
 std::optional<Meaning> find(const Keyword<Meaning> (&table)[N], std::string_view name) {
@@ -46,11 +46,15 @@ std::optional<Meaning> find(const Keyword<Meaning> (&table)[N], std::string_view
 
 }  // namespace
 
+std::string asciiLowered(std::string text) {
+  for (char& c : text) c = lowered(c);
+  return text;
+}
+
 bool isMofKeyword(std::string_view name, std::string_view keyword) {
   if (name.size() != keyword.size()) return false;
   for (std::size_t i = 0; i < name.size(); ++i) {
-    const char c = name[i];
-    if ((c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c) != keyword[i]) return false;
+    if (lowered(name[i]) != keyword[i]) return false;
   }
   return true;
 }
@@ -63,6 +67,8 @@ std::optional<MofFlavor> mofFlavorFromKeyword(std::string_view name) {
   return find(kFlavors, name);
 }
 
-std::optional<unsigned> mofScopeFromKeyword(std::string_view name) { return find(kScopes, name); }
+std::optional<unsigned> mofScopeFromKeyword(std::string_view name) {
+  return find(kScopes, name);
+}
 
 }  // namespace cimhost

@@ -10,6 +10,9 @@ namespace cimhost {
 /// True when `name` is the keyword, which is given in lower case. MOF keywords ignore letter case.
 bool isMofKeyword(std::string_view name, std::string_view keyword);
 
+/// With A-Z in lower case.
+std::string asciiLowered(std::string text);
+
 /// The 14 types that have a keyword; references are written with REF.
 std::optional<Pegasus::CIMType> mofTypeFromKeyword(std::string_view name);
 

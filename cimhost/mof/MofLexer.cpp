@@ -10,15 +10,21 @@ namespace {
 constexpr std::size_t kMaxNameLength = 1024;
 constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
 
-bool isBlank(char c) { return c == ' ' || (c >= '\t' && c <= '\r'); }
-bool isDigit(char c) { return c >= '0' && c <= '9'; }
+bool isBlank(char c) {
+  return c == ' ' || (c >= '\t' && c <= '\r');
+}
+bool isDigit(char c) {
+  return c >= '0' && c <= '9';
+}
 
 // The characters of CIM names: the same set that Pegasus::CIMName takes.
 bool startsName(std::uint32_t c) {
   return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || c == '_' || (c >= 0x80 && c <= 0xFFEF);
 }
 
-bool continuesName(std::uint32_t c) { return startsName(c) || (c >= '0' && c <= '9'); }
+bool continuesName(std::uint32_t c) {
+  return startsName(c) || (c >= '0' && c <= '9');
+}
 
 std::string hexadecimal(std::uint32_t value, int digits) {
   std::string text;

@@ -7,7 +7,9 @@
 namespace cimhost {
 namespace {
 
-bool isDigit(char c) { return c >= '0' && c <= '9'; }
+bool isDigit(char c) {
+  return c >= '0' && c <= '9';
+}
 
 unsigned digitValue(char c) {
   if (isDigit(c)) return static_cast<unsigned>(c - '0');
@@ -64,8 +66,8 @@ MofNumberResult parseInteger(std::string_view digits, MofToken& token) {
   for (const char c : digits) {
     const unsigned digit = digitValue(c);
     if (digit >= radix) return MofNumberResult::malformed;
-    tooLarge = tooLarge || token.magnitude >
-                               (std::numeric_limits<std::uint64_t>::max() - digit) / radix;
+    tooLarge =
+        tooLarge || token.magnitude > (std::numeric_limits<std::uint64_t>::max() - digit) / radix;
     token.magnitude = token.magnitude * radix + digit;
   }
   token.kind = MofTokenKind::integer;

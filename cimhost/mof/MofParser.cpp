@@ -55,7 +55,9 @@ void MofParser::failExpecting(const std::string& what) const {
   fail(current_.offset, "expected " + what + ", found " + describe(current_));
 }
 
-void MofParser::advance() { current_ = lexer_.next(); }
+void MofParser::advance() {
+  current_ = lexer_.next();
+}
 
 bool MofParser::at(char mark) const {
   return current_.kind == MofTokenKind::punctuation && current_.mark == mark;

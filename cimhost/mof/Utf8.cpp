@@ -12,7 +12,9 @@ std::size_t lengthFromLead(unsigned char lead) {
   return lead >= 0xF0 && lead < 0xF5 ? 4 : 0;
 }
 
-bool isContinuation(char byte) { return (static_cast<unsigned char>(byte) & 0xC0) == 0x80; }
+bool isContinuation(char byte) {
+  return (static_cast<unsigned char>(byte) & 0xC0) == 0x80;
+}
 
 }  // namespace
 

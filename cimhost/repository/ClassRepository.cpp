@@ -18,6 +18,7 @@ using Pegasus::Uint32;
 
 // Inherited features make the memory for a class independent of the length of its text.
 constexpr std::size_t kMaxClasses = 65536;
+constexpr std::size_t kMaxNamespaces = 4096;
 
 struct ClassEntry {
   CIMClass resolved;
@@ -113,10 +114,15 @@ ClassRepository::ClassRepository() : impl_(std::make_unique<Impl>()) {}
 ClassRepository::~ClassRepository() = default;
 
 void ClassRepository::addNamespace(const CIMNamespaceName& nameSpace) {
-  const auto [place, added] = impl_->byName.try_emplace(nameSpace);
-  if (!added) return;
-  place->second.name = nameSpace;
-  impl_->inOrder.push_back(&place->second);
+  if (hasNamespace(nameSpace)) return;
+  if (nameSpace.isNull() || impl_->inOrder.size() == kMaxNamespaces) {
+    throw CIMException(
+        nameSpace.isNull() ? Pegasus::CIM_ERR_INVALID_NAMESPACE : Pegasus::CIM_ERR_FAILED,
+        nameSpace.isNull() ? "" : "more than 4096 namespaces");
+  }
+  NamespaceEntry& added = impl_->byName[nameSpace];
+  added.name = nameSpace;
+  impl_->inOrder.push_back(&added);
 }
 
 void ClassRepository::addClass(const CIMNamespaceName& nameSpace, const CIMClass& declared) {

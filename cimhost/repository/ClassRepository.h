@@ -15,9 +15,10 @@ namespace cimhost {
 
 /// The declared classes of every namespace, with inheritance resolved.
 ///
-/// Filled by the MOF reader while the host starts; read-only afterwards, when every const member may
-/// be called from several threads at once. Class and namespace names ignore letter case. Errors are
-/// Pegasus::CIMException: 3 (invalid namespace, text: the namespace), 6 (not found, text: the class).
+/// Filled by the MOF reader while the host starts; read-only afterwards, when every const member
+/// may be called from several threads at once. Class and namespace names ignore letter case. Errors
+/// are Pegasus::CIMException: 3 (invalid namespace, text: the namespace), 6 (not found, text: the
+/// class).
 class ClassRepository {
  public:
   /// Knows the standard qualifiers of DSP0004 (types and flavors) in every namespace.
@@ -26,14 +27,15 @@ class ClassRepository {
   ClassRepository(const ClassRepository&) = delete;
   ClassRepository& operator=(const ClassRepository&) = delete;
 
-  /// Declares a namespace; one that exists already stays as it is.
+  /// Declares a namespace; one that exists already stays as it is. CIM_ERR_INVALID_NAMESPACE for a
+  /// null name, CIM_ERR_FAILED for more than 4096.
   void addNamespace(const Pegasus::CIMNamespaceName& nameSpace);
 
   /// Adds a class as declared: own features only, superclass by name. Resolves inheritance at once;
   /// the superclass must be there (else CIM_ERR_INVALID_SUPERCLASS). A name that exists already in
-  /// the namespace is CIM_ERR_ALREADY_EXISTS, another fault CIM_ERR_INVALID_PARAMETER; all three are
-  /// ClassDeclarationError, which tells the part at fault. A qualifier without any flavor has that
-  /// of its declaration. `declared` is not kept; one that was refused leaves no trace.
+  /// the namespace is CIM_ERR_ALREADY_EXISTS, another fault CIM_ERR_INVALID_PARAMETER; all three
+  /// are ClassDeclarationError, which tells the part at fault. A qualifier without any flavor has
+  /// that of its declaration. `declared` is not kept; one that was refused leaves no trace.
   void addClass(const Pegasus::CIMNamespaceName& nameSpace, const Pegasus::CIMClass& declared);
 
   /// Declares a qualifier for classes that are added to the namespace from now on: type, default

@@ -43,8 +43,8 @@ CIMQualifier QualifierMerge::ownQualifier(const CIMConstQualifier& declared,
                                           const CIMConstQualifier& inherited) const {
   const CIMFlavor& general = declarationOf(declared).qualifier.getFlavor();
   // What a declaration fixes stays fixed, or a flavor on one element would undo a key.
-  const bool keepsGeneral = general.hasFlavor(CIMFlavor::DISABLEOVERRIDE) ||
-                            declared.getFlavor().equal(CIMFlavor::NONE);
+  const bool keepsGeneral =
+      general.hasFlavor(CIMFlavor::DISABLEOVERRIDE) || declared.getFlavor().equal(CIMFlavor::NONE);
   CIMFlavor flavor = keepsGeneral ? general : declared.getFlavor();
   if (!inherited.isUninitialized() && propagates(inherited) &&
       inherited.getFlavor().hasFlavor(CIMFlavor::DISABLEOVERRIDE)) {
