@@ -172,7 +172,7 @@ String::String(const Char16* str) : String(str, length(str)) {}
 
 String::String(const Char16* str, Uint32 n) : rep_(copyOf(notNull(str), n, n)) {}
 
-String::String(const char* str) : rep_(decode(notNull(str), std::strlen(str))) {}
+String::String(const char* str) : rep_(decode(str, std::strlen(notNull(str)))) {}
 
 String::String(const char* str, Uint32 n) : rep_(decode(notNull(str), n)) {}
 

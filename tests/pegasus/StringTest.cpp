@@ -1,0 +1,245 @@
+#include <Pegasus/Common/String.h>
+#include <gtest/gtest.h>
+
+#include <sstream>
+#include <string>
+#include <thread>
+#include <type_traits>
+#include <vector>
+
+#include "PegasusText.h"
+
+using namespace Pegasus;
+using pegasus_test::text;
+using pegasus_test::thrownMessage;
+
+namespace {
+
+struct Utf8Case {
+  const char* utf8;
+  std::vector<Uint16> units;
+};
+
+TEST(StringUtf8, DecodesAndEncodes) {
+  const Utf8Case cases[] = {
+      {"", {}},
+      {"abc", {'a', 'b', 'c'}},
+      {"\x7F", {0x7F}},
+      {"\xC2\x80", {0x80}},
+      {"\xC3\xA9", {0xE9}},
+      {"\xDF\xBF", {0x7FF}},
+      {"\xE0\xA0\x80", {0x800}},
+      {"\xE2\x82\xAC", {0x20AC}},
+      {"\xEF\xBF\xBF", {0xFFFF}},
+      {"\xF0\x9F\x98\x80", {0xD83D, 0xDE00}},
+      {"\xF4\x8F\xBF\xBF", {0xDBFF, 0xDFFF}},
+      {"\xED\xA0\x80", {0xD800}},
+      {"\xED\xB0\x80x", {0xDC00, 'x'}},
+      {"exactly8\xC3\xA9 and eight more", {}},
+  };
+  for (const Utf8Case& c : cases) {
+    SCOPED_TRACE(testing::PrintToString(c.utf8));
+    const String str(c.utf8);
+    EXPECT_EQ(text(str), c.utf8);
+    if (c.units.empty()) continue;
+    ASSERT_EQ(str.size(), c.units.size());
+    for (Uint32 i = 0; i < str.size(); ++i) EXPECT_EQ(Uint16(str[i]), c.units[i]);
+    EXPECT_EQ(Uint16(str.getChar16Data()[str.size()]), 0);
+  }
+}
+
+TEST(StringUtf8, RefusesMalformedText) {
+  const struct {
+    const char* utf8;
+    const char* where;
+  } cases[] = {
+      {"a\xE9z", "1 is not valid UTF-8 encoding: a 0xE9 0x7A"},
+      {"\x80", "0 is not valid UTF-8 encoding:  0x80"},
+      {"ab\xFF", "2 is not valid UTF-8 encoding: ab 0xFF"},
+      {"\xC0\x80", "0 is not valid UTF-8 encoding:  0xC0 0x80"},
+      {"\xC1\xBF", "0 is not valid UTF-8 encoding:  0xC1 0xBF"},
+      {"\xE0\x9F\xBF", "0 is not valid UTF-8 encoding:  0xE0 0x9F 0xBF"},
+      {"\xF0\x8F\xBF\xBF", "0 is not valid UTF-8 encoding:  0xF0 0x8F 0xBF 0xBF"},
+      {"\xF4\x90\x80\x80", "0 is not valid UTF-8 encoding:  0xF4 0x90 0x80 0x80"},
+      {"\xF8\x88\x80\x80\x80", "0 is not valid UTF-8 encoding:  0xF8"},
+      {"\xC3\xA9\xE2\x82", "2 is not valid UTF-8 encoding: \xC3\xA9 0xE2 0x82"},
+      {"123456789\xC3", "9 is not valid UTF-8 encoding: 123456789 0xC3"},
+  };
+  for (const auto& c : cases) {
+    EXPECT_EQ(thrownMessage<Exception>([&] { String str(c.utf8); }),
+              std::string("The byte sequence starting at index ") + c.where);
+  }
+}
+
+TEST(String, RefusesNullPointers) {
+  const char* const noText = nullptr;
+  const Char16* const noUnits = nullptr;
+  EXPECT_EQ(thrownMessage<Exception>([&] { String str(noText); }), "null pointer");
+  EXPECT_EQ(thrownMessage<Exception>([&] { String str(noText, 3); }), "null pointer");
+  EXPECT_EQ(thrownMessage<Exception>([&] { String str(noUnits); }), "null pointer");
+  EXPECT_EQ(thrownMessage<Exception>([&] { String().append(noUnits, 1); }), "null pointer");
+  EXPECT_EQ(thrownMessage<Exception>([&] { (void)(String("a") == noText); }), "null pointer");
+}
+
+TEST(String, KeepsEmbeddedNul) {
+  const String str("a\0b", 3);
+  EXPECT_EQ(str.size(), 3u);
+  EXPECT_EQ(text(str), "a");
+  EXPECT_FALSE(str == "a");
+  EXPECT_FALSE(String::equal(str, String("a")));
+}
+
+TEST(String, CopiesAreIndependent) {
+  const String original("abc");
+  String appended(original);
+  appended.append(String("d"));
+  String indexed(original);
+  indexed[1] = Char16('x');
+  String removed(original);
+  removed.remove(0, 1);
+  String cleared(original);
+  cleared.clear();
+  String lowered(String("ABC"));
+  const String upper(lowered);
+  lowered.toLower();
+  EXPECT_EQ(text(original), "abc");
+  EXPECT_EQ(text(appended), "abcd");
+  EXPECT_EQ(text(indexed), "axc");
+  EXPECT_EQ(text(removed), "bc");
+  EXPECT_EQ(text(cleared), "");
+  EXPECT_EQ(text(upper), "ABC");
+  EXPECT_EQ(text(lowered), "abc");
+}
+
+TEST(String, EmptyTextIsNeverChangedForOthers) {
+  String str;
+  str[0] = Char16('x');  // the terminating unit of this object alone
+  str.append(Char16('y'));
+  EXPECT_EQ(text(str), "y");
+  EXPECT_EQ(String().size(), 0u);
+  EXPECT_EQ(Uint16(String::EMPTY[0]), 0);
+  String moved("moved");
+  const String target(std::move(moved));
+  moved.append(String("again"));
+  EXPECT_EQ(text(target) + text(moved), "movedagain");
+}
+
+TEST(String, AppendsPartsOfItself) {
+  String str("ab");
+  for (int i = 0; i < 12; ++i) str.append(str);
+  EXPECT_EQ(str.size(), 2u << 12);
+  str.append(str.getChar16Data() + 1, 3);
+  EXPECT_EQ(text(str.subString(str.size() - 5)), "abbab");
+  for (int i = 0; i < 9; ++i) str.append(static_cast<const String&>(str)[0]);
+  EXPECT_EQ(text(str.subString(str.size() - 3)), "aaa");
+}
+
+TEST(String, SubStringAndFind) {
+  const String hello("hello");
+  EXPECT_EQ(text(hello.subString(1, 2)), "el");
+  EXPECT_EQ(text(hello.subString(1, 99)), "ello");
+  EXPECT_EQ(text(hello.subString(5)) + text(hello.subString(6)), "");
+  EXPECT_EQ(hello.find('l'), 2u);
+  EXPECT_EQ(hello.find(3, 'l'), 3u);
+  EXPECT_EQ(hello.find(5, 'l'), PEG_NOT_FOUND);
+  EXPECT_EQ(hello.find("ll"), 2u);
+  EXPECT_EQ(hello.find("xx"), PEG_NOT_FOUND);
+  EXPECT_EQ(hello.find("hello!"), PEG_NOT_FOUND);
+  EXPECT_EQ(hello.find(""), PEG_NOT_FOUND);
+  EXPECT_EQ(hello.reverseFind('l'), 3u);
+  EXPECT_EQ(hello.reverseFind('x'), PEG_NOT_FOUND);
+  EXPECT_EQ(text(String(hello, 3)), "hel");
+}
+
+TEST(String, RefusesIndexesPastTheEnd) {
+  String str("abc");
+  EXPECT_EQ(Uint16(static_cast<const String&>(str)[3]), 0);
+  EXPECT_THROW(str[4], IndexOutOfBoundsException);
+  EXPECT_THROW(static_cast<const String&>(str)[4], IndexOutOfBoundsException);
+  EXPECT_THROW(str.find(4, 'a'), IndexOutOfBoundsException);
+  EXPECT_THROW(str.remove(4), IndexOutOfBoundsException);
+  EXPECT_THROW(str.remove(1, 3), IndexOutOfBoundsException);
+  EXPECT_THROW(String(str, 4), IndexOutOfBoundsException);
+  str.remove(1);
+  EXPECT_EQ(text(str), "a");
+}
+
+TEST(String, Compares) {
+  const struct {
+    const char *a, *b;
+    int order, orderNoCase;
+  } cases[] = {
+      {"", "", 0, 0},
+      {"abc", "abc", 0, 0},
+      {"abc", "ABC", 1, 0},
+      {"abc", "abcd", -1, -1},
+      {"b", "abc", 1, 1},
+      {"_", "a", -1, -1},
+      {"_", "A", 1, -1},
+      {"CommonProvider", "COMMONPROVIDER", 1, 0},
+      {"CommonProvider", "CommonProvider ", -1, -1},
+      {"\xC3\x89", "\xC3\xA9", -1, -1},
+      {"[", "{", -1, -1},
+      {"\xEF\xBF\xBF", "a", 1, 1},
+  };
+  const auto sign = [](int x) { return (x > 0) - (x < 0); };
+  for (const auto& c : cases) {
+    SCOPED_TRACE(std::string(c.a) + " / " + c.b);
+    const String a(c.a);
+    const String b(c.b);
+    EXPECT_EQ(sign(String::compare(a, b)), c.order);
+    EXPECT_EQ(sign(String::compare(b, a)), -c.order);
+    EXPECT_EQ(sign(String::compareNoCase(a, b)), c.orderNoCase);
+    EXPECT_EQ(String::equalNoCase(a, b), c.orderNoCase == 0);
+    EXPECT_EQ(a == b, c.order == 0);
+    EXPECT_EQ(a == c.b, c.order == 0);
+    EXPECT_EQ(c.a == b, c.order == 0);
+    EXPECT_EQ(a < b, c.order < 0);
+    EXPECT_EQ(a >= b, c.order >= 0);
+  }
+  EXPECT_EQ(String::compare("abcX", "abcY", 3), 0);
+}
+
+TEST(String, Prints) {
+  std::ostringstream out;
+  out << String("a\xC3\xA9\xE2\x82\xAC");
+  EXPECT_EQ(out.str(), "a\xE9\\x20AC");
+  String str("x");
+  str.appendPrintf("=%d %s", 5, std::string(2000, 'y').c_str());
+  EXPECT_EQ(text(str), "x=5 " + std::string(2000, 'y'));
+}
+
+TEST(String, HoldsLongText) {
+  const std::string longText(3 << 20, 'n');
+  String str(longText.c_str());
+  EXPECT_EQ(str.size(), longText.size());
+  str.append(String("\xE2\x82\xAC"));
+  EXPECT_EQ(text(str), longText + "\xE2\x82\xAC");
+  EXPECT_THROW(str.reserveCapacity(0xFFFFFFF0u), std::bad_alloc);
+  EXPECT_EQ(str.size(), longText.size() + 1);
+}
+
+TEST(String, IsSharedBetweenThreads) {
+  const String shared("shared text");
+  std::vector<std::thread> threads;
+  for (int t = 0; t < 4; ++t) {
+    threads.emplace_back([&shared] {
+      for (int i = 0; i < 2000; ++i) {
+        String copy(shared);
+        copy.append(Char16('!'));
+        ASSERT_EQ(copy.size(), shared.size() + 1);
+      }
+    });
+  }
+  for (std::thread& thread : threads) thread.join();
+  EXPECT_EQ(text(shared), "shared text");
+}
+
+TEST(String, ConvertsNoMoreThanTheServersApi) {
+  static_assert(!std::is_constructible_v<String, std::string>);
+  static_assert(!std::is_convertible_v<CString, std::string>);
+  static_assert(std::is_convertible_v<const char*, String>);
+  static_assert(!std::is_base_of_v<std::exception, Exception>);
+}
+
+}  // namespace
