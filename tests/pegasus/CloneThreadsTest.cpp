@@ -1,0 +1,83 @@
+// One class object, cloned and read by several threads at once. Meant for the thread sanitizer,
+// too.
+#include <Pegasus/Common/CIMClass.h>
+#include <gtest/gtest.h>
+
+#include <atomic>
+#include <string>
+#include <thread>
+#include <vector>
+
+using namespace Pegasus;
+
+namespace {
+
+constexpr int kRounds = 400;
+
+CIMClass makeClass() {
+  CIMClass cls(CIMName("A"));
+  for (int i = 0; i < 5; ++i) {
+    CIMProperty p(CIMName(("p" + std::to_string(i)).c_str()), String("initial"));
+    p.addQualifier(CIMQualifier(CIMName("Key"), Boolean(i == 0)));
+    p.addQualifier(CIMQualifier(CIMName("Text"), String("text")));
+    cls.addProperty(p);
+  }
+  CIMMethod method(CIMName("m"), CIMTYPE_UINT32);
+  CIMParameter parameter(CIMName("a"), CIMTYPE_UINT32);
+  parameter.addQualifier(CIMQualifier(CIMName("In"), Boolean(true)));
+  method.addParameter(parameter);
+  cls.addMethod(method);
+  return cls;
+}
+
+/// Changes every kind of element of a clone; true when the result is as expected.
+bool changeClone(CIMClass cls, Uint32 number) {
+  for (Uint32 i = 0; i < cls.getPropertyCount(); ++i) {
+    cls.getProperty(i).setValue(String("changed"));
+    cls.getProperty(i).getQualifier(1).setValue(number);
+  }
+  CIMQualifier in = cls.getMethod(0).getParameter(0).getQualifier(0);
+  in.setValue(number);
+  const CIMClass next = cls.clone();
+  in.setValue(Boolean(false));
+  const CIMConstMethod method = CIMConstClass(next).getMethod(0);
+  return method.getParameter(0).getQualifier(0).getValue() == CIMValue(number) &&
+         CIMConstClass(next).getProperty(4).getQualifier(1).getValue() == CIMValue(number);
+}
+
+TEST(CloneThreads, ClonesAreIndependentFromTheFirst) {
+  for (int round = 0; round < kRounds / 10; ++round) {
+    // Fresh, so that the threads race for the very first clone.
+    const CIMClass shared = makeClass();
+    std::atomic<int> good{0};
+    std::vector<std::thread> threads;
+    for (Uint32 t = 0; t < 3; ++t) {
+      threads.emplace_back([&, t] {
+        for (Uint32 i = 0; i < 10; ++i) {
+          good += changeClone(shared.clone(), t * 100 + i);
+          const CIMConstQualifier q = shared.getProperty(1).getQualifier(1);
+          good += q.getValue() == CIMValue(String("text"));
+        }
+      });
+    }
+    for (std::thread& thread : threads) thread.join();
+    EXPECT_EQ(good, 60);
+    EXPECT_TRUE(shared.identical(makeClass()));
+  }
+}
+
+TEST(CloneThreads, TwoClonesShareNothingThatChanges) {
+  const CIMClass original = makeClass();
+  for (int round = 0; round < kRounds; ++round) {
+    CIMClass mine = original.clone();
+    CIMClass theirs = mine.clone();
+    bool theirsGood = false;
+    std::thread thread([&] { theirsGood = changeClone(std::move(theirs), 2); });
+    const bool mineGood = changeClone(std::move(mine), 1);
+    thread.join();
+    EXPECT_TRUE(mineGood && theirsGood);
+  }
+  EXPECT_TRUE(original.identical(makeClass()));
+}
+
+}  // namespace
