@@ -1,0 +1,111 @@
+#include "cimhost/CommandLine.h"
+
+#include "cimhost/Text.h"
+
+#include <gmock/gmock.h>
+
+#include <sstream>
+
+namespace {
+
+using namespace cimhost;
+using testing::HasSubstr;
+using Command = CommandLine::Command;
+
+struct Parsed {
+  std::optional<CommandLine> line;
+  int exitCode = -1;
+  std::string out;
+  std::string error;
+};
+
+Parsed parse(std::vector<const char*> arguments) {
+  arguments.insert(arguments.begin(), "cimhost");
+  std::ostringstream out;
+  std::ostringstream error;
+  Parsed parsed;
+  parsed.line = parseCommandLine(static_cast<int>(arguments.size()), arguments.data(), out, error,
+                                 parsed.exitCode);
+  parsed.out = out.str();
+  parsed.error = error.str();
+  return parsed;
+}
+
+TEST(CommandLine, Defaults) {
+  const Parsed parsed = parse({"--home", "h", "enumerate", "root/cimv2:A"});
+  ASSERT_TRUE(parsed.line) << parsed.error;
+  const CommandLine& line = *parsed.line;
+  EXPECT_EQ(line.command, Command::enumerate);
+  EXPECT_EQ(line.home, "h");
+  EXPECT_EQ(line.format, OutputFormat::table);
+  EXPECT_TRUE(line.deep);
+  EXPECT_FALSE(line.localOnly || line.includeQualifiers || line.includeClassOrigin || line.trace);
+  EXPECT_TRUE(line.properties.isNull());
+  EXPECT_EQ(toUtf8(line.target.toString()), "root/cimv2:A");
+}
+
+TEST(CommandLine, OptionsMayStandBeforeAndBehindTheCommand) {
+  const Parsed parsed =
+      parse({"--home", "h", "enumerate", "--no-deep", "--local-only", "--qualifiers",
+             "--class-origin", "--property", "A", "--property", "B", "root/cimv2:A", "--format",
+             "json", "--provider", "p.so", "--trace"});
+  ASSERT_TRUE(parsed.line) << parsed.error;
+  const CommandLine& line = *parsed.line;
+  EXPECT_FALSE(line.deep);
+  EXPECT_TRUE(line.localOnly && line.includeQualifiers && line.includeClassOrigin && line.trace);
+  EXPECT_EQ(toUtf8(line.properties.toString()), "A, B");
+  EXPECT_EQ(line.format, OutputFormat::json);
+  EXPECT_EQ(line.providerFile, "p.so");
+}
+
+TEST(CommandLine, EachCommand) {
+  EXPECT_EQ(parse({"--home", "h", "names", "root:A"}).line->command, Command::names);
+  EXPECT_EQ(parse({"--home", "h", "get", "root:A.k=1"}).line->command, Command::get);
+  EXPECT_EQ(parse({"--home", "h", "classes", "root"}).line->command, Command::classes);
+  EXPECT_EQ(parse({"--home", "h", "check"}).line->command, Command::check);
+  const Parsed declaration = parse({"--home", "h", "class", "root:A"});
+  EXPECT_EQ(declaration.line->command, Command::declaration);
+  EXPECT_TRUE(declaration.line->includeQualifiers);
+  EXPECT_FALSE(
+      parse({"--home", "h", "class", "root:A", "--no-qualifiers"}).line->includeQualifiers);
+}
+
+TEST(CommandLine, HelpNamesTheExitCodes) {
+  const Parsed parsed = parse({"--help"});
+  EXPECT_FALSE(parsed.line);
+  EXPECT_EQ(parsed.exitCode, 0);
+  EXPECT_THAT(parsed.out, HasSubstr("16 for CIM_ERR_NOT_FOUND"));
+}
+
+struct UsageCase {
+  const char* name;
+  std::vector<const char*> arguments;
+  const char* message;
+};
+
+TEST(CommandLine, UsageErrors) {
+  const UsageCase cases[] = {
+      {"nothing", {}, "--home"},
+      {"no command", {"--home", "h"}, "subcommand"},
+      {"no home", {"check"}, "--home"},
+      {"unknown command", {"--home", "h", "frobnicate"}, "subcommand"},
+      {"no class", {"--home", "h", "enumerate"}, "NS:CLASS"},
+      {"unknown option", {"--home", "h", "check", "--what"}, "--what"},
+      {"surplus argument", {"--home", "h", "check", "x"}, "x"},
+      {"format", {"--home", "h", "--format", "yaml", "check"}, "yaml"},
+      {"path", {"--home", "h", "get", "root:A.k="}, "column 8"},
+      {"property", {"--home", "h", "enumerate", "root:A", "--property", "1x"}, "1x"},
+      {"empty property", {"--home", "h", "enumerate", "root:A", "--property", ""}, "not valid"},
+      {"option of another command", {"--home", "h", "names", "root:A", "--deep"}, "--deep"},
+  };
+  for (const UsageCase& row : cases) {
+    SCOPED_TRACE(row.name);
+    const Parsed parsed = parse(row.arguments);
+    EXPECT_FALSE(parsed.line);
+    EXPECT_EQ(parsed.exitCode, ExitCode::kUsage);
+    EXPECT_THAT(parsed.error, HasSubstr(row.message));
+    EXPECT_EQ(parsed.out, "");
+  }
+}
+
+}  // namespace

@@ -1,0 +1,44 @@
+#include "cimhost/ConfigurationCheck.h"
+
+#include <gtest/gtest.h>
+
+#include <sstream>
+
+namespace {
+
+std::string check(const std::string& text) {
+  std::istringstream stream(text);
+  std::string result;
+  for (const auto& problem : cimhost::checkConfiguration(stream, "c.ini")) {
+    result += problem.toString() + "|";
+  }
+  return result;
+}
+
+TEST(ConfigurationCheck, GoodTexts) {
+  EXPECT_EQ(check(""), "");
+  EXPECT_EQ(check("# c\n; c\n[section]\n\n  LogLevel = 9\r\nLogLevel=-1\n"), "");
+}
+
+TEST(ConfigurationCheck, ProblemsPointAtTheCharacter) {
+  EXPECT_EQ(check("LogLevel=9\nLogLevel = nine\n"),
+            "c.ini:2:12: error: LogLevel is not a decimal number\n"
+            "  LogLevel = nine\n"
+            "             ^|");
+  EXPECT_EQ(check("LogLevel=9x\n").substr(0, 15), "c.ini:1:10: err");
+  EXPECT_EQ(check("LogLevel 9").substr(0, 40), "c.ini:1:1: error: expected key = value\n ");
+  EXPECT_EQ(check(" =9").substr(0, 20), "c.ini:1:2: error: no");
+  EXPECT_EQ(check("LogLevel=").substr(0, 40), "c.ini:1:10: error: LogLevel has no value");
+  EXPECT_EQ(check("loglevel=9").substr(0, 40), "c.ini:1:1: warning: unknown key loglevel");
+}
+
+TEST(ConfigurationCheck, AFloodOfProblemsIsBounded) {
+  std::istringstream stream(std::string(100000, '\n') + std::string(5000, 'x') + "\n" + [] {
+    std::string lines;
+    for (int i = 0; i < 5000; ++i) lines += "x\n";
+    return lines;
+  }());
+  EXPECT_EQ(cimhost::checkConfiguration(stream, "c.ini").size(), 100u);
+}
+
+}  // namespace

@@ -1,0 +1,53 @@
+#pragma once
+
+#include "cimhost/EmbeddedCimom.h"
+#include "cimhost/Operations.h"
+#include "cimhost/Text.h"
+
+#include <string>
+#include <vector>
+
+namespace cimhost::test {
+
+/// Collects the names of what is delivered: the property Name of instances, the text of paths.
+class RecordingSink : public InstanceSink,
+                      public ObjectPathSink,
+                      public ClassSink,
+                      public ClassNameSink {
+ public:
+  bool deliverInstance(const Pegasus::CIMInstance& instance) override;
+  bool deliverPath(const Pegasus::CIMObjectPath& path) override;
+  bool deliverClass(const Pegasus::CIMClass& declaration) override;
+  bool deliverClassName(const Pegasus::CIMName& name) override;
+
+  std::vector<std::string> names;
+  std::vector<Pegasus::CIMInstance> instances;
+  std::vector<Pegasus::CIMClass> classes;
+};
+
+/// A class with the given properties, all strings but `Size` (uint64); Name is the key.
+Pegasus::CIMClass makeClass(const std::string& name, const std::string& superclass,
+                            const std::vector<std::string>& properties);
+
+/// A repository with the classes of the test provider in root/test, that provider loaded, and the
+/// operations over both.
+class TestHost {
+ public:
+  explicit TestHost(const std::string& providerName = "CommonProvider");
+  ~TestHost();
+  TestHost(const TestHost&) = delete;
+  TestHost& operator=(const TestHost&) = delete;
+
+  ClassRepository repository;
+  ServedClasses served;
+  ProviderLibrary provider;
+  Operations operations{repository, served, provider};
+  EmbeddedCimom cimom{repository, operations};
+
+ private:
+  Pegasus::CIMOMHandle* handle_;
+};
+
+inline const Pegasus::CIMNamespaceName kNamespace("root/test");
+
+}  // namespace cimhost::test
