@@ -372,11 +372,14 @@ bool operator==(const String& s1, const String& s2) {
 
 bool operator==(const String& s1, const char* s2) {
   const Char16* const units = s1.getChar16Data();
-  Uint32 i = 0;
-  for (; i < s1.size() && Uint16(units[i]) < 0x80 && Uint16(units[i]) != 0; ++i) {
-    if (Uint16(units[i]) != static_cast<unsigned char>(notNull(s2)[i])) return false;
+  const Uint32 size = s1.size();
+  notNull(s2);
+  for (Uint32 i = 0; i < size; ++i) {
+    const Uint16 unit = units[i];
+    if (unit >= 0x80 || unit == 0) return String::equal(s1, String(s2));
+    if (unit != static_cast<unsigned char>(s2[i])) return false;
   }
-  return i == s1.size() ? notNull(s2)[i] == '\0' : String::equal(s1, String(s2));
+  return s2[size] == '\0';
 }
 
 bool operator==(const char* s1, const String& s2) {
