@@ -87,7 +87,7 @@ class DeclarationBuilder {
     try {
       return action();
     } catch (const Pegasus::Exception& exception) {
-      fail(offset, shortened(toUtf8(exception.getMessage()), 200));
+      fail(offset, shortened(utf8Text(exception.getMessage()), 200));
     }
   }
 
@@ -209,17 +209,17 @@ std::size_t placeOf(const ClassDeclarationError::Part& part,
     throw MofError(source, declaration.name.offset,
                    "class " + quoted(declaration.name) + " is declared already");
   }
-  throw MofError(source, placeOf(error.part(), declaration), toUtf8(error.getMessage()));
+  throw MofError(source, placeOf(error.part(), declaration), utf8Text(error.getMessage()));
 }
 
 }  // namespace
 
 std::string mofClassKey(const CIMNamespaceName& nameSpace, const std::string& name) {
-  return asciiLowered(toUtf8(nameSpace.getString()) + ":class:" + name);
+  return asciiLowered(utf8Text(nameSpace.getString()) + ":class:" + name);
 }
 
 std::string mofQualifierKey(const CIMNamespaceName& nameSpace, const std::string& name) {
-  return asciiLowered(toUtf8(nameSpace.getString()) + ":qualifier:" + name);
+  return asciiLowered(utf8Text(nameSpace.getString()) + ":qualifier:" + name);
 }
 
 void MofCompiler::add(const MofUnit::Item& item) {
@@ -234,7 +234,7 @@ void MofCompiler::add(const MofUnit::Item& item) {
       addClass(item, *cimClass);
     }
   } catch (const Pegasus::Exception& exception) {
-    throw MofError(*item.source, name.offset, toUtf8(exception.getMessage()));
+    throw MofError(*item.source, name.offset, utf8Text(exception.getMessage()));
   }
 }
 

@@ -80,7 +80,7 @@ void MofDirectoryReader::open(File& file) {
   } catch (const std::runtime_error& error) {
     file.diagnostic = wholeFileDiagnostic(file.path, error.what());
   } catch (const Pegasus::Exception& exception) {
-    file.diagnostic = wholeFileDiagnostic(file.path, toUtf8(exception.getMessage()));
+    file.diagnostic = wholeFileDiagnostic(file.path, utf8Text(exception.getMessage()));
   }
 }
 

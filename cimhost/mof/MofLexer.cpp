@@ -39,7 +39,7 @@ std::string quoted(std::uint32_t character) {
     return "character U+" + hexadecimal(character, 4);
   }
   std::string text = "'";
-  appendUtf8(text, character);
+  appendCodePoint(text, character);
   return text + '\'';
 }
 
@@ -205,13 +205,13 @@ void MofLexer::readString(MofToken& token) {
   ++offset_;
   std::uint32_t high = 0;  // A high surrogate that waits for its low half: \xD83D\xDE00.
   const auto flush = [&] {
-    if (high != 0) appendUtf8(token.text, high);
+    if (high != 0) appendCodePoint(token.text, high);
     high = 0;
   };
   while (atEnd() || source_.text[offset_] != '"') {
     const std::uint32_t character = readQuoted(token.offset, "string");
     if (high != 0 && character >= 0xDC00 && character <= 0xDFFF) {
-      appendUtf8(token.text, 0x10000 + ((high - 0xD800) << 10) + (character - 0xDC00));
+      appendCodePoint(token.text, 0x10000 + ((high - 0xD800) << 10) + (character - 0xDC00));
       high = 0;
       continue;
     }
@@ -219,7 +219,7 @@ void MofLexer::readString(MofToken& token) {
     if (character >= 0xD800 && character <= 0xDBFF) {
       high = character;
     } else {
-      appendUtf8(token.text, character);
+      appendCodePoint(token.text, character);
     }
   }
   flush();

@@ -40,7 +40,7 @@ bool MofReader::readSource(MofSourcePtr source, const Pegasus::CIMNamespaceName&
   } catch (const MofError& error) {
     diagnostics_.push_back(error.diagnostic());
   } catch (const Pegasus::Exception& exception) {
-    diagnostics_.push_back(wholeFileDiagnostic(name, toUtf8(exception.getMessage())));
+    diagnostics_.push_back(wholeFileDiagnostic(name, utf8Text(exception.getMessage())));
   }
   return false;
 }

@@ -26,7 +26,7 @@ std::string canonicalPath(const std::string& path) {
 }
 
 bool MofFileSet::add(const std::string& path, const Pegasus::CIMNamespaceName& nameSpace) {
-  return files_.insert(asciiLowered(toUtf8(nameSpace.getString())) + ':' + path).second;
+  return files_.insert(asciiLowered(utf8Text(nameSpace.getString())) + ':' + path).second;
 }
 
 void MofFileSet::countBytes(std::size_t size) {

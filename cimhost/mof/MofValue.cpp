@@ -176,7 +176,7 @@ Pegasus::String toPegasusString(const std::string& text) {
   return Pegasus::String(text.data(), static_cast<Pegasus::Uint32>(text.size()));
 }
 
-std::string toUtf8(const Pegasus::String& text) {
+std::string utf8Text(const Pegasus::String& text) {
   return std::string(static_cast<const char*>(text.getCString()));
 }
 

@@ -23,7 +23,7 @@ Pegasus::CIMValue makeNullValue(const MofElement& element);
 
 /// UTF-8, surrogates as three bytes; NUL characters are kept.
 Pegasus::String toPegasusString(const std::string& text);
-std::string toUtf8(const Pegasus::String& text);
+std::string utf8Text(const Pegasus::String& text);
 Pegasus::CIMName toCimName(const MofName& name);
 
 }  // namespace cimhost

@@ -33,7 +33,7 @@ Utf8Character decodeUtf8(std::string_view text, std::size_t offset) {
   return {codePoint, length};
 }
 
-void appendUtf8(std::string& text, std::uint32_t codePoint) {
+void appendCodePoint(std::string& text, std::uint32_t codePoint) {
   const auto put = [&text](std::uint32_t byte) { text += static_cast<char>(byte); };
   if (codePoint < 0x80) return put(codePoint);
   if (codePoint < 0x800) {

@@ -18,7 +18,7 @@ struct Utf8Character {
 Utf8Character decodeUtf8(std::string_view text, std::size_t offset);
 
 /// Appends the character. A surrogate is written as three bytes, as Pegasus::String takes it.
-void appendUtf8(std::string& text, std::uint32_t codePoint);
+void appendCodePoint(std::string& text, std::uint32_t codePoint);
 
 /// At most `limit` bytes of `text`, cut before a character and then ended with "...".
 std::string shortened(std::string_view text, std::size_t limit);
