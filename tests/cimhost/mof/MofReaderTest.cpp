@@ -1,0 +1,204 @@
+#include "tests/cimhost/mof/MofTestSupport.h"
+
+#include <sys/stat.h>
+
+namespace cimhost_test {
+namespace {
+
+using Pegasus::CIMFlavor;
+using Pegasus::CIMNamespaceName;
+
+TEST(MofReader, ReadsAClassWithEverything) {
+  Mof mof;
+  ASSERT_TRUE(
+      mof.read("\xEF\xBB\xBF// A byte order mark stands before this.\r\n"
+               R"(
+#pragma locale ("en_US")
+#PRAGMA something (1, "two", three)
+#pragma bare
+/* instances are skipped */
+INSTANCE OF Nowhere AS $n { [Description("x")] A = $other; B = {1, "x", $c}; c = 'x'; };
+[ASSOCIATION, Version ( "1." "0" ) : Translatable, ClassConstraint { "a", "b" }]
+Class Demo_Link as $Demo
+{
+  [KEY, Min(1)] demo_disk REF Disk;
+  [key ( TRUE )] Demo_File ref File;
+  [MaxLen(0x10), ValueMap {"1", "2"}, Values {}] String Tags[4] = {"a", "b", "c", "d"};
+  [Key(false), Description] uint8 Read = 1;
+  [Static(false)] uint32 Format([In, Required] string Label, [In(false), Out] Demo_Disk REF Disks[],
+                                uint8 Raw[2]);
+  sint64 Stop();
+};
+)")) << mof.diagnostics();
+  EXPECT_EQ(
+      mof.classAsText("demo_LINK"),
+      "[ASSOCIATION=TRUE Version=1.0 ClassConstraint=a b ] Demo_Link\n"
+      "[KEY=TRUE Min=1] reference to demo_disk Disk (Demo_Link)\n"
+      "[key=TRUE] reference to Demo_File File (Demo_Link)\n"
+      "[MaxLen=16 ValueMap=1 2  Values=] string[4] Tags = a b c d  (Demo_Link)\n"
+      "[Key=FALSE Description=null] uint8 Read = 1 (Demo_Link)\n"
+      "[Static=FALSE] uint32 Format([In=TRUE Required=TRUE] string Label, [In=FALSE Out=TRUE] "
+      "reference to Demo_Disk[] Disks, uint8[2] Raw) (Demo_Link)\n"
+      "sint64 Stop() (Demo_Link)\n");
+}
+
+TEST(MofReader, KeepsWhatStandsBeforeAnError) {
+  Mof mof;
+  EXPECT_FALSE(mof.read("class A {}; class B { uint9 x; }; class C {};"));
+  EXPECT_TRUE(mof.repository.hasClass(kNamespace, "A"));
+  EXPECT_FALSE(mof.repository.hasClass(kNamespace, "B"));
+  EXPECT_FALSE(mof.repository.hasClass(kNamespace, "C"));
+  EXPECT_TRUE(mof.read("class B {};"));
+}
+
+TEST(MofReader, EmptyTextDeclaresTheNamespace) {
+  Mof mof;
+  EXPECT_TRUE(mof.read(" // nothing"));
+  EXPECT_TRUE(mof.repository.hasNamespace("ROOT/test"));
+}
+
+TEST(MofReader, DeclaredQualifiersSayTypeScopeAndFlavor) {
+  Mof mof;
+  ASSERT_TRUE(
+      mof.read("Qualifier Owner : string = \"me\", Scope(class, property), "
+               "Flavor(DisableOverride, Restricted, Translatable);\n"
+               "qualifier Ports : uint16[] = {1, 2}, flavor(toinstance), scope(any);\n"
+               "class A { [Owner(\"you\"), Ports {80}] string P; [Ports] string Q; };"))
+      << mof.diagnostics();
+  EXPECT_EQ(mof.classAsText("A"),
+            "A\n[Owner=you Ports=80 ] string P (A)\n[Ports=null] string Q (A)\n");
+  const Pegasus::CIMQualifier owner = mof.repository.findQualifier(kNamespace, "OWNER");
+  EXPECT_EQ(text(owner.getValue().toString()), "me");
+  EXPECT_TRUE(owner.getFlavor().equal(CIMFlavor::DISABLEOVERRIDE + CIMFlavor::RESTRICTED +
+                                      CIMFlavor::TRANSLATABLE));
+  const Pegasus::CIMQualifier ports = mof.repository.findQualifier(kNamespace, "ports");
+  EXPECT_TRUE(ports.isArray());
+  EXPECT_TRUE(ports.getFlavor().equal(CIMFlavor::DEFAULTS + CIMFlavor::TOINSTANCE));
+  EXPECT_FALSE(mof.read("class B { uint8 M([Owner(\"x\")] uint8 a); };"));
+  EXPECT_EQ(mof.firstLine(), "t.mof:1:20: qualifier 'Owner' is not allowed here");
+}
+
+TEST(MofReader, FlavorsOfAUseReplaceThoseOfTheDeclaration) {
+  Mof mof;
+  ASSERT_TRUE(
+      mof.read("[Version(\"1\") : ToSubclass DisableOverride] class A {};"
+               "class B : A {}; class C : A { [Key : Restricted] uint8 K; };"
+               "class D : C {};"));
+  EXPECT_EQ(mof.classAsText("B"), "[Version^=1] B : A\n");
+  // A key stays one in subclasses whatever its flavor says.
+  EXPECT_EQ(mof.classAsText("D"), "[Version^=1] D : C\n[Key^=TRUE] uint8 K (C^)\n");
+  EXPECT_FALSE(mof.read("[Version(\"2\")] class E : A {};"));
+}
+
+TEST(MofReader, NamespacePragmaHoldsToTheEndOfItsFile) {
+  const TemporaryTree tree;
+  tree.write("a.mof", "class A {};\n#pragma include(\"sub/b.mof\")\nclass D : A {};");
+  tree.write("sub/b.mof",
+             "class B : A {};\n#pragma namespace(\"root/other\")\nclass C {};\n"
+             "#pragma include (\"c.mof\")\n");
+  tree.write("sub/c.mof", "class E : C {};");
+  Mof mof;
+  ASSERT_TRUE(mof.reader.readFile(tree.path("a.mof"), kNamespace)) << mof.diagnostics();
+  for (const char* name : {"A", "B", "D"}) {
+    EXPECT_TRUE(mof.repository.hasClass(kNamespace, name)) << name;
+  }
+  EXPECT_TRUE(mof.repository.hasClass("Root/Other", "E"));
+  EXPECT_FALSE(mof.repository.hasClass(kNamespace, "E"));
+}
+
+TEST(MofReader, ReadsAFileOnceThatSeveralInclude) {
+  const TemporaryTree tree;
+  tree.write("a.mof", "#pragma include(\"b.mof\")\n#pragma include(\"./c.mof\")\nclass A : B {};");
+  tree.write("b.mof", "#pragma include(\"c.mof\")\nclass B : C {};");
+  tree.write("c.mof", "class C {};");
+  Mof mof;
+  EXPECT_TRUE(mof.reader.readFile(tree.path("a.mof"), kNamespace)) << mof.diagnostics();
+  EXPECT_TRUE(mof.repository.isSubclass(kNamespace, "A", "C"));
+}
+
+TEST(MofReader, CatchesIncludesThatEndNowhere) {
+  const TemporaryTree tree;
+  tree.write("a.mof", "#pragma include(\"b.mof\")");
+  tree.write("b.mof", "class B {};\n#pragma include(\"../" +
+                          std::filesystem::path(tree.path()).filename().string() + "/a.mof\")");
+  for (int i = 0; i < 40; ++i) {
+    tree.write("deep" + std::to_string(i),
+               "#pragma include(\"deep" + std::to_string(i + 1) + "\")");
+  }
+  Mof mof;
+  EXPECT_FALSE(mof.reader.readFile(tree.path("a.mof"), kNamespace));
+  EXPECT_EQ(mof.firstLine(), tree.path("b.mof") + ":2:17: the file includes itself");
+  Mof deep;
+  EXPECT_FALSE(deep.reader.readFile(tree.path("deep0"), kNamespace));
+  EXPECT_EQ(deep.firstLine(), tree.path("deep31") + ":1:17: includes are nested more than 32 deep");
+}
+
+TEST(MofReader, ErrorsInIncludedFilesNameThem) {
+  const TemporaryTree tree;
+  tree.write("a.mof", "#pragma include(\"sub/b.mof\")\nclass A {};");
+  tree.write("sub/b.mof", "class B {};\nclass C : X {};");
+  Mof mof;
+  EXPECT_FALSE(mof.reader.readFile(tree.path("a.mof"), kNamespace));
+  EXPECT_EQ(mof.firstLine(), tree.path("sub/b.mof") + ":2:11: unknown superclass 'X'");
+  EXPECT_TRUE(mof.repository.hasClass(kNamespace, "B"));
+  EXPECT_FALSE(mof.repository.hasClass(kNamespace, "A"));
+}
+
+TEST(MofReader, FilesThatCannotBeReadAreDiagnostics) {
+  const TemporaryTree tree;
+  ASSERT_EQ(mkfifo(tree.path("pipe").c_str(), 0600), 0);
+  tree.write("big", "");
+  std::filesystem::resize_file(tree.path("big"), (std::uintmax_t{64} << 20) + 1);
+  tree.write("a.mof", "#pragma include (\".\")");
+  const struct {
+    const char* file;
+    const char* reason;
+  } cases[] = {{"", "is a directory, not a file"},
+               {"none", "No such file or directory"},
+               {"pipe", "is not a regular file"},
+               {"big", "is larger than 64 MiB"}};
+  for (const auto& c : cases) {
+    Mof mof;
+    EXPECT_FALSE(mof.reader.readFile(tree.path(c.file), kNamespace));
+    EXPECT_EQ(mof.diagnostics(), tree.path(c.file) + ": error: " + c.reason + '\n');
+  }
+  Mof mof;
+  EXPECT_FALSE(mof.reader.readFile(tree.path("a.mof"), kNamespace));
+  EXPECT_EQ(mof.firstLine(),
+            tree.path("a.mof") + ":1:18: cannot read '.': is a directory, not a file");
+}
+
+// Resolved classes hold their inherited features, so short texts could fill the memory.
+TEST(MofReader, NumbersOfClassesAndNamespacesAreBounded) {
+  std::string classes;
+  std::string namespaces;
+  for (int i = 0; i <= 65536; ++i) classes += "class C" + std::to_string(i) + "{};\n";
+  for (int i = 0; i <= 4096; ++i) {
+    namespaces += "#pragma namespace(\"n" + std::to_string(i) + "\")\nclass C {};\n";
+  }
+  Mof many;
+  EXPECT_FALSE(many.read(classes));
+  EXPECT_EQ(many.firstLine(), "t.mof:65537:7: more than 65536 classes");
+  Mof wide;
+  EXPECT_FALSE(wide.read(namespaces));
+  EXPECT_EQ(wide.firstLine(), "t.mof:8192:7: more than 4096 namespaces");
+}
+
+TEST(MofReader, CutTextsGiveOneDiagnosticEach) {
+  const std::string whole =
+      "#pragma locale(\"x\")\nQualifier Q : string[] = {\"\\x41\"}, scope(any), "
+      "flavor(restricted);\n"
+      "[Q {\"a\"} : tosubclass] class A { [Key] A REF P = \"A.k=1\"; uint8 M([In] real32 a[3]); "
+      "};\n"
+      "instance of A { P = {'x', -1.5e3, $b}; };";
+  for (std::size_t length = 0; length < whole.size(); ++length) {
+    Mof mof;
+    const bool fine = mof.read(whole.substr(0, length));
+    EXPECT_EQ(mof.reader.diagnostics().size(), fine ? 0u : 1u) << whole.substr(0, length);
+  }
+  Mof mof;
+  EXPECT_TRUE(mof.read(whole)) << mof.diagnostics();
+}
+
+}  // namespace
+}  // namespace cimhost_test

@@ -1,0 +1,75 @@
+#pragma once
+
+#include "cimhost/mof/MofReader.h"
+#include "tests/cimhost/repository/ClassText.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <string>
+
+namespace cimhost_test {
+
+inline const Pegasus::CIMNamespaceName kNamespace("root/test");
+
+/// A repository and a reader that fills it.
+struct Mof {
+  cimhost::ClassRepository repository;
+  cimhost::MofReader reader{repository};
+
+  bool read(const std::string& mof) { return reader.readText(mof, "t.mof", kNamespace); }
+
+  /// All diagnostics, each ended by a newline.
+  std::string diagnostics() const {
+    std::string result;
+    for (const auto& diagnostic : reader.diagnostics()) result += diagnostic.toString() + '\n';
+    return result;
+  }
+
+  /// The first line of the first diagnostic, without "error: ".
+  std::string firstLine() const {
+    std::string all = diagnostics();
+    all = all.substr(0, all.find('\n'));
+    const std::size_t word = all.find("error: ");
+    return word == std::string::npos ? all : all.erase(word, 7);
+  }
+
+  Pegasus::CIMClass get(const char* name, const Pegasus::CIMNamespaceName& ns = kNamespace) const {
+    return repository.getClass(ns, name, false, true, true, Pegasus::CIMPropertyList());
+  }
+
+  /// The class as classText() writes it, or the diagnostics when there are any.
+  std::string classAsText(const char* name) const {
+    const std::string problems = diagnostics();
+    return problems.empty() ? classText(get(name)) : problems;
+  }
+};
+
+/// A directory that lives as long as the object.
+class TemporaryTree {
+ public:
+  TemporaryTree() {
+    std::string pattern = (std::filesystem::temp_directory_path() / "mofXXXXXX").string();
+    if (mkdtemp(pattern.data()) == nullptr) throw std::runtime_error("mkdtemp");
+    root_ = pattern;
+  }
+  ~TemporaryTree() { std::filesystem::remove_all(root_); }
+  TemporaryTree(const TemporaryTree&) = delete;
+  TemporaryTree& operator=(const TemporaryTree&) = delete;
+
+  std::string path(const std::string& relative = "") const {
+    return relative.empty() ? root_.string() : (root_ / relative).string();
+  }
+
+  void write(const std::string& relative, const std::string& content) const {
+    std::filesystem::create_directories((root_ / relative).parent_path());
+    std::ofstream(root_ / relative, std::ios::binary) << content;
+  }
+
+ private:
+  std::filesystem::path root_;
+};
+
+}  // namespace cimhost_test

@@ -1,0 +1,327 @@
+#include "cimhost/repository/ClassRepository.h"
+
+#include "cimhost/repository/ClassDeclarationError.h"
+#include "tests/cimhost/mof/MofTestSupport.h"
+
+#include <gtest/gtest.h>
+
+#include <thread>
+
+namespace cimhost_test {
+namespace {
+
+using namespace Pegasus;
+
+std::string names(const std::vector<CIMName>& list) {
+  std::string result;
+  for (const CIMName& name : list) result += text(name.getString()) + ' ';
+  return result;
+}
+
+/// "code:text" of the exception that `action` throws.
+template <class Action>
+std::string errorOf(Action action) {
+  try {
+    action();
+  } catch (const CIMException& exception) {
+    return std::to_string(exception.getCode()) + ':' + text(exception.getMessage());
+  }
+  return "none";
+}
+
+template <class Case>
+std::string caseName(const testing::TestParamInfo<Case>& test) {
+  return test.param.name;
+}
+
+/// What a class looks like at the end of a chain of declarations.
+struct InheritanceCase {
+  const char* name;
+  const char* mof;
+  const char* cimClass;
+  const char* expected;
+};
+
+class Inheritance : public testing::TestWithParam<InheritanceCase> {};
+
+TEST_P(Inheritance, Resolves) {
+  Mof mof;
+  mof.read(GetParam().mof);
+  EXPECT_EQ(mof.classAsText(GetParam().cimClass), GetParam().expected);
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Features, Inheritance,
+    testing::Values(
+        InheritanceCase{"InheritedFirstThenOwn",
+                        "class A { uint8 A1; uint8 A2 = 5; }; class B : a { uint8 B1; };"
+                        "class C : B { uint8 C1; };",
+                        "C",
+                        "C : B\nuint8 A1 (A^)\nuint8 A2 = 5 (A^)\nuint8 B1 (B^)\nuint8 C1 (C)\n"},
+        InheritanceCase{"OverriddenAtItsPlaceWithTheOldOrigin",
+                        "class A { uint8 X = 1; uint8 Y; uint8 Z; };"
+                        "class B : A { uint8 N; uint8 y = 3; uint8 X; };",
+                        "B", "B : A\nuint8 Z (A^)\nuint8 N (B)\nuint8 y = 3 (A)\nuint8 X (A)\n"},
+        InheritanceCase{"OverriddenTwiceAndInherited",
+                        "class A { uint8 X; }; class B : A { uint8 X = 1; };"
+                        "class C : B { uint8 X = 2; }; class D : C {};",
+                        "D", "D : C\nuint8 X = 2 (A^)\n"},
+        InheritanceCase{"Methods",
+                        "class A { uint8 M([In] string s); uint8 N(); };"
+                        "class B : A { uint8 O(); uint8 m([Out] string S, uint8 t); };"
+                        "class C : B {};",
+                        "C",
+                        "C : B\nuint8 N() (A^)\nuint8 O() (B^)\n"
+                        "uint8 m([Out^=TRUE In^=TRUE] string S, uint8 t) (A^)\n"},
+        InheritanceCase{"References", "class A { A REF P; }; class B : A { B REF P; };", "B",
+                        "B : A\nreference to B P (A)\n"}),
+    caseName<InheritanceCase>);
+
+INSTANTIATE_TEST_SUITE_P(
+    Qualifiers, Inheritance,
+    testing::Values(
+        InheritanceCase{
+            "RestrictedStay",
+            "[Abstract, Description(\"d\"), Version(\"1\"), Deprecated {\"x\"}] class A {"
+            " [Experimental, Key] uint8 K; [Deprecated] uint8 M([Experimental, In] uint8 "
+            "p); };"
+            "class B : A {};",
+            "B",
+            "[Description^=d] B : A\n[Key^=TRUE] uint8 K (A^)\n"
+            "uint8 M([In^=TRUE] uint8 p) (A^)\n"},
+        InheritanceCase{"OverridingFeatureKeepsTheOthers",
+                        "class A { [Key, Description(\"a\"), MaxLen(3)] string K; };"
+                        "class B : A { [Override(\"A.k\"), MaxLen(5)] string K; };"
+                        "class C : B { [Description(\"c\")] string K; };",
+                        "C", "C : B\n[Description=c MaxLen^=5 Key^=TRUE] string K (A)\n"},
+        InheritanceCase{"SameFixedValueMayBeRepeated",
+                        "[Association] class A { [Key] A REF K; };"
+                        "[Association(true)] class B : A { [Key(TRUE)] A REF K; };",
+                        "B", "[Association=TRUE] B : A\n[Key=TRUE] reference to A K (A)\n"},
+        InheritanceCase{"AssociationScopeIsInherited",
+                        "[Association] class A {}; [Aggregation] class B : A {};", "B",
+                        "[Aggregation=TRUE Association^=TRUE] B : A\n"},
+        InheritanceCase{"FalseKeyIsNoKey", "class A { [Key(false)] uint8 P; uint8 Q; };", "A",
+                        "A\n[Key=FALSE] uint8 P (A)\nuint8 Q (A)\n"},
+        InheritanceCase{
+            "OwnDisableOverrideBinds",
+            "class A { [MaxLen(1) : DisableOverride] string S; };"
+            "class B : A { [MaxLen(1) : EnableOverride] string S; };"
+            "class C : B { [MaxLen(2)] string S; };",
+            "C",
+            "t.mof:1:137: error: qualifier 'MaxLen' cannot be overridden: the superclass "
+            "fixes its value\n"}),
+    caseName<InheritanceCase>);
+
+const char* const kModel =
+    "[Description(\"a\")] class A { [Key] uint8 K; uint8 P; uint8 M([In] uint8 p); };\n"
+    "class B : A { [Write] uint8 Q; uint8 p; [Static] uint8 N(); };\n";
+
+struct Filter {
+  const char* name;
+  bool localOnly, qualifiers, origins;
+  std::vector<const char*> list;  // {"*"}: the null list.
+  const char* expected;
+};
+
+class GetClass : public testing::TestWithParam<Filter> {};
+
+TEST_P(GetClass, Filters) {
+  Mof mof;
+  ASSERT_TRUE(mof.read(kModel));
+  Array<CIMName> listed;
+  for (const char* name : GetParam().list) {
+    if (*name != '*') listed.append(CIMName(name));
+  }
+  const bool all = !GetParam().list.empty() && *GetParam().list[0] == '*';
+  const CIMPropertyList list = all ? CIMPropertyList() : CIMPropertyList(listed);
+  const CIMClass b = mof.repository.getClass("Root/Test", "b", GetParam().localOnly,
+                                             GetParam().qualifiers, GetParam().origins, list);
+  EXPECT_EQ(classText(b), GetParam().expected);
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Flags, GetClass,
+    testing::Values(
+        Filter{"Everything",
+               false,
+               true,
+               true,
+               {"*"},
+               "[Description^=a] B : A\n[Key^=TRUE] uint8 K (A^)\n[Write=TRUE] uint8 Q (B)\n"
+               "uint8 p (A)\nuint8 M([In^=TRUE] uint8 p) (A^)\n[Static=TRUE] uint8 N() (B)\n"},
+        Filter{"LocalOnly",
+               true,
+               true,
+               true,
+               {"*"},
+               "[Description^=a] B : A\n[Write=TRUE] uint8 Q (B)\nuint8 p (A)\n"
+               "[Static=TRUE] uint8 N() (B)\n"},
+        Filter{"NoQualifiers",
+               false,
+               false,
+               true,
+               {"*"},
+               "B : A\nuint8 K (A^)\nuint8 Q (B)\nuint8 p (A)\nuint8 M(uint8 p) (A^)\n"
+               "uint8 N() (B)\n"},
+        Filter{"NoOrigins",
+               true,
+               false,
+               false,
+               {"*"},
+               "B : A\nuint8 Q ()\nuint8 p ()\nuint8 N() ()\n"},
+        Filter{"Listed",
+               false,
+               false,
+               true,
+               {"P", "k", "Other"},
+               "B : A\nuint8 K (A^)\nuint8 p (A)\nuint8 M(uint8 p) (A^)\nuint8 N() (B)\n"},
+        Filter{
+            "ListedAndLocal", true, false, true, {"P", "k"}, "B : A\nuint8 p (A)\nuint8 N() (B)\n"},
+        Filter{"EmptyList", true, false, true, {}, "B : A\nuint8 N() (B)\n"}),
+    caseName<Filter>);
+
+TEST(ClassRepository, EveryFetchedClassIsAnother) {
+  Mof mof;
+  ASSERT_TRUE(mof.read(kModel));
+  const std::string before = mof.classAsText("B");
+  CIMClass b = mof.get("B");
+  EXPECT_EQ(text(b.getPath().toString()), "B");
+  b.getProperty(0).setValue(CIMValue(Uint8(7)));
+  b.getProperty(1).removeQualifier(0);
+  b.getMethod(0).getParameter(0).getQualifier(0).setValue(CIMValue(false));
+  b.getMethod(0).setClassOrigin("Z");
+  b.removeProperty(2);
+  b.removeQualifier(0);
+  b.addQualifier(CIMQualifier("Version", CIMValue(String("1"))));
+  EXPECT_EQ(mof.classAsText("B"), before);
+  // Inherited features are shared inside; filtering one class must not show in the other.
+  mof.repository.getClass(kNamespace, "B", false, false, false, CIMPropertyList());
+  EXPECT_EQ(mof.classAsText("A"),
+            "[Description=a] A\n[Key=TRUE] uint8 K (A)\nuint8 P (A)\nuint8 M([In=TRUE] uint8 p) "
+            "(A)\n");
+}
+
+TEST(ClassRepository, ThreadsMayFetchAndChangeAtOnce) {
+  Mof mof;
+  ASSERT_TRUE(mof.read(std::string(kModel) + "class C : B {}; class D : C {};"));
+  const std::string before = mof.classAsText("D");
+  std::vector<std::thread> threads;
+  for (int i = 0; i < 4; ++i) {
+    threads.emplace_back([&mof] {
+      for (int n = 0; n < 300; ++n) {
+        CIMClass d = mof.get(n % 2 == 0 ? "D" : "C");
+        d.getProperty(0).setValue(CIMValue(Uint8(1)));
+        mof.repository.getClass(kNamespace, "D", true, false, false, CIMPropertyList());
+        mof.repository.subclassNames(kNamespace, "A", true);
+      }
+    });
+  }
+  for (std::thread& thread : threads) thread.join();
+  EXPECT_EQ(mof.classAsText("D"), before);
+}
+
+TEST(ClassRepository, Hierarchy) {
+  Mof mof;
+  ASSERT_TRUE(
+      mof.read("class A {}; class X {}; class B : A {}; class C : A {}; class D : B {};"
+               "class E : X {}; class F : A {};"));
+  const cimhost::ClassRepository& repository = mof.repository;
+  EXPECT_EQ(names(repository.subclassNames(kNamespace, "a", false)), "B C F ");
+  EXPECT_EQ(names(repository.subclassNames(kNamespace, "A", true)), "B C D F ");
+  EXPECT_EQ(names(repository.subclassNames(kNamespace, "D", true)), "");
+  EXPECT_EQ(names(repository.subclassNames(kNamespace, CIMName(), false)), "A X ");
+  EXPECT_EQ(names(repository.subclassNames(kNamespace, CIMName(), true)), "A X B C D E F ");
+  EXPECT_TRUE(repository.isSubclass(kNamespace, "d", "A"));
+  EXPECT_TRUE(repository.isSubclass(kNamespace, "A", "a"));
+  EXPECT_FALSE(repository.isSubclass(kNamespace, "A", "D"));
+  EXPECT_FALSE(repository.isSubclass(kNamespace, "D", "X"));
+  EXPECT_FALSE(repository.isSubclass(kNamespace, "Nope", "Nope"));
+  EXPECT_FALSE(repository.isSubclass("root/none", "A", "A"));
+}
+
+TEST(ClassRepository, DeepHierarchiesNeedNoStack) {
+  std::string mof = "class C0 {};";
+  for (int i = 1; i < 20000; ++i) {
+    mof += "class C" + std::to_string(i) + " : C" + std::to_string(i - 1) + " {};";
+  }
+  Mof chain;
+  ASSERT_TRUE(chain.read(mof));
+  EXPECT_TRUE(chain.repository.isSubclass(kNamespace, "C19999", "C0"));
+  EXPECT_EQ(chain.repository.subclassNames(kNamespace, "C0", true).size(), 19999u);
+}
+
+TEST(ClassRepository, ErrorsHaveTheCodesOfTheServer) {
+  Mof mof;
+  ASSERT_TRUE(mof.read("class A { uint8 P; };"));
+  cimhost::ClassRepository& repository = mof.repository;
+  const auto fetch = [&](const CIMNamespaceName& ns, const CIMName& name) {
+    return errorOf([&] { repository.getClass(ns, name, false, true, true, CIMPropertyList()); });
+  };
+  EXPECT_EQ(fetch(kNamespace, "Nope"), "6:Nope");
+  EXPECT_EQ(fetch(kNamespace, CIMName()), "6:");
+  EXPECT_EQ(fetch("root/None", "A"), "3:root/None");
+  EXPECT_EQ(fetch(CIMNamespaceName(), "A"), "3:");
+  EXPECT_EQ(errorOf([&] { repository.subclassNames(kNamespace, "Nope", true); }), "6:Nope");
+  EXPECT_EQ(errorOf([&] { repository.subclassNames("none", CIMName(), true); }), "3:none");
+  EXPECT_EQ(errorOf([&] { repository.addClass("none", CIMClass("B")); }), "3:none");
+  EXPECT_EQ(errorOf([&] { repository.addClass(kNamespace, CIMClass("a")); }), "11:a");
+  EXPECT_EQ(errorOf([&] { repository.addClass(kNamespace, CIMClass("B", "C")); }), "10:C");
+  EXPECT_EQ(errorOf([&] { repository.addNamespace(CIMNamespaceName()); }), "3:");
+}
+
+TEST(ClassRepository, ARefusedClassLeavesNoTraceAndTellsThePart) {
+  Mof mof;
+  ASSERT_TRUE(mof.read("class A { uint8 P; };"));
+  CIMClass b("B", "A");
+  CIMMethod method("M", CIMTYPE_UINT8);
+  CIMParameter parameter("p", CIMTYPE_UINT8);
+  parameter.addQualifier(CIMQualifier("In", CIMValue(String("yes"))));
+  method.addParameter(parameter);
+  b.addMethod(method);
+  try {
+    mof.repository.addClass(kNamespace, b);
+    FAIL() << "was added";
+  } catch (const cimhost::ClassDeclarationError& error) {
+    EXPECT_EQ(text(error.getMessage()), "qualifier 'In' has a value of another type than declared");
+    EXPECT_EQ(text(error.part().feature.getString()), "M");
+    EXPECT_EQ(text(error.part().parameter.getString()), "p");
+    EXPECT_EQ(text(error.part().qualifier.getString()), "In");
+  }
+  EXPECT_FALSE(mof.repository.hasClass(kNamespace, "B"));
+  EXPECT_EQ(names(mof.repository.subclassNames(kNamespace, "A", true)), "");
+}
+
+// Qualifiers without a flavor, as code rather than a MOF text gives them, follow the declaration.
+TEST(ClassRepository, DeclaredClassIsCopiedAndGetsDeclaredFlavors) {
+  cimhost::ClassRepository repository;
+  repository.addNamespace(kNamespace);
+  CIMClass a("A");
+  CIMProperty key("K", CIMValue(CIMTYPE_UINT8, false));
+  key.addQualifier(CIMQualifier("Key", CIMValue(true)));
+  a.addProperty(key);
+  repository.addClass(kNamespace, a);
+  key.getQualifier(0).setValue(CIMValue(false));
+  a.removeProperty(0);
+  repository.addClass(kNamespace, CIMClass("B", "A"));
+  const CIMClass b = repository.getClass(kNamespace, "B", false, true, true, CIMPropertyList());
+  EXPECT_EQ(classText(b), "B : A\n[Key^=TRUE] uint8 K (A^)\n");
+  EXPECT_TRUE(b.getProperty(0).getQualifier(0).getFlavor().equal(CIMFlavor::DISABLEOVERRIDE +
+                                                                 CIMFlavor::TOSUBCLASS));
+}
+
+TEST(ClassRepository, NamespacesAreSeparate) {
+  Mof mof;
+  ASSERT_TRUE(mof.read("Qualifier Mine : boolean, scope(any); class A { uint8 P; };"));
+  ASSERT_TRUE(mof.reader.readText("class A { string S; };", "u.mof", "root/other"));
+  mof.repository.addNamespace("ROOT/Test");
+  EXPECT_EQ(mof.repository.namespaces().size(), 2u);
+  EXPECT_EQ(text(mof.repository.namespaces()[0].getString()), "root/test");
+  EXPECT_EQ(classText(mof.get("A", "root/other")), "A\nstring S (A)\n");
+  EXPECT_FALSE(mof.repository.findQualifier("root/test", "mine").isUninitialized());
+  EXPECT_TRUE(mof.repository.findQualifier("root/other", "mine").isUninitialized());
+  EXPECT_FALSE(mof.repository.findQualifier("root/other", "VALUEMAP").isUninitialized());
+}
+
+}  // namespace
+}  // namespace cimhost_test
