@@ -7,7 +7,6 @@
 
 #include <CLI/CLI.hpp>
 
-#include <map>
 #include <vector>
 
 namespace cimhost {
@@ -24,11 +23,17 @@ constexpr const char* kFooter =
     "provider library unusable; 4 results could not be written; 10 + CIM status code when the\n"
     "operation failed, for example 16 for CIM_ERR_NOT_FOUND.";
 
-const std::map<std::string, OutputFormat> kFormats = {
+struct FormatRow {
+  const char* name;
+  OutputFormat format;
+};
+
+constexpr FormatRow kFormats[] = {
     {"table", OutputFormat::table}, {"mof", OutputFormat::mof}, {"json", OutputFormat::json}};
 
 // The texts as given, before they become CIM names.
 struct Arguments {
+  std::string format = "table";
   std::string target;
   std::vector<std::string> properties;
 };
@@ -80,15 +85,15 @@ void addCommand(CLI::App& app, const CommandRow& row, CommandLine& line, Argumen
   }
 }
 
-void addGlobalOptions(CLI::App& app, CommandLine& line) {
+void addGlobalOptions(CLI::App& app, CommandLine& line, Arguments& arguments) {
   app.add_option("--home", line.home, "Home directory with run, lib, logs and mof")
       ->required()
       ->type_name("DIR");
   app.add_option("--provider", line.providerFile, "Provider library instead of the one found")
       ->type_name("FILE");
-  app.add_option("--format", line.format, "table, mof or json; default: table")
-      ->transform(CLI::Transformer(kFormats))
-      ->type_name("FORMAT");
+  app.add_option("--format", arguments.format, "How results are printed; default: table")
+      ->check(CLI::IsMember({"table", "mof", "json"}))
+      ->type_name("");
   app.add_flag("--trace", line.trace, "Show the provider's trace lines on standard error");
 }
 
@@ -101,6 +106,9 @@ Pegasus::CIMPropertyList toPropertyList(const std::vector<std::string>& names) {
 
 // Throws PathArgumentError and Pegasus::Exception.
 void convertArguments(const Arguments& arguments, CommandLine& line) {
+  for (const FormatRow& row : kFormats) {
+    if (row.name == arguments.format) line.format = row.format;
+  }
   for (const CommandRow& row : kCommands) {
     if (row.command == line.command && row.parse != nullptr) {
       line.target = row.parse(arguments.target);
@@ -118,7 +126,7 @@ std::optional<CommandLine> parseCommandLine(int argc, const char* const* argv, s
   CLI::App app("Embedded CIM host for provider definitions", "cimhost");
   app.footer(kFooter);
   app.require_subcommand(1);
-  addGlobalOptions(app, line);
+  addGlobalOptions(app, line, arguments);
   for (const CommandRow& row : kCommands) addCommand(app, row, line, arguments);
   exitCode = ExitCode::kUsage;
   try {

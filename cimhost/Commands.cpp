@@ -125,7 +125,9 @@ int runCheck(const Host& host, std::ostream& out) {
     return each.severity == Diagnostic::Severity::error;
   });
   const auto warnings = static_cast<std::ptrdiff_t>(problems.size()) - errors;
-  out << counted(errors, "error") << ", " << counted(warnings, "warning") << std::endl;
+  const auto served = static_cast<std::ptrdiff_t>(host.served().all().size());
+  out << counted(served, "definition") << ", " << counted(errors, "error") << ", "
+      << counted(warnings, "warning") << std::endl;
   if (!out) return ExitCode::kOutput;
   return errors > 0 ? ExitCode::kProblems : ExitCode::kOk;
 }

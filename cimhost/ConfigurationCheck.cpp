@@ -1,5 +1,6 @@
 #include "cimhost/ConfigurationCheck.h"
 
+#include <cstdint>
 #include <filesystem>
 #include <fstream>
 
@@ -10,6 +11,7 @@ namespace {
 constexpr const char* kBlanks = " \t\r";
 constexpr const char* kLogLevel = "LogLevel";
 constexpr std::size_t kMaximumProblems = 100;
+constexpr std::uintmax_t kMaximumSize = 1024 * 1024;
 
 bool isDecimal(const std::string& text) {
   const std::size_t digits = !text.empty() && (text[0] == '-' || text[0] == '+') ? 1 : 0;
@@ -78,12 +80,18 @@ std::vector<Diagnostic> checkConfiguration(std::istream& text, const std::string
 }
 
 std::vector<Diagnostic> checkConfigurationFile(const std::string& path, const std::string& name) {
+  namespace fs = std::filesystem;
+  const auto problem = [&name](const char* message) {
+    return std::vector<Diagnostic>{{Diagnostic::Severity::error, name, 0, 0, message, {}}};
+  };
   std::error_code error;
-  if (!std::filesystem::exists(path, error)) return {};
+  if (!fs::exists(path, error)) return {};
+  // Opening a pipe would wait for a writer.
+  if (!fs::is_regular_file(path, error)) return problem("not a regular file");
+  const std::uintmax_t size = fs::file_size(path, error);
+  if (error || size > kMaximumSize) return problem("larger than 1 MiB");
   std::ifstream file(path);
-  if (!file || !std::filesystem::is_regular_file(path, error)) {
-    return {{Diagnostic::Severity::error, name, 0, 0, "cannot be read", {}}};
-  }
+  if (!file) return problem("cannot be read");
   return checkConfiguration(file, name);
 }
 

@@ -13,7 +13,7 @@ namespace cimhost {
 std::vector<Diagnostic> checkConfiguration(std::istream& text, const std::string& file);
 
 /// The same for a file. A missing file is no problem (the log level is 0 then); one that cannot be
-/// read is.
+/// read, or is larger than 1 MiB, is.
 std::vector<Diagnostic> checkConfigurationFile(const std::string& path, const std::string& name);
 
 }  // namespace cimhost

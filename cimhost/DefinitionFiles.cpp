@@ -31,7 +31,9 @@ Diagnostic toDiagnostic(const definition::Problem& problem, const std::string& f
   diagnostic.line = problem.line;
   diagnostic.column = problem.column;
   diagnostic.message = problem.message;
-  if (problem.line > 0) diagnostic.source = readSourceLine(problem.file, problem.line);
+  // The source is cut: a place behind what is there gets no caret line.
+  const bool shown = static_cast<std::size_t>(problem.column) <= problem.source.size() + 1;
+  if (shown) diagnostic.source = problem.source;
   return diagnostic;
 }
 

@@ -3,14 +3,11 @@
 #include "cimhost/output/DisplayText.h"
 
 #include <algorithm>
-#include <fstream>
-#include <limits>
 
 namespace cimhost {
 
 namespace {
 
-constexpr std::size_t kLongestSource = 4096;
 constexpr std::size_t kShownBefore = 60;
 constexpr std::size_t kShownAfter = 40;
 
@@ -45,17 +42,6 @@ std::string Diagnostic::toString() const {
   text += severity == Severity::error ? ": error: " : ": warning: ";
   text += displayLines(message);
   if (!source.empty() && column > 0) text += caretLines(source, column);
-  return text;
-}
-
-std::string readSourceLine(const std::string& path, int line) {
-  std::ifstream file(path, std::ios::binary);
-  for (int current = 1; file && current < line; ++current) {
-    file.ignore(std::numeric_limits<std::streamsize>::max(), '\n');
-  }
-  std::string text;
-  for (char byte; text.size() < kLongestSource && file.get(byte) && byte != '\n';) text += byte;
-  if (!text.empty() && text.back() == '\r') text.pop_back();
   return text;
 }
 

@@ -21,9 +21,6 @@ struct Diagnostic {
   std::string toString() const;
 };
 
-/// The text of line `line` (from 1) of a file, at most 4 KiB of it; empty when there is none.
-std::string readSourceLine(const std::string& path, int line);
-
 /// The source line and the caret line below it, each with a line end in front; a long line is cut
 /// to what stands around the column (from 1, in bytes).
 std::string caretLines(const std::string& source, int column);

@@ -65,13 +65,13 @@ CIMObjectPath parsePath(const std::string& text) {
   if (text.compare(0, 2, "//") == 0) {
     throw PathArgumentError(text, 0, "a host cannot be named here");
   }
-  const std::string reason = malformedReason(text);
-  if (!reason.empty()) throw PathArgumentError(text, findProblem(text), reason);
-  const CIMObjectPath path{fromUtf8(text)};
-  if (path.getNameSpace().isNull()) {
+  const std::size_t colon = text.find(':');
+  if (colon == std::string::npos || colon > text.find('.')) {
     throw PathArgumentError(text, 0, "no namespace before the class, as in root/cimv2:CLASS");
   }
-  return path;
+  const std::string reason = malformedReason(text);
+  if (!reason.empty()) throw PathArgumentError(text, findProblem(text), reason);
+  return CIMObjectPath{fromUtf8(text)};
 }
 
 std::size_t keysPosition(const std::string& text) {

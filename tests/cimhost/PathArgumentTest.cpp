@@ -53,7 +53,10 @@ INSTANTIATE_TEST_SUITE_P(
         MalformedCase{"Host", parseClassPath, "//h/root:A", 1, "host"},
         MalformedCase{"KeysOnClass", parseClassPath, "root:A.a=1", 7, "no keys"},
         MalformedCase{"NoKeys", parseInstancePath, "root:A", 7, "no keys"},
-        MalformedCase{"Empty", parseClassPath, "", 1, "class name"},
+        MalformedCase{"Empty", parseClassPath, "", 1, "no namespace"},
+        MalformedCase{"BareNamespace", parseClassPath, "root/host", 1, "no namespace"},
+        MalformedCase{"ColonInValue", parseInstancePath, "A.k=\"x:y\"", 1, "no namespace"},
+        MalformedCase{"NoClass", parseClassPath, "root:", 6, "class name"},
         MalformedCase{"EmptyNamespace", parseNamespaceOrClass, "", 1, "namespace"},
         MalformedCase{"NotUtf8", parseClassPath, "root:\xff", 6, "UTF-8"}),
     [](const auto& row) { return std::string(row.param.name); });

@@ -2,6 +2,7 @@
 
 #include <Pegasus/Provider/CIMInstanceProvider.h>
 
+#include <cstdio>
 #include <cstdlib>
 #include <functional>
 #include <map>
@@ -88,6 +89,12 @@ void deliverWithoutNamespace(const Request& request) {
   request.complete();
 }
 
+void deliverPrinting(const Request& request) {
+  std::puts("noise");
+  request.deliver("quiet");
+  request.complete();
+}
+
 void deliverArray(const Request& request) {
   Array<CIMInstance> instances;
   for (const char* name : {"x", "y"}) {
@@ -101,6 +108,7 @@ const std::map<std::string, Behaviour> kBehaviours = {
     {"Test_Disk", [](const Request& r) { r.deliver("a"), r.deliver("b"), r.complete(); }},
     {"Test_BigDisk", [](const Request& r) { r.deliver("big"), r.complete(); }},
     {"Test_Array", deliverArray},
+    {"Test_Prints", deliverPrinting},
     {"Test_Nothing", [](const Request&) {}},
     {"Test_OnlyCompletes", [](const Request& r) { r.complete(); }},
     {"Test_NoComplete", [](const Request& r) { r.deliver("lost"); }},

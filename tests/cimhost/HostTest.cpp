@@ -1,0 +1,208 @@
+#include "cimhost/Commands.h"
+#include "cimhost/HostError.h"
+
+#include <gmock/gmock.h>
+#include <nlohmann/json.hpp>
+
+#include <sys/stat.h>
+
+#include <cstdio>
+#include <filesystem>
+#include <fstream>
+#include <sstream>
+
+namespace {
+
+using namespace cimhost;
+using testing::ElementsAre;
+using testing::HasSubstr;
+namespace fs = std::filesystem;
+
+constexpr const char* kClasses =
+    "class Test_Base { [Key] string Name; uint64 Size; };\n"
+    "class Test_Disk : Test_Base { };\n"
+    "class Test_BigDisk : Test_Disk { };\n"
+    "class Test_ThrowsCim : Test_Base { };\n"
+    "class Test_ManyThrows : Test_Base { };\n"
+    "class Test_Prints : Test_Base { };\n";
+
+std::string definitionOf(const std::string& name) {
+  return "<class name=\"" + name +
+         "\" namespace=\"root/test\"><instances><constant type=\"int\">1</constant></instances>"
+         "</class>\n";
+}
+
+// A home directory of its own; the process gets back its working directory.
+class HostTest : public testing::Test {
+ protected:
+  HostTest() : before_(fs::current_path()) {
+    std::string name = (fs::temp_directory_path() / "cimhost_test_XXXXXX").string();
+    home_ = mkdtemp(name.data());
+    for (const char* folder : {"run", "lib", "logs", "mof/root/test"}) {
+      fs::create_directories(home_ / folder);
+    }
+  }
+  ~HostTest() override {
+    fs::current_path(before_);
+    fs::remove_all(home_);
+  }
+
+  void write(const std::string& name, const std::string& text) {
+    std::ofstream(home_ / name, std::ios::binary) << text;
+  }
+
+  void writeGoodFiles() {
+    write("mof/root/test/classes.mof", kClasses);
+    std::string text = "<plugin>\n<module name=\"m\" path=\"short\"></module>\n";
+    for (const char* name :
+         {"Test_Disk", "Test_BigDisk", "Test_ThrowsCim", "Test_ManyThrows", "Test_Prints"}) {
+      text += definitionOf(name);
+    }
+    write("run/test.xml", text + "</plugin>\n");
+  }
+
+  std::vector<std::string> diagnostics() {
+    const Host host(home_.string());
+    std::vector<std::string> lines;
+    for (const Diagnostic& each : host.diagnostics()) {
+      const std::string text = each.toString();
+      lines.push_back(text.substr(0, text.find('\n')));
+    }
+    return lines;
+  }
+
+  int run(const std::vector<const char*>& arguments) {
+    const std::string home = home_.string();
+    std::vector<const char*> all = {"cimhost", "--home", home.c_str()};
+    all.insert(all.end(), arguments.begin(), arguments.end());
+    out_.str("");
+    error_.str("");
+    int code = 0;
+    const auto line =
+        parseCommandLine(static_cast<int>(all.size()), all.data(), out_, error_, code);
+    if (!line) return code;
+    Host host(line->home);
+    if (needsProvider(line->command)) host.loadProvider(TEST_PROVIDER_FILE);
+    return runCommand(*line, host, out_, error_);
+  }
+
+  std::string shell(const std::string& arguments) {
+    const std::string command = std::string(CIMHOST_FILE) + " --home " + home_.string() +
+                                " --provider " + TEST_PROVIDER_FILE + " " + arguments;
+    std::string text;
+    FILE* pipe = popen(command.c_str(), "r");
+    for (int byte; pipe != nullptr && (byte = fgetc(pipe)) != EOF;) text += static_cast<char>(byte);
+    status_ = WEXITSTATUS(pclose(pipe));
+    return text;
+  }
+
+  fs::path before_;
+  fs::path home_;
+  std::ostringstream out_;
+  std::ostringstream error_;
+  int status_ = -1;
+};
+
+TEST_F(HostTest, AnUnusableHomeIsNamed) {
+  fs::remove(home_ / "run");
+  try {
+    const Host host(home_.string());
+    FAIL();
+  } catch (const HostError& error) {
+    EXPECT_THAT(error.what(), HasSubstr("/run: No such file or directory"));
+  }
+  EXPECT_THROW(Host("/no/such/home"), HostError);
+}
+
+TEST_F(HostTest, EveryProblemIsReportedAndTheRestServes) {
+  writeGoodFiles();
+  write("mof/root/test/bad.mof", "class X {\n  string;\n};\n");
+  write("run/bad.xml", "<plugin>\n<module name=\"n\" path=\"short\"></module>\n" +
+                           definitionOf("Test_Missing") +
+                           "<class name=\"Y\">\n</class>\n</plugin>");
+  write("run/names.xml",
+        "<plugin><module name=\"o\" path=\"short\"></module>" + definitionOf("1x") + "</plugin>");
+  write("logs/CommonProvider.ini", "LogLevel=9\nlevel\n");
+  EXPECT_THAT(
+      diagnostics(),
+      testing::UnorderedElementsAre(
+          testing::StartsWith("mof/root/test/bad.mof:2:9: error: "),
+          testing::MatchesRegex("run/bad.xml:[45]:[0-9]+: error: .*"),
+          "run/names.xml: error: class 1x is not served: The CIM name is not valid: 1x",
+          "run/bad.xml: warning: class Test_Missing is defined, but not declared in namespace "
+          "root/test; no client can reach it",
+          "logs/CommonProvider.ini:2:1: error: expected key = value"));
+  EXPECT_EQ(run({"check"}), ExitCode::kProblems);
+  EXPECT_THAT(out_.str(), testing::EndsWith("6 definitions, 4 errors, 1 warning\n"));
+  EXPECT_EQ(error_.str(), "");
+  EXPECT_EQ(run({"names", "root/test:Test_BigDisk"}), ExitCode::kOk);
+  EXPECT_THAT(error_.str(), HasSubstr("bad.mof:2:9"));
+}
+
+TEST_F(HostTest, AGoodHomeChecksWell) {
+  writeGoodFiles();
+  EXPECT_EQ(run({"check"}), ExitCode::kOk);
+  EXPECT_EQ(out_.str(), "5 definitions, 0 errors, 0 warnings\n");
+}
+
+TEST_F(HostTest, OddFilesDoNotHangTheCheck) {
+  writeGoodFiles();
+  fs::create_directory(home_ / "run/folder.xml");
+  ASSERT_EQ(mkfifo((home_ / "logs/CommonProvider.ini").c_str(), 0600), 0);
+  ASSERT_EQ(mkfifo((home_ / "run/pipe.xml").c_str(), 0600), 0);
+  EXPECT_EQ(run({"check"}), ExitCode::kProblems);
+  EXPECT_THAT(out_.str(), HasSubstr("logs/CommonProvider.ini: error: not a regular file"));
+  EXPECT_THAT(out_.str(), HasSubstr("run/folder.xml: error: "));
+  EXPECT_THAT(out_.str(), HasSubstr("run/pipe.xml: error: "));
+}
+
+TEST_F(HostTest, CommandsPrintWhatAClientGets) {
+  writeGoodFiles();
+  EXPECT_EQ(run({"enumerate", "root/test:Test_Disk"}), ExitCode::kOk);
+  EXPECT_EQ(out_.str(),
+            "(class)       Name  Size\n------------  ----  ----\n"
+            "Test_Disk     a     7\nTest_Disk     b     7\nTest_BigDisk  big   7\n");
+  EXPECT_EQ(run({"get", "root/test:Test_BigDisk.Name=\"big\"", "--property", "Name"}), 0);
+  EXPECT_THAT(out_.str(), testing::EndsWith("Name      big\n"));
+  EXPECT_EQ(run({"classes", "root/test:Test_Base", "--no-deep", "--format", "json"}), 0);
+  EXPECT_THAT(nlohmann::json::parse(out_.str()),
+              ElementsAre("Test_Disk", "Test_ThrowsCim", "Test_ManyThrows", "Test_Prints"));
+  EXPECT_EQ(run({"class", "root/test:test_disk", "--format", "mof", "--local-only"}), 0);
+  EXPECT_EQ(out_.str(), "class Test_Disk : Test_Base {\n};\n");
+}
+
+TEST_F(HostTest, DeclarationsPrintedAsMofCanBeReadAgain) {
+  writeGoodFiles();
+  ASSERT_EQ(run({"classes", "root/test", "--format", "mof"}), ExitCode::kOk);
+  const std::string printed = out_.str();
+  write("mof/root/test/classes.mof", printed);
+  EXPECT_THAT(diagnostics(), testing::IsEmpty());
+  ASSERT_EQ(run({"classes", "root/test", "--format", "mof"}), ExitCode::kOk);
+  EXPECT_EQ(out_.str(), printed);
+}
+
+TEST_F(HostTest, FailedOperationsGiveTheirStatusCode) {
+  writeGoodFiles();
+  EXPECT_EQ(run({"enumerate", "root/test:Test_ThrowsCim", "--format", "json"}), 12);
+  EXPECT_EQ(out_.str(), "");
+  EXPECT_EQ(error_.str(), "cimhost: CIM_ERR_ACCESS_DENIED (2): not for you\n");
+  EXPECT_EQ(run({"get", "root/test:Test_Base.Name=\"x\""}), 16);
+  EXPECT_EQ(run({"enumerate", "root/nowhere:Test_Base"}), 13);
+  // What was sent before the failure is still well formed.
+  EXPECT_EQ(run({"enumerate", "root/test:Test_ManyThrows", "--format", "json"}), 11);
+  EXPECT_EQ(nlohmann::json::parse(out_.str()).size(), 1001u);
+}
+
+TEST_F(HostTest, WhatAProviderPrintsStaysOutOfTheResults) {
+  writeGoodFiles();
+  EXPECT_EQ(shell("enumerate root/test:Test_Prints --format json | grep -c noise"), "0\n");
+  EXPECT_EQ(shell("--trace enumerate root/test:Test_Prints 2>&1 >/dev/null"), "noise\n");
+  EXPECT_EQ(shell("check"), "5 definitions, 0 errors, 0 warnings\n");
+  EXPECT_EQ(status_, ExitCode::kOk);
+  shell("enumerate root/test:Test_Disk 2>/dev/null >/dev/full");
+  EXPECT_EQ(status_, ExitCode::kOutput);
+  shell("--provider /no/such.so enumerate root/test:Test_Disk 2>/dev/null");
+  EXPECT_EQ(status_, ExitCode::kUsage);  // --provider twice
+}
+
+}  // namespace
