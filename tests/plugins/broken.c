@@ -1,0 +1,7 @@
+/* Cannot be loaded: nothing defines what it calls. */
+
+int definedNowhere(void);
+
+int getBroken(void) {
+  return definedNowhere();
+}
