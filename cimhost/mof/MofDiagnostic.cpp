@@ -1,18 +1,21 @@
 #include "cimhost/mof/MofDiagnostic.h"
 
+#include "cimhost/mof/Utf8.h"
+
 namespace cimhost {
 
 std::string MofDiagnostic::toString() const {
-  if (line == 0) return file + ": error: " + message;
+  const std::string name = printable(file);
+  if (line == 0) return name + ": error: " + message;
   const std::string place = ':' + std::to_string(line) + ':' + std::to_string(column);
   const std::string padding(caret > 0 ? static_cast<std::size_t>(caret - 1) : 0, ' ');
-  return file + place + ": error: " + message + '\n' + source + '\n' + padding + '^';
+  return name + place + ": error: " + message + '\n' + source + '\n' + padding + '^';
 }
 
 MofDiagnostic wholeFileDiagnostic(const std::string& file, const std::string& message) {
   MofDiagnostic diagnostic;
   diagnostic.file = file;
-  diagnostic.message = message;
+  diagnostic.message = printable(message);
   return diagnostic;
 }
 

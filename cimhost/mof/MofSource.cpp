@@ -56,19 +56,6 @@ std::string readAll(int fd) {
   }
 }
 
-// The next character as it may stand in a terminal: one column for one character.
-std::size_t appendPrintable(std::string& printed, std::string_view line, std::size_t offset) {
-  const Utf8Character character = decodeUtf8(line, offset);
-  if (character.length == 0) {
-    printed += '?';
-    return 1;
-  }
-  const bool control = character.codePoint < 0x20 || character.codePoint == 0x7F ||
-                       (character.codePoint >= 0x80 && character.codePoint < 0xA0);
-  printed += control ? std::string_view(" ") : line.substr(offset, character.length);
-  return character.length;
-}
-
 // Fills `source` and `caret`, keeping a window around `place` of a long line.
 void quoteLine(MofDiagnostic& diagnostic, std::string_view line, std::size_t place) {
   std::size_t offset = 0;
@@ -91,7 +78,7 @@ void quoteLine(MofDiagnostic& diagnostic, std::string_view line, std::size_t pla
 
 }  // namespace
 
-MofDiagnostic MofSource::diagnosticAt(std::size_t offset, std::string message) const {
+MofDiagnostic MofSource::diagnosticAt(std::size_t offset, const std::string& message) const {
   const std::string_view all(text);
   offset = std::min(offset, all.size());
   const std::string_view before = all.substr(0, offset);
@@ -102,7 +89,7 @@ MofDiagnostic MofSource::diagnosticAt(std::size_t offset, std::string message) c
   diagnostic.file = name;
   diagnostic.line = static_cast<int>(std::count(before.begin(), before.end(), '\n')) + 1;
   diagnostic.column = static_cast<int>(offset - start) + 1;
-  diagnostic.message = std::move(message);
+  diagnostic.message = printable(message);  // It may quote decoded escapes.
   quoteLine(diagnostic, line, offset - start);
   return diagnostic;
 }

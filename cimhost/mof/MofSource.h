@@ -15,7 +15,7 @@ struct MofSource {
   std::string text;
 
   /// A diagnostic at `offset`, which may be the end of the text.
-  MofDiagnostic diagnosticAt(std::size_t offset, std::string message) const;
+  MofDiagnostic diagnosticAt(std::size_t offset, const std::string& message) const;
 };
 
 using MofSourcePtr = std::shared_ptr<const MofSource>;
@@ -25,8 +25,8 @@ class MofError : public std::runtime_error {
  public:
   explicit MofError(MofDiagnostic diagnostic)
       : std::runtime_error(diagnostic.message), diagnostic_(std::move(diagnostic)) {}
-  MofError(const MofSource& source, std::size_t offset, std::string message)
-      : MofError(source.diagnosticAt(offset, std::move(message))) {}
+  MofError(const MofSource& source, std::size_t offset, const std::string& message)
+      : MofError(source.diagnosticAt(offset, message)) {}
 
   const MofDiagnostic& diagnostic() const { return diagnostic_; }
 

@@ -49,6 +49,26 @@ void appendCodePoint(std::string& text, std::uint32_t codePoint) {
   put(0x80 | (codePoint & 0x3F));
 }
 
+std::size_t appendPrintable(std::string& printed, std::string_view text, std::size_t offset) {
+  const Utf8Character character = decodeUtf8(text, offset);
+  if (character.length == 0) {
+    printed += '?';
+    return 1;
+  }
+  const bool control =
+      character.codePoint < 0x20 || (character.codePoint >= 0x7F && character.codePoint < 0xA0);
+  printed += control ? std::string_view(" ") : text.substr(offset, character.length);
+  return character.length;
+}
+
+std::string printable(std::string_view text) {
+  std::string printed;
+  for (std::size_t offset = 0; offset < text.size();) {
+    offset += appendPrintable(printed, text, offset);
+  }
+  return printed;
+}
+
 std::string shortened(std::string_view text, std::size_t limit) {
   if (text.size() <= limit) return std::string(text);
   while (limit > 0 && isContinuation(text[limit])) --limit;

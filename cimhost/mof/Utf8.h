@@ -20,6 +20,14 @@ Utf8Character decodeUtf8(std::string_view text, std::size_t offset);
 /// Appends the character. A surrogate is written as three bytes, as Pegasus::String takes it.
 void appendCodePoint(std::string& text, std::uint32_t codePoint);
 
+/// Appends the character at `offset` as it may stand in a terminal: a blank for a control
+/// character,
+/// "?" for a byte that is not UTF-8. Always one character; the result is its length in `text`.
+std::size_t appendPrintable(std::string& printed, std::string_view text, std::size_t offset);
+
+/// The whole text so.
+std::string printable(std::string_view text);
+
 /// At most `limit` bytes of `text`, cut before a character and then ended with "...".
 std::string shortened(std::string_view text, std::size_t limit);
 

@@ -134,6 +134,8 @@ INSTANTIATE_TEST_SUITE_P(
                   "t.mof:2:12: expected a char16 value, found a string"},
         ErrorCase{inClass("datetime P = \"20261301000000.000000+000\";"),
                   "t.mof:2:14: \"20261301000000.000000+000\" is not a datetime"},
+        ErrorCase{inClass("datetime P = \"\\x1B[31m\\x0\\xD800\";"),
+                  "t.mof:2:14: \" [31m ???\" is not a datetime"},
         ErrorCase{inClass("A REF P = \"not a path!\";"),
                   "t.mof:2:11: \"not a path!\" is not an object path"},
         ErrorCase{inClass("A REF P = $a;"),
@@ -190,6 +192,11 @@ INSTANTIATE_TEST_SUITE_P(
         ErrorCase{"[Association] class C {}; [Association(false)] class D : C {};",
                   "t.mof:1:28: qualifier 'Association' cannot be overridden: the superclass fixes "
                   "its value"},
+        ErrorCase{"class A { [MaxLen(1) : DisableOverride] string S; };\n"
+                  "class B : A { [MaxLen(1) : EnableOverride] string S; };\n"
+                  "class C : B { [MaxLen(2)] string S; };",
+                  "t.mof:3:16: qualifier 'MaxLen' cannot be overridden: the superclass fixes its "
+                  "value"},
         ErrorCase{kBase + "class A : B { [Override(\"S\")] string T; };",
                   "t.mof:2:16: qualifier 'Override' must give the same name"},
         ErrorCase{kBase + "class A : B { [Override(\"T\")] string T; };",

@@ -102,15 +102,7 @@ INSTANTIATE_TEST_SUITE_P(
                         "[Association] class A {}; [Aggregation] class B : A {};", "B",
                         "[Aggregation=TRUE Association^=TRUE] B : A\n"},
         InheritanceCase{"FalseKeyIsNoKey", "class A { [Key(false)] uint8 P; uint8 Q; };", "A",
-                        "A\n[Key=FALSE] uint8 P (A)\nuint8 Q (A)\n"},
-        InheritanceCase{
-            "OwnDisableOverrideBinds",
-            "class A { [MaxLen(1) : DisableOverride] string S; };"
-            "class B : A { [MaxLen(1) : EnableOverride] string S; };"
-            "class C : B { [MaxLen(2)] string S; };",
-            "C",
-            "t.mof:1:137: error: qualifier 'MaxLen' cannot be overridden: the superclass "
-            "fixes its value\n"}),
+                        "A\n[Key=FALSE] uint8 P (A)\nuint8 Q (A)\n"}),
     caseName<InheritanceCase>);
 
 const char* const kModel =
