@@ -46,6 +46,11 @@ static int readCount(const char* port, const char* attribute, uint64_t unit) {
   return value > 0 ? saturateToInt((uint64_t)value / unit) : 0;
 }
 
+// What the loopback port shows: not an address that its device came with.
+static int isZeroAddress(const char* address) {
+  return address[strspn(address, "0:")] == '\0';
+}
+
 // False for what is no interface, such as the file bonding_masters.
 static int readPort(const char* directory, struct NetworkPort* row) {
   char path[kPathSize];
@@ -57,7 +62,8 @@ static int readPort(const char* directory, struct NetworkPort* row) {
   }
   attributePath(path, directory, "address");
   hostReadText(path, row->currentAddress, sizeof row->currentAddress);
-  row->addressIsPermanent = readAttribute(directory, "addr_assign_type", &assigned) && !assigned;
+  row->addressIsPermanent = readAttribute(directory, "addr_assign_type", &assigned) && !assigned &&
+                            !isZeroAddress(row->currentAddress);
   row->up = readAttribute(directory, "flags", &flags) && (flags & IFF_UP) != 0;
   row->mtu = readCount(directory, "mtu", 1);
   row->speedMbps = readCount(directory, "speed", 1);  // -1, or unreadable, while there is no link

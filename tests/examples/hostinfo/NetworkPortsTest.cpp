@@ -111,13 +111,16 @@ TEST_F(FakePorts, AnAddressThatWasSetIsNotPermanent) {
   for (const char* port : {"real", "made", "mute"}) {
     attribute(port, "address", "02:00:00:00:00:01\n");
   }
+  attribute("zero", "address", "00:00:00:00:00:00\n");
+  attribute("zero", "ifindex", "4\n");
+  attribute("zero", "addr_assign_type", "0\n");
   attribute("real", "ifindex", "1\n");
   attribute("real", "addr_assign_type", "0\n");
   attribute("made", "ifindex", "2\n");
   attribute("made", "addr_assign_type", "3\n");
   attribute("mute", "ifindex", "3\n");
   EXPECT_THAT(library_.textsOfAll("hostNetworkPortCount", "hostNetworkPortPermanentAddress"),
-              ElementsAre("02:00:00:00:00:01", "", ""));
+              ElementsAre("02:00:00:00:00:01", "", "", ""));
   EXPECT_EQ(library_.text("hostNetworkPortCurrentAddress", 1), "02:00:00:00:00:01");
 }
 
