@@ -9,7 +9,7 @@ template <class T>
 constexpr bool kIsHandle = std::is_same_v<T, CIMObject> || std::is_same_v<T, CIMInstance>;
 
 template <class T>
-T independent(const T& x) {
+std::conditional_t<kIsHandle<T>, T, const T&> independent(const T& x) {
   if constexpr (kIsHandle<T>) {
     return x.clone();
   } else {
@@ -18,7 +18,7 @@ T independent(const T& x) {
 }
 
 template <class T>
-Array<T> independent(const Array<T>& x) {
+std::conditional_t<kIsHandle<T>, Array<T>, const Array<T>&> independent(const Array<T>& x) {
   if constexpr (kIsHandle<T>) {
     Array<T> clones;
     clones.reserveCapacity(x.size());

@@ -32,7 +32,7 @@ struct CIMValueAccess {
   }
 
   template <class T>
-  static T scalar(const CIMValue& value) {
+  static std::conditional_t<kInline<T>, T, const T&> scalar(const CIMValue& value) {
     if constexpr (kInline<T>) {
       T result;
       // Through void*, for a Char16 has constructors.

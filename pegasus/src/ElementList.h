@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "Element.h"
+#include "NameMatcher.h"
 
 PEGASUS_NAMESPACE_BEGIN
 
@@ -29,9 +30,10 @@ class ElementList {
   Uint32 size() const { return block_ ? static_cast<Uint32>(block_->items.size()) : 0; }
 
   Uint32 find(const CIMName& name) const {
-    if (name.isNull()) return PEG_NOT_FOUND;
-    for (Uint32 i = 0; i < size(); ++i) {
-      if (block_->items[i]->name().equal(name)) return i;
+    const NameMatcher matcher(name);
+    const Uint32 count = size();
+    for (Uint32 i = 0; i < count; ++i) {
+      if (matcher.matches(block_->items[i]->name())) return i;
     }
     return PEG_NOT_FOUND;
   }
@@ -133,6 +135,7 @@ class ElementList {
   void makeUnique() {
     if (!block_) {
       block_ = Ref<Block>(new Block);
+      block_->items.reserve(8);
     } else if (!block_.isOnlyReference()) {
       Ref<Block> own(new Block);
       own->items = block_->items;

@@ -92,7 +92,8 @@ TEST(CIMValue, WritesEveryTypeAsText) {
 }
 
 TEST(CIMValue, TakesALiteralForABoolean) {
-  const CIMValue value("abc");
+  const char* const literal = "abc";
+  const CIMValue value(literal);
   EXPECT_EQ(value.getType(), CIMTYPE_BOOLEAN);
   EXPECT_EQ(text(value.toString()), "TRUE");
 }

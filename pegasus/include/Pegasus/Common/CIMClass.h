@@ -31,7 +31,10 @@ class PEGASUS_COMMON_LINKAGE ClassReader : public ObjectReader {
   CIMInstance buildInstance(Boolean includeQualifiers, Boolean includeClassOrigin,
                             const CIMPropertyList& propertyList) const;
   Boolean identical(const CIMConstClass& other) const;
-  /// Costs little: qualifiers, methods and parameters are shared until one side changes them.
+  /// Costs little: qualifiers, methods and parameters are shared until one side hands them out for
+  /// change. So a reference into one of them is sure to stay valid only while a handle to that very
+  /// element is kept; references into properties live as long as the class. To read qualifiers,
+  /// CIMConst handles are faster, because they un-share nothing.
   CIMClass clone() const;
 
  protected:

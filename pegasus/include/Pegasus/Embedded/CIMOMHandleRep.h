@@ -8,10 +8,11 @@
 
 PEGASUS_NAMESPACE_BEGIN
 
-/// What a host implements so that CIMOMHandle reaches it. Embedded API only: providers never see it.
+/// What a host implements so that CIMOMHandle reaches it. Embedded API only: providers never see
+/// it.
 ///
-/// Every member may be called from several threads at once. Errors are CIMException. getClass returns
-/// an object that the caller may change without anybody else seeing it.
+/// Every member may be called from several threads at once. Errors are CIMException. getClass
+/// returns an object that the caller may change without anybody else seeing it.
 class PEGASUS_COMMON_LINKAGE CIMOMHandleRep {
  public:
   CIMOMHandleRep();
