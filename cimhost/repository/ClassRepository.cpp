@@ -17,11 +17,13 @@ using Pegasus::CIMPropertyList;
 using Pegasus::Uint32;
 
 // Inherited features make the memory for a class independent of the length of its text.
+constexpr std::size_t kMaxElements = 2000000;
 constexpr std::size_t kMaxClasses = 65536;
 constexpr std::size_t kMaxNamespaces = 4096;
 
 struct ClassEntry {
   CIMClass resolved;
+  CIMClass inheritable;  // Made for the first subclass.
   const ClassEntry* superclass = nullptr;
   std::vector<const ClassEntry*> subclasses;  // Direct ones, in order of declaration.
   std::size_t order = 0;                      // Of declaration in the namespace.
@@ -38,6 +40,25 @@ struct NamespaceEntry {
     return found != classes.end() ? &found->second : nullptr;
   }
 };
+
+// Features, parameters and qualifiers that the class does not share with its superclass, roughly.
+std::size_t elementsOf(const CIMClass& resolved) {
+  std::size_t count = resolved.getQualifierCount() + resolved.getPropertyCount();
+  for (Uint32 i = 0; i < resolved.getPropertyCount(); ++i) {
+    const Pegasus::CIMConstProperty property = resolved.getProperty(i);
+    if (!property.getPropagated()) count += property.getQualifierCount();
+  }
+  for (Uint32 i = 0; i < resolved.getMethodCount(); ++i) {
+    const Pegasus::CIMConstMethod method = resolved.getMethod(i);
+    ++count;
+    if (method.getPropagated()) continue;
+    count += method.getQualifierCount();
+    for (Uint32 j = 0; j < method.getParameterCount(); ++j) {
+      count += 1 + method.getParameter(j).getQualifierCount();
+    }
+  }
+  return count;
+}
 
 template <class Element>
 void removeQualifiers(Element&& element) {
@@ -94,6 +115,7 @@ struct ClassRepository::Impl {
   std::unordered_map<CIMNamespaceName, NamespaceEntry, NameHash, NameEqual> byName;
   std::vector<const NamespaceEntry*> inOrder;
   std::size_t classCount = 0;
+  std::size_t elementCount = 0;
 
   NamespaceEntry& require(const CIMNamespaceName& name) {
     const auto found = byName.find(name);
@@ -139,10 +161,20 @@ void ClassRepository::addClass(const CIMNamespaceName& nameSpace, const CIMClass
   if (impl_->classCount == kMaxClasses) {
     throw ClassDeclarationError(Pegasus::CIM_ERR_FAILED, "more than 65536 classes", {});
   }
+  const ClassResolver resolver(entry.qualifiers);
   ClassEntry* parent = superName.isNull() ? nullptr : &super->second;
-  ClassResolver resolver(entry.qualifiers, parent == nullptr ? CIMClass() : parent->resolved);
-  CIMClass resolved = resolver.resolve(declared);
+  if (parent != nullptr && parent->inheritable.isUninitialized()) {
+    parent->inheritable = resolver.inheritable(parent->resolved);
+  }
+  const CIMClass resolved =
+      resolver.resolve(declared, parent == nullptr ? CIMClass() : parent->inheritable);
+  const std::size_t elements = elementsOf(resolved);
+  if (impl_->elementCount + elements > kMaxElements) {
+    throw ClassDeclarationError(Pegasus::CIM_ERR_FAILED,
+                                "more than 2000000 features and qualifiers of all classes", {});
+  }
 
+  impl_->elementCount += elements;
   ClassEntry& added = entry.classes[name];
   added.resolved = resolved;
   added.superclass = parent;

@@ -67,14 +67,12 @@ class FeatureResolver {
   FeatureResolver(const QualifierTable& table, const CIMName& className)
       : table_(table), className_(className) {}
 
-  CIMProperty inherit(const CIMProperty& inherited) const {
-    if (inherited.getPropagated()) return inherited;
-    return makeProperty(inherited, nullptr, inherited);
+  CIMProperty inheritable(const CIMProperty& property) const {
+    return property.getPropagated() ? property : makeProperty(property, nullptr, property);
   }
 
-  CIMMethod inherit(const CIMMethod& inherited) const {
-    if (inherited.getPropagated()) return inherited;
-    return makeMethod(inherited, nullptr, inherited);
+  CIMMethod inheritable(const CIMConstMethod& method) const {
+    return method.getPropagated() ? method.clone() : makeMethod(method, nullptr, method);
   }
 
   CIMProperty declare(const CIMConstProperty& own, const CIMConstProperty& overridden) const {
@@ -162,7 +160,7 @@ void resolveProperties(CIMClass& result, const FeatureResolver& resolver, CIMCla
   for (Uint32 i = 0; !isRoot && i < superclass.getPropertyCount(); ++i) {
     const CIMProperty inherited = superclass.getProperty(i);
     if (declared.findProperty(inherited.getName()) != PEG_NOT_FOUND) continue;
-    result.addProperty(resolver.inherit(inherited));
+    result.addProperty(inherited);
   }
   for (Uint32 i = 0; i < declared.getPropertyCount(); ++i) {
     const CIMConstProperty own = declared.getProperty(i);
@@ -172,13 +170,15 @@ void resolveProperties(CIMClass& result, const FeatureResolver& resolver, CIMCla
   }
 }
 
-void resolveMethods(CIMClass& result, const FeatureResolver& resolver, CIMClass& superclass,
+// A method that lies in several classes could not be shared with the clones of a class, so each
+// class has its own; what is in the method is shared.
+void resolveMethods(CIMClass& result, const FeatureResolver& resolver, const CIMClass& superclass,
                     const CIMConstClass& declared) {
   const bool isRoot = superclass.isUninitialized();
   for (Uint32 i = 0; !isRoot && i < superclass.getMethodCount(); ++i) {
-    const CIMMethod inherited = superclass.getMethod(i);
+    const CIMConstMethod inherited = superclass.getMethod(i);
     if (declared.findMethod(inherited.getName()) != PEG_NOT_FOUND) continue;
-    result.addMethod(resolver.inherit(inherited));
+    result.addMethod(inherited.clone());
   }
   for (Uint32 i = 0; i < declared.getMethodCount(); ++i) {
     const CIMConstMethod own = declared.getMethod(i);
@@ -190,12 +190,26 @@ void resolveMethods(CIMClass& result, const FeatureResolver& resolver, CIMClass&
 
 }  // namespace
 
-CIMClass ClassResolver::resolve(const CIMConstClass& declared) const {
-  const bool isRoot = superclass_.isUninitialized();
-  CIMClass superclass = superclass_;
+CIMClass ClassResolver::inheritable(CIMClass resolved) const {
+  const CIMClass& reader = resolved;
+  const CIMConstClass source = resolved;
+  CIMClass result(reader.getClassName(), reader.getSuperClassName());
+  QualifierMerge(qualifiers_, Scope::kAny, {})
+      .run(result, static_cast<const CIMConstClass*>(nullptr), &source);
+  const FeatureResolver resolver(qualifiers_, reader.getClassName());
+  for (Uint32 i = 0; i < resolved.getPropertyCount(); ++i) {
+    result.addProperty(resolver.inheritable(resolved.getProperty(i)));
+  }
+  for (Uint32 i = 0; i < reader.getMethodCount(); ++i) {
+    result.addMethod(resolver.inheritable(reader.getMethod(i)));
+  }
+  return result;
+}
+
+CIMClass ClassResolver::resolve(const CIMConstClass& declared, CIMClass superclass) const {
+  const bool isRoot = superclass.isUninitialized();
   CIMClass result(declared.getClassName(), isRoot ? CIMName() : superclass.getClassName());
-  const CIMConstClass inherited =
-      isRoot ? CIMConstClass() : CIMConstClass(static_cast<const CIMClass&>(superclass));
+  const CIMConstClass inherited = superclass;
   QualifierMerge(qualifiers_, scopeOf(declared, superclass), {})
       .run(result, &declared, isRoot ? nullptr : &inherited);
   const FeatureResolver resolver(qualifiers_, declared.getClassName());

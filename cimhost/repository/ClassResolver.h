@@ -14,16 +14,20 @@ namespace cimhost {
 /// Throws ClassDeclarationError.
 class ClassResolver {
  public:
-  /// `superclass` is uninitialized for a root class. Features that a class and its superclass have
-  /// in common are one shared object, so neither may be changed afterwards.
-  ClassResolver(const QualifierTable& qualifiers, const Pegasus::CIMClass& superclass)
-      : qualifiers_(qualifiers), superclass_(superclass) {}
+  /// `qualifiers` must outlive the resolver.
+  explicit ClassResolver(const QualifierTable& qualifiers) : qualifiers_(qualifiers) {}
 
-  Pegasus::CIMClass resolve(const Pegasus::CIMConstClass& declared) const;
+  /// What a resolved class passes on: its features as propagated ones, without the qualifiers that
+  /// are restricted to it. Shares properties with `resolved`; neither may be changed afterwards.
+  Pegasus::CIMClass inheritable(Pegasus::CIMClass resolved) const;
+
+  /// `superclass` is what inheritable() made of it, or uninitialized for a root class. The result
+  /// shares inherited properties with it; neither may be changed afterwards.
+  Pegasus::CIMClass resolve(const Pegasus::CIMConstClass& declared,
+                            Pegasus::CIMClass superclass) const;
 
  private:
   const QualifierTable& qualifiers_;
-  Pegasus::CIMClass superclass_;
 };
 
 }  // namespace cimhost

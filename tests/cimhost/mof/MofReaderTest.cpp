@@ -179,6 +179,14 @@ TEST(MofReader, NumbersOfClassesAndNamespacesAreBounded) {
   Mof many;
   EXPECT_FALSE(many.read(classes));
   EXPECT_EQ(many.firstLine(), "t.mof:65537:7: more than 65536 classes");
+  std::string heirs = "class A {";
+  for (int i = 0; i < 50; ++i) heirs += "uint8 P" + std::to_string(i) + ";";
+  heirs += "};\n";
+  for (int i = 0; i < 40000; ++i) heirs += "class C" + std::to_string(i) + ":A{};\n";
+  Mof broad;
+  EXPECT_FALSE(broad.read(heirs));
+  EXPECT_EQ(broad.firstLine(),
+            "t.mof:40001:7: more than 2000000 features and qualifiers of all classes");
   Mof wide;
   EXPECT_FALSE(wide.read(namespaces));
   EXPECT_EQ(wide.firstLine(), "t.mof:8192:7: more than 4096 namespaces");
