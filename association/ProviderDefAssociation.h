@@ -8,6 +8,7 @@
 #include <utility>
 #include <vector>
 
+class ElementReader;
 class ProviderDefModule;
 
 /// An association class whose instances are computed: which classes it links, and for each pair of
@@ -21,6 +22,8 @@ class ProviderDefAssociation {
 
   /// Builds the association from its `association` element; see ProviderDefModule.
   ProviderDefAssociation(const char* text, int length, int* consumed, ProviderDefModule* module);
+  /// The same for the element at which `reader` stands; leaves it at the end tag.
+  ProviderDefAssociation(ElementReader& reader, ProviderDefModule* module);
 
   const std::string& getName() const { return name_; }
   const std::string& getNamespace() const { return namespace_; }
@@ -30,8 +33,8 @@ class ProviderDefAssociation {
   /// One condition for each pair of classes, in the same order.
   const std::vector<ProviderDefCondition>& getConditions() const { return conditions_; }
 
-  /// The properties that the conditions read of a class, in the order of a value vector; those of the
-  /// first entry for the class, empty when it has none.
+  /// The properties that the conditions read of a class, in the order of a value vector; those of
+  /// the first entry for the class, empty when it has none.
   std::vector<std::string> getClassProperties(const std::string& className) const;
 
   /// The other class of the first pair that contains `className`; "" when none does.
@@ -39,10 +42,10 @@ class ProviderDefAssociation {
 
   /// The target instances that are linked to one source instance, by their index.
   ///
-  /// `sourceIndex` and `sourceValues` are the source instance; `targetValues` holds a value vector for
-  /// each target instance. A target class with a definition is walked up to its own number of
-  /// instances, whatever the size of `targetValues`. Ordered by pair, then by index; a target that is
-  /// linked through two pairs stands twice. Writes trace lines on standard output.
+  /// `sourceIndex` and `sourceValues` are the source instance; `targetValues` holds a value vector
+  /// for each target instance. A target class with a definition is walked up to its own number of
+  /// instances, whatever the size of `targetValues`. Ordered by pair, then by index; a target that
+  /// is linked through two pairs stands twice. Writes trace lines on standard output.
   std::vector<int> getAssociation(const std::string& sourceClass, int sourceIndex,
                                   const Values& sourceValues, const std::string& targetClass,
                                   const std::vector<Values>& targetValues) const;
@@ -51,6 +54,8 @@ class ProviderDefAssociation {
   enum class Direction { kNone, kForward, kReverse };
 
   struct Parser;
+
+  void read(ElementReader& reader, ProviderDefModule* module);
 
   Direction direction(const NamePair& pair, const std::string& source,
                       const std::string& target) const;
@@ -64,8 +69,8 @@ class ProviderDefAssociation {
   std::vector<std::pair<std::string, std::vector<std::string>>> classProperties_;
 };
 
-/// The registered associations in reading order; pointers into it stay valid until releaseModules().
-/// The definition registries implement it.
+/// The registered associations in reading order; pointers into it stay valid until
+/// releaseModules(). The definition registries implement it.
 const std::deque<ProviderDefAssociation>& registeredAssociations();
 
 /// The first registered association of this name; nullptr without one.

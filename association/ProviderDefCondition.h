@@ -6,6 +6,7 @@
 
 #include <vector>
 
+class ElementReader;
 class ProviderDefModule;
 
 /// Decides whether an instance of a pair's first class is related to one of its second class.
@@ -27,12 +28,15 @@ class ProviderDefCondition {
 
   /// Builds the condition from its `condition` element; see ProviderDefModule for the arguments.
   ProviderDefCondition(const char* text, int length, int* consumed, ProviderDefModule* module);
+  /// The same for the element at which `reader` stands; leaves it at the end tag.
+  ProviderDefCondition(ElementReader& reader, ProviderDefModule* module);
 
   int getType() const { return type_; }
 
-  /// Side 1 is the pair's first class: its instance index and its property values in the order of the
-  /// class's list; side 2 the second class. An operand that names a position which its side does not
-  /// have is the empty value. Writes a trace line on standard output, as its sub-conditions do.
+  /// Side 1 is the pair's first class: its instance index and its property values in the order of
+  /// the class's list; side 2 the second class. An operand that names a position which its side
+  /// does not have is the empty value. Writes a trace line on standard output, as its
+  /// sub-conditions do.
   bool getValue(int index1, const Values& values1, int index2, const Values& values2) const;
 
  private:
@@ -45,6 +49,8 @@ class ProviderDefCondition {
   };
 
   struct Parser;
+
+  void read(ElementReader& reader, ProviderDefModule* module);
 
   bool compare(int index1, const Values& values1, int index2, const Values& values2) const;
   // The operand's value: where it stands already, else evaluated into `made`.

@@ -8,6 +8,8 @@
 #include <iterator>
 
 struct ProviderDefAssociation::Parser {
+  static constexpr char kUnexpected[] = "Unexpected element: ";
+
   ProviderDefAssociation& association;
   ElementReader& reader;
   ProviderDefModule* module;
@@ -29,23 +31,21 @@ struct ProviderDefAssociation::Parser {
     reader.expectStart("classname", kClassMissing);
     std::string second = readClass();
     reader.expectStart("condition", kConditionMissing);
-    int used = 0;
-    association.conditions_.emplace_back(reader.rest(), reader.restLength(), &used, module);
+    association.conditions_.emplace_back(reader, module);
     association.classNamePairs_.emplace_back(std::move(first), std::move(second));
-    reader.skip(used);
+    reader.advance();
   }
 
   std::string readClass() {
     std::string name = attribute(reader, "name");
     std::vector<std::string> properties;
     if (!reader.isEmptyElement()) {
-      static const char kEndMissing[] = "end of the classname element is missing before : ";
       reader.advance();
       while (reader.isStart("propertyname")) {
         properties.push_back(attribute(reader, "name"));
-        reader.skipEmpty("propertyname", kEndMissing);
+        reader.skipEmpty("propertyname", kUnexpected);
       }
-      reader.expectEnd("classname", kEndMissing);
+      reader.expectEnd("classname", kUnexpected);
     }
     reader.advance();
     association.classProperties_.emplace_back(name, std::move(properties));
@@ -55,19 +55,28 @@ struct ProviderDefAssociation::Parser {
 
 ProviderDefAssociation::ProviderDefAssociation(const char* text, int length, int* consumed,
                                                ProviderDefModule* module) {
+  ElementReader reader(text, length);
+  read(reader, module);
+  *consumed = reader.consumed();
+}
+
+ProviderDefAssociation::ProviderDefAssociation(ElementReader& reader, ProviderDefModule* module) {
+  read(reader, module);
+}
+
+void ProviderDefAssociation::read(ElementReader& reader, ProviderDefModule* module) {
   debug(9, "ProviderDefAssociation Constructor\n");
+  reader.retrace();
   withContext("association", name_, [&] {
-    ElementReader reader(text, length);
     Parser parser{*this, reader, module};
     parser.readAttributes();
-    reader.enter("classname element is missing before : ");
+    reader.enter(Parser::kUnexpected);
     if (reader.isStart("module")) parser.module = readModule(reader);
     while (!reader.isEnd("association")) {
       if (reader.isStart("condition")) reader.fail("classname element is missing before : ");
-      reader.expectStart("classname", "Unexpected element: ");
+      reader.expectStart("classname", Parser::kUnexpected);
       parser.readGroup();
     }
-    *consumed = reader.consumed();
   });
 }
 
@@ -89,9 +98,9 @@ struct ProviderDefCondition::Parser {
     static const char kUnexpected[] = "Unexpected element in condition: ";
     const std::string name = reader.unit().getName();
     condition.type_ = operatorCode(name);
-    if (condition.type_ == kUnread || !reader.isStart(name.c_str())) reader.fail(kUnexpected);
+    if (condition.type_ == kUnread || !reader.isStart(name)) reader.fail(kUnexpected);
     if (condition.type_ == kTrue || condition.type_ == kFalse) {
-      reader.skipEmpty(name.c_str(), kUnexpected);
+      reader.skipEmpty(name, kUnexpected);
       return;
     }
     reader.enter(kUnexpected);
@@ -102,15 +111,13 @@ struct ProviderDefCondition::Parser {
       const std::string text = readOperand(condition.operand1_);
       readSecondOperand(text);
     }
-    reader.expectEnd(name.c_str(), kUnexpected);
+    reader.expectEnd(name, kUnexpected);
     reader.advance();
   }
 
   ClonePointer<ProviderDefCondition> readCondition() {
-    int used = 0;
-    auto nested = std::make_unique<ProviderDefCondition>(reader.rest(), reader.restLength(), &used,
-                                                         module);
-    reader.skip(used);
+    auto nested = std::make_unique<ProviderDefCondition>(reader, module);
+    reader.advance();
     return nested;
   }
 
@@ -120,10 +127,9 @@ struct ProviderDefCondition::Parser {
       operand.kind = kConstant;
       operand.constant = readConstant(reader);
     } else if (reader.isStart("functioncall")) {
-      int used = 0;
       operand.kind = kFunctionCall;
-      operand.call = ProviderDefFunctionCall(reader.rest(), reader.restLength(), &used, module);
-      reader.skip(used);
+      operand.call = ProviderDefFunctionCall(reader, module);
+      reader.advance();
     } else if (reader.isText() && !reader.unit().getName().empty()) {
       const std::string text = reader.unit().getName();
       setPropertyIndex(operand, text);
@@ -161,13 +167,22 @@ struct ProviderDefCondition::Parser {
 
 ProviderDefCondition::ProviderDefCondition(const char* text, int length, int* consumed,
                                            ProviderDefModule* module) {
+  ElementReader reader(text, length);
+  read(reader, module);
+  *consumed = reader.consumed();
+}
+
+ProviderDefCondition::ProviderDefCondition(ElementReader& reader, ProviderDefModule* module) {
+  read(reader, module);
+}
+
+void ProviderDefCondition::read(ElementReader& reader, ProviderDefModule* module) {
   debug(9, "ProviderDefCondition Constructor\n");
+  reader.retrace();
   withContext("condition", std::string(), [&] {
-    ElementReader reader(text, length);
     const NestingGuard guard(reader);
     reader.enter("Unexpected element in condition: ");
     Parser{*this, reader, module}.readOperator();
     reader.expectEnd("condition", "Unexpected element in condition: ");
-    *consumed = reader.consumed();
   });
 }

@@ -7,10 +7,20 @@
 
 ProviderDefClass::ProviderDefClass(const char* text, int length, int* consumed,
                                    ProviderDefModule* module) {
+  ElementReader reader(text, length);
+  read(reader, module);
+  *consumed = reader.consumed();
+}
+
+ProviderDefClass::ProviderDefClass(ElementReader& reader, ProviderDefModule* module) {
+  read(reader, module);
+}
+
+void ProviderDefClass::read(ElementReader& reader, ProviderDefModule* module) {
   static const char kInstancesMissing[] = "instance elememt is missing in class element before: ";
   debug(9, "ProviderDefClass Constructor\n");
+  reader.retrace();
   withContext("class", name_, [&] {
-    ElementReader reader(text, length);
     for (const auto& [key, value] : reader.unit().getAttributes()) {
       if (key == "name") name_ = value;
       if (key == "namespace") namespace_ = value;
@@ -20,22 +30,21 @@ ProviderDefClass::ProviderDefClass(const char* text, int length, int* consumed,
     reader.expectStart("instances", kInstancesMissing);
     readInstances(reader, module);
     while (!reader.isEnd("class")) {
-      int used = 0;
       if (reader.isStart("property")) {
-        properties_.emplace_back(reader.rest(), reader.restLength(), &used, module);
+        properties_.emplace_back(reader, module);
       } else if (reader.isStart("method")) {
-        methods_.emplace_back(reader.rest(), reader.restLength(), &used, module);
+        methods_.emplace_back(reader, module);
       } else {
         reader.fail("Unexpected elememt: ");
       }
-      reader.skip(used);
+      reader.advance();
     }
-    *consumed = reader.consumed();
   });
 }
 
 void ProviderDefClass::readInstances(ElementReader& reader, ProviderDefModule* module) {
-  static const char kMissing[] = "constant or functioncall elememt is missing in class element before: ";
+  static const char kMissing[] =
+      "constant or functioncall elememt is missing in class element before: ";
   reader.enter(kMissing);
   if (reader.isStart("constant")) {
     debug(9, "Reading constant value\n");
@@ -43,11 +52,9 @@ void ProviderDefClass::readInstances(ElementReader& reader, ProviderDefModule* m
     const ProviderDefValue value = readConstant(reader);
     numberOfInstances_ = value.getType() == ProviderDefValue::kInteger ? value.getIntValue() : 0;
   } else if (reader.isStart("functioncall")) {
-    int used = 0;
-    instancesCall_ =
-        ProviderDefFunctionCall(reader.rest(), reader.restLength(), &used, module);
+    instancesCall_ = ProviderDefFunctionCall(reader, module);
     instancesFromFunction_ = true;
-    reader.skip(used);
+    reader.advance();
   } else {
     reader.fail(kMissing);
   }
@@ -68,10 +75,9 @@ void readSide(ElementReader& reader, ProviderDefModule* module, bool& fromFuncti
     constant = readConstant(reader);
     fromFunction = false;
   } else if (reader.isStart("functioncall")) {
-    int used = 0;
-    call = ProviderDefFunctionCall(reader.rest(), reader.restLength(), &used, module);
+    call = ProviderDefFunctionCall(reader, module);
     fromFunction = true;
-    reader.skip(used);
+    reader.advance();
   } else {
     reader.fail(kMissing);
   }
@@ -81,17 +87,26 @@ void readSide(ElementReader& reader, ProviderDefModule* module, bool& fromFuncti
 
 ProviderDefProperty::ProviderDefProperty(const char* text, int length, int* consumed,
                                          ProviderDefModule* module) {
+  ElementReader reader(text, length);
+  read(reader, module);
+  *consumed = reader.consumed();
+}
+
+ProviderDefProperty::ProviderDefProperty(ElementReader& reader, ProviderDefModule* module) {
+  read(reader, module);
+}
+
+void ProviderDefProperty::read(ElementReader& reader, ProviderDefModule* module) {
   static const char kGetMissing[] = "get element is missing before: ";
   debug(9, "ProviderDefProperty Constructor\n");
+  reader.retrace();
   withContext("property", name_, [&] {
-    ElementReader reader(text, length);
     name_ = attribute(reader, "name");
     reader.enter(kGetMissing);
     reader.expectStart("get", kGetMissing);
     readGet(reader, module);
     if (reader.isStart("set")) readSet(reader, module);
     reader.expectEnd("property", "end of the property element is missing before: ");
-    *consumed = reader.consumed();
   });
 }
 
@@ -115,17 +130,25 @@ void ProviderDefProperty::readSet(ElementReader& reader, ProviderDefModule* modu
 
 ProviderDefMethod::ProviderDefMethod(const char* text, int length, int* consumed,
                                      ProviderDefModule* module) {
+  ElementReader reader(text, length);
+  read(reader, module);
+  *consumed = reader.consumed();
+}
+
+ProviderDefMethod::ProviderDefMethod(ElementReader& reader, ProviderDefModule* module) {
+  read(reader, module);
+}
+
+void ProviderDefMethod::read(ElementReader& reader, ProviderDefModule* module) {
   static const char kCallMissing[] = "functioncall element is missing before: ";
   debug(9, "ProviderDefMethod Constructor\n");
+  reader.retrace();
   withContext("method", name_, [&] {
-    ElementReader reader(text, length);
     name_ = attribute(reader, "name");
     reader.enter(kCallMissing);
     reader.expectStart("functioncall", kCallMissing);
-    int used = 0;
-    call_ = ProviderDefFunctionCall(reader.rest(), reader.restLength(), &used, module);
-    reader.skip(used);
+    call_ = ProviderDefFunctionCall(reader, module);
+    reader.advance();
     reader.expectEnd("method", "end of the method element is missing before: ");
-    *consumed = reader.consumed();
   });
 }

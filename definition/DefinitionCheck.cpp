@@ -19,12 +19,13 @@ Problem problemAt(const std::string& file, const std::string& text, size_t posit
   const size_t lineStart = before == std::string::npos ? 0 : before + 1;
   Problem problem;
   problem.file = file;
-  problem.line =
-      1 + static_cast<int>(std::count(text.begin(), text.begin() + static_cast<long>(lineStart), '\n'));
+  problem.line = 1 + static_cast<int>(std::count(
+                         text.begin(), text.begin() + static_cast<long>(lineStart), '\n'));
   problem.column = static_cast<int>(position - lineStart) + 1;
   problem.message = message;
   const size_t lineEnd = std::min(text.find('\n', lineStart), lineStart + kMaxSourceLine);
   problem.source = text.substr(lineStart, lineEnd - lineStart);
+  if (!problem.source.empty() && problem.source.back() == '\r') problem.source.pop_back();
   return problem;
 }
 

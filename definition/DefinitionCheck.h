@@ -5,8 +5,8 @@
 
 namespace definition {
 
-/// Something wrong in a definition file, with its place. Line and column count from 1, the column in
-/// bytes; both are 0 where the file as a whole is meant.
+/// Something wrong in a definition file, with its place. Line and column count from 1, the column
+/// in bytes; both are 0 where the file as a whole is meant.
 struct Problem {
   std::string file;
   int line = 0;
@@ -32,8 +32,8 @@ struct CheckResult {
 /// Reads definition files as the provider does, for a program that wants to know what they declare.
 ///
 /// Problems are syntax errors, files that cannot be read or are no definition files, and elements
-/// behind which the rest of a file is not read. Uses the process's registries and leaves them empty;
-/// switches this process's diagnostic log off. Not for use by several threads at once.
+/// behind which the rest of a file is not read. Uses the process's registries and leaves them
+/// empty; switches this process's diagnostic log off. Not for use by several threads at once.
 CheckResult checkDefinitionFiles(const std::vector<std::string>& files);
 
 }  // namespace definition

@@ -17,14 +17,13 @@ namespace {
 
 constexpr off_t kMaxFileSize = 64 * 1024 * 1024;
 
-using RegisterElement = void (*)(const char*, int, int*, ProviderDefModule*);
+using RegisterElement = void (*)(ElementReader&, ProviderDefModule*);
 
 void readElements(ElementReader& reader, const char* name, RegisterElement registerElement,
                   ProviderDefModule* module) {
   while (reader.isStart(name)) {
-    int used = 0;
-    registerElement(reader.rest(), reader.restLength(), &used, module);
-    reader.skip(used);
+    registerElement(reader, module);
+    reader.advance();
   }
 }
 

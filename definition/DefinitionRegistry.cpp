@@ -22,20 +22,21 @@ Definitions& definitions() {
 
 }  // namespace
 
-const std::deque<ProviderDefClass>& registeredClasses() { return definitions().classes; }
+const std::deque<ProviderDefClass>& registeredClasses() {
+  return definitions().classes;
+}
 
 const std::deque<ProviderDefAssociation>& registeredAssociations() {
   return definitions().associations;
 }
 
-void registerClass(const char* text, int length, int* consumed, ProviderDefModule* module) {
-  const ProviderDefClass& added =
-      definitions().classes.emplace_back(text, length, consumed, module);
+void registerClass(ElementReader& reader, ProviderDefModule* module) {
+  const ProviderDefClass& added = definitions().classes.emplace_back(reader, module);
   definitions().classByName.emplace(added.getName(), &added);
 }
 
-void registerAssociation(const char* text, int length, int* consumed, ProviderDefModule* module) {
-  definitions().associations.emplace_back(text, length, consumed, module);
+void registerAssociation(ElementReader& reader, ProviderDefModule* module) {
+  definitions().associations.emplace_back(reader, module);
 }
 
 const ProviderDefClass* getProviderDefClass(const std::string& name) {

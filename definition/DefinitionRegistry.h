@@ -6,12 +6,12 @@
 #include <deque>
 
 // The process-wide lists of classes and associations, in reading order. They own their entries; a
-// pointer to one stays valid until releaseDefinitions(). No lock is taken: they are filled before any
-// request and read-only until the release.
+// pointer to one stays valid until releaseDefinitions(). No lock is taken: they are filled before
+// any request and read-only until the release.
 
 const std::deque<ProviderDefClass>& registeredClasses();
 
-/// Builds a class, or an association, from its element and registers it. What throws registers
-/// nothing. The arguments are those of the element's constructor.
-void registerClass(const char* text, int length, int* consumed, ProviderDefModule* module);
-void registerAssociation(const char* text, int length, int* consumed, ProviderDefModule* module);
+/// Builds a class, or an association, from the element at which `reader` stands and registers it;
+/// the reader is left at the end tag. What throws registers nothing.
+void registerClass(ElementReader& reader, ProviderDefModule* module);
+void registerAssociation(ElementReader& reader, ProviderDefModule* module);

@@ -11,9 +11,9 @@ thread_local int nesting = 0;
 
 }  // namespace
 
-void ElementReader::skip(int length) {
-  position_ += length;
-  unit_ = ParseDefUnit(rest(), restLength());
+void ElementReader::advance() {
+  position_ += unit_.getLength();
+  unit_.parse(rest(), restLength());
 }
 
 void ElementReader::failAt(const std::string& message) const {
@@ -23,14 +23,18 @@ void ElementReader::failAt(const std::string& message) const {
   throw ProviderDefXMLError(message);
 }
 
-const char* ElementReader::lastErrorPosition() { return errorPosition; }
-
-void ElementReader::enter(const char* text) {
-  if (!unit_.isStart() || unit_.isEnd()) fail(text);
-  advance();
+const char* ElementReader::lastErrorPosition() {
+  return errorPosition;
 }
 
-void ElementReader::skipEmpty(const char* name, const char* text) {
+void ElementReader::enter(const char* text) {
+  if (!unit_.isStart()) fail(text);
+  const bool hasContent = !unit_.isEnd();
+  advance();
+  if (!hasContent) fail(text);
+}
+
+void ElementReader::skipEmpty(std::string_view name, const char* text) {
   if (!isEmptyElement()) {
     advance();
     expectEnd(name, text);
@@ -43,7 +47,9 @@ NestingGuard::NestingGuard(const ElementReader& reader) {
   ++nesting;
 }
 
-NestingGuard::~NestingGuard() { --nesting; }
+NestingGuard::~NestingGuard() {
+  --nesting;
+}
 
 ProviderDefValue readConstant(ElementReader& reader) {
   static const char kEndMissing[] = "the end of constant element missing before: ";
@@ -67,7 +73,7 @@ ProviderDefValue readConstant(ElementReader& reader) {
   return value;
 }
 
-std::string attribute(const ElementReader& reader, const char* name) {
+std::string attribute(const ElementReader& reader, std::string_view name) {
   std::string value;
   for (const auto& [key, text] : reader.unit().getAttributes()) {
     if (key == name) value = text;

@@ -11,9 +11,20 @@
 ProviderDefFunction::ProviderDefFunction(const char* text, int length, int* consumed,
                                          ProviderDefModule* module)
     : type_(kInvalidFunctionType), module_(module) {
+  ElementReader reader(text, length);
+  read(reader);
+  *consumed = reader.consumed();
+}
+
+ProviderDefFunction::ProviderDefFunction(ElementReader& reader, ProviderDefModule* module)
+    : type_(kInvalidFunctionType), module_(module) {
+  read(reader);
+}
+
+void ProviderDefFunction::read(ElementReader& reader) {
   debug(9, "ProviderDefFunction Constructor\n");
+  reader.retrace();
   withContext("function", name_, [&] {
-    ElementReader reader(text, length);
     for (const auto& [key, value] : reader.unit().getAttributes()) {
       if (key == "name") name_ = value;
       if (key == "type") type_ = functionTypeCode(value);
@@ -23,7 +34,6 @@ ProviderDefFunction::ProviderDefFunction(const char* text, int length, int* cons
       if (reader.isStart("module")) module_ = readModule(reader);
       reader.expectEnd("function", "end of the function element missing before: ");
     }
-    *consumed = reader.consumed();
   });
 }
 
@@ -32,34 +42,39 @@ namespace {
 // Reads the `function` element that is the current unit and goes past it; gives the registered
 // function of that name. The first declaration of a name fixes its type and module.
 ProviderDefFunction* readFunction(ElementReader& reader, ProviderDefModule* module) {
-  int used = 0;
-  auto read = std::make_unique<ProviderDefFunction>(reader.rest(), reader.restLength(), &used,
-                                                    module);
-  reader.skip(used);
-  ProviderDefFunction* registered = getFunction(read->getName());
-  return registered != nullptr ? registered : registerFunction(std::move(read));
+  auto read = std::make_unique<ProviderDefFunction>(reader, module);
+  reader.advance();
+  return registerNewFunction(std::move(read));
 }
 
 }  // namespace
 
 ProviderDefFunctionCall::ProviderDefFunctionCall(const char* text, int length, int* consumed,
                                                  ProviderDefModule* module) {
+  ElementReader reader(text, length);
+  read(reader, module);
+  *consumed = reader.consumed();
+}
+
+ProviderDefFunctionCall::ProviderDefFunctionCall(ElementReader& reader, ProviderDefModule* module) {
+  read(reader, module);
+}
+
+void ProviderDefFunctionCall::read(ElementReader& reader, ProviderDefModule* module) {
   debug(9, "ProviderDefFunctionCall Constructor\n");
+  reader.retrace();
   // The element has no name of its own.
   withContext("functioncall", std::string(), [&] {
-    ElementReader reader(text, length);
     const NestingGuard guard(reader);
     reader.expectStart("functioncall", "functioncall elememt is missing before: ");
     reader.enter("function elememt is missing before: ");
     reader.expectStart("function", "function elememt is missing before: ");
     function_ = readFunction(reader, module);
     while (reader.isStart("argument")) {
-      int used = 0;
-      arguments_.emplace_back(reader.rest(), reader.restLength(), &used, module);
-      reader.skip(used);
+      arguments_.emplace_back(reader, module);
+      reader.advance();
     }
     reader.expectEnd("functioncall", "Unexpected elememt before: ");
-    *consumed = reader.consumed();
   });
 }
 
@@ -89,11 +104,9 @@ void ProviderDefArgument::readElement(ElementReader& reader, ProviderDefModule* 
     elementType_ = kConstant;
     constant_ = readConstant(reader);
   } else if (reader.isStart("functioncall")) {
-    int used = 0;
     elementType_ = kFunctionCall;
-    functionCall_ = std::make_unique<ProviderDefFunctionCall>(reader.rest(), reader.restLength(),
-                                                              &used, module);
-    reader.skip(used);
+    functionCall_ = std::make_unique<ProviderDefFunctionCall>(reader, module);
+    reader.advance();
   } else if (reader.isStart("cimproperty")) {
     elementType_ = kCimProperty;
     queryString_ = readCimProperty(reader);
@@ -104,10 +117,20 @@ void ProviderDefArgument::readElement(ElementReader& reader, ProviderDefModule* 
 
 ProviderDefArgument::ProviderDefArgument(const char* text, int length, int* consumed,
                                          ProviderDefModule* module) {
+  ElementReader reader(text, length);
+  read(reader, module);
+  *consumed = reader.consumed();
+}
+
+ProviderDefArgument::ProviderDefArgument(ElementReader& reader, ProviderDefModule* module) {
+  read(reader, module);
+}
+
+void ProviderDefArgument::read(ElementReader& reader, ProviderDefModule* module) {
   static const char* const kTypes[] = {"index", "input", "element", "output"};
   debug(9, "ProviderDefArgument Constructor\n");
+  reader.retrace();
   withContext("argument", std::string(), [&] {
-    ElementReader reader(text, length);
     const std::string type = attribute(reader, "type");
     type_ = -1;
     for (size_t i = 0; i < std::size(kTypes); ++i) {
@@ -122,6 +145,5 @@ ProviderDefArgument::ProviderDefArgument(const char* text, int length, int* cons
       reader.advance();
     }
     if (hasContent) reader.expectEnd("argument", "the end of argument element missing before: ");
-    *consumed = reader.consumed();
   });
 }

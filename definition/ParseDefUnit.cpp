@@ -19,7 +19,9 @@ constexpr auto kSpaces = makeSpaces();
 
 }  // namespace
 
-bool isSpace(unsigned char character) { return kSpaces[character]; }
+bool isSpace(unsigned char character) {
+  return kSpaces[character];
+}
 
 /// The tokenizer's states; the numbers appear in the trace.
 enum State {
@@ -37,8 +39,8 @@ enum State {
   kDone = 99
 };
 
-/// The state machine. Every state takes a run of characters at once; with tracing, each character is
-/// noted with its state before it is handled. The trace is a template argument, so that reading
+/// The state machine. Every state takes a run of characters at once; with tracing, each character
+/// is noted with its state before it is handled. The trace is a template argument, so that reading
 /// without it does not pay for it.
 template <bool kTracing>
 class UnitScanner {
@@ -242,6 +244,16 @@ class UnitScanner {
 };
 
 ParseDefUnit::ParseDefUnit(const char* text, int length) {
+  parse(text, length);
+}
+
+void ParseDefUnit::parse(const char* text, int length) {
+  kind_ = kText;
+  name_.clear();
+  attributes_.clear();
+  isStart_ = false;
+  isEnd_ = false;
+  length_ = 0;
   const bool tracing = debugEnabled(9);
   if (tracing) debugFormat(9, "Enter ParseDefUnit length=%d\n", length);
   if (length < 1) return;

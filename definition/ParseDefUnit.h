@@ -9,9 +9,9 @@ bool isSpace(unsigned char character);
 
 /// One unit of definition text: a tag, or the text up to the next tag.
 ///
-/// The format knows start tags, end tags, empty-element tags, attributes and text, and nothing else:
-/// no declaration, comment, entity or CDATA section. Odd text gives odd units, never an error; what
-/// reads the units decides. A unit copies what it keeps; the text may go afterwards.
+/// The format knows start tags, end tags, empty-element tags, attributes and text, and nothing
+/// else: no declaration, comment, entity or CDATA section. Odd text gives odd units, never an
+/// error; what reads the units decides. A unit copies what it keeps; the text may go afterwards.
 class ParseDefUnit {
  public:
   enum Kind { kText = 0, kTag = 1 };
@@ -37,8 +37,12 @@ class ParseDefUnit {
   int getLength() const { return length_; }
 
  private:
+  friend class ElementReader;
   template <bool kTracing>
   friend class UnitScanner;
+
+  /// Becomes the unit at the start of `text`; reuses the memory that it holds.
+  void parse(const char* text, int length);
 
   int kind_ = kText;
   std::string name_;

@@ -8,7 +8,8 @@
 /// A trace text for standard output, put together without printf and written in one piece when the
 /// object goes (in several when it is longer than the buffer).
 ///
-/// These traces are written for every pair of instances, whatever the log level: they must be cheap.
+/// These traces are written for every pair of instances, whatever the log level: they must be
+/// cheap.
 class TraceLine {
  public:
   TraceLine() = default;

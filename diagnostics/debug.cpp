@@ -19,8 +19,7 @@ void readLogConfiguration() {
   try {
     Vaneth::PropertyFile file(Vaneth::File::Path("../logs/CommonProvider.ini"));
     file.open(Vaneth::PropertyFile::kReadExisting);
-    const std::string text =
-        Vaneth::make_string(file.getValue(Vaneth::make_wstring("LogLevel")));
+    const std::string text = Vaneth::make_string(file.getValue(Vaneth::make_wstring("LogLevel")));
     const long level = std::strtol(text.c_str(), nullptr, 10);
     LOG_LEVEL.store(static_cast<int>(std::clamp<long>(level, INT_MIN, INT_MAX)),
                     std::memory_order_relaxed);

@@ -6,11 +6,12 @@
 //
 // A message has a level: 1 errors, 7 and 8 operation entry and major steps, 9 per-instance,
 // per-property and per-character detail. It is written when its level is at most LOG_LEVEL, which
-// comes from the key "LogLevel" of "../logs/CommonProvider.ini" (relative to the working directory),
-// read once, at the first message of the process; without it the level is 0 and nothing is written.
+// comes from the key "LogLevel" of "../logs/CommonProvider.ini" (relative to the working
+// directory), read once, at the first message of the process; without it the level is 0 and nothing
+// is written.
 //
-// Safe from several threads: a message is opened, appended and closed as a whole. Texts are written as
-// they are, never used as a format.
+// Safe from several threads: a message is opened, appended and closed as a whole. Texts are written
+// as they are, never used as a format.
 
 /// The highest level that is written.
 extern std::atomic<int> LOG_LEVEL;

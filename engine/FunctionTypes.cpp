@@ -15,11 +15,16 @@ constexpr std::array<signed char, kCodes> makeSlots() {
 
 constexpr auto kSlots = makeSlots();
 
+// With their lengths, so that a comparison ends at once.
+constexpr auto kNames = function_types::makeTable<std::string_view>(
+    [](const FamilyRow& row, size_t suffix) { return std::string_view(row.names[suffix]); },
+    std::string_view());
+
 }  // namespace
 
 int functionTypeCode(std::string_view name) {
-  for (size_t row = 0; function_type_name_table[row] != nullptr; ++row) {
-    if (name == function_type_name_table[row]) return function_type_number_table[row];
+  for (size_t row = 0; row < kFunctionTypes; ++row) {
+    if (name == kNames[row]) return function_type_number_table[row];
   }
   return kInvalidFunctionType;
 }

@@ -4,8 +4,8 @@
 #include <cstddef>
 #include <string_view>
 
-// The calling types of plug-in functions: twelve families in four forms each. Codes, names and slots
-// derive from kFamilies, the only list.
+// The calling types of plug-in functions: twelve families in four forms each. Codes, names and
+// slots derive from kFamilies, the only list.
 
 /// What a function does and with which data.
 enum class Family {
@@ -83,5 +83,9 @@ int functionTypeCode(std::string_view name);
 /// The row of a code in the tables, or -1.
 int functionTypeSlot(int code);
 
-inline Family familyOfSlot(int slot) { return kFamilies[static_cast<size_t>(slot) / kSuffixes].family; }
-inline Suffix suffixOfSlot(int slot) { return static_cast<Suffix>(static_cast<size_t>(slot) % kSuffixes); }
+inline Family familyOfSlot(int slot) {
+  return kFamilies[static_cast<size_t>(slot) / kSuffixes].family;
+}
+inline Suffix suffixOfSlot(int slot) {
+  return static_cast<Suffix>(static_cast<size_t>(slot) % kSuffixes);
+}

@@ -1,5 +1,5 @@
-// The packed value buffers of plug-in calls: items that begin with two 32-bit words in the machine's
-// (little-endian) order, a tag and a value, length or count.
+// The packed value buffers of plug-in calls: items that begin with two 32-bit words in the
+// machine's (little-endian) order, a tag and a value, length or count.
 
 #include "diagnostics/debug.h"
 #include "engine/ProviderDefFunction.h"
@@ -20,8 +20,8 @@ enum Tag : std::uint32_t {
 
 constexpr size_t kWord = 4;
 constexpr size_t kHeader = 2 * kWord;
-// From one string of an array to the next, besides the string's bytes: header, NUL and 24 more bytes.
-// Plug-ins write results so; packAS writes inputs without the 24.
+// From one string of an array to the next, besides the string's bytes: header, NUL and 24 more
+// bytes. Plug-ins write results so; packAS writes inputs without the 24.
 constexpr size_t kStringArrayStride = 33;
 
 size_t room(const char* position, const char* end) {
@@ -43,7 +43,9 @@ char* writeHeader(char* position, Tag tag, size_t second) {
   return writeWord(writeWord(position, tag), static_cast<std::uint32_t>(second));
 }
 
-bool isTag(std::uint32_t word) { return word <= kTagStringArray || word == kTagEnd; }
+bool isTag(std::uint32_t word) {
+  return word <= kTagStringArray || word == kTagEnd;
+}
 
 }  // namespace
 

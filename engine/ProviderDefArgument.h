@@ -27,6 +27,8 @@ class ProviderDefArgument {
 
   /// Builds the argument from its `argument` element; see ProviderDefModule for the arguments.
   ProviderDefArgument(const char* text, int length, int* consumed, ProviderDefModule* module);
+  /// The same for the element at which `reader` stands; leaves it at the end tag.
+  ProviderDefArgument(ElementReader& reader, ProviderDefModule* module);
 
   ProviderDefArgument(const ProviderDefArgument&);
   ProviderDefArgument(ProviderDefArgument&&) noexcept;
@@ -45,6 +47,7 @@ class ProviderDefArgument {
   ProviderDefValue evaluate(int index) const;
 
  private:
+  void read(ElementReader& reader, ProviderDefModule* module);
   void readElement(ElementReader& reader, ProviderDefModule* module);
 
   int type_ = kIndex;

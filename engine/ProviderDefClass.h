@@ -15,6 +15,8 @@ class ProviderDefClass {
  public:
   /// Builds the class from its `class` element; see ProviderDefModule for the arguments.
   ProviderDefClass(const char* text, int length, int* consumed, ProviderDefModule* module);
+  /// The same for the element at which `reader` stands; leaves it at the end tag.
+  ProviderDefClass(ElementReader& reader, ProviderDefModule* module);
 
   const std::string& getName() const { return name_; }
   const std::string& getNamespace() const { return namespace_; }
@@ -29,6 +31,7 @@ class ProviderDefClass {
   int getNumberOfInstances() const;
 
  private:
+  void read(ElementReader& reader, ProviderDefModule* module);
   void readInstances(ElementReader& reader, ProviderDefModule* module);
 
   std::string name_;

@@ -15,7 +15,10 @@ struct ProviderDefFunction::Extra {
 };
 
 ProviderDefFunction::ProviderDefFunction(const ProviderDefFunction& other)
-    : name_(other.name_), type_(other.type_), module_(other.module_), loaded_(other.loaded_.load()) {
+    : name_(other.name_),
+      type_(other.type_),
+      module_(other.module_),
+      loaded_(other.loaded_.load()) {
   for (size_t i = 0; i < slots_.size(); ++i) slots_[i].store(other.slots_[i].load());
 }
 
@@ -61,8 +64,10 @@ void ProviderDefFunction::checkIntact(const CallBuffer& buffer) const {
   }
 }
 
-// Takes `value` as the extra argument of a function of this suffix; false when its type does not fit.
-bool ProviderDefFunction::takeExtra(Extra& extra, Suffix suffix, const ProviderDefValue& value) const {
+// Takes `value` as the extra argument of a function of this suffix; false when its type does not
+// fit.
+bool ProviderDefFunction::takeExtra(Extra& extra, Suffix suffix,
+                                    const ProviderDefValue& value) const {
   extra.suffix = suffix;
   switch (suffix) {
     case Suffix::kI:
@@ -96,7 +101,7 @@ Result ProviderDefFunction::call(void* entry, const Extra& extra, Arguments... a
       return reinterpret_cast<Result (*)(Arguments..., int)>(entry)(arguments..., extra.number);
     case Suffix::kW:
       return reinterpret_cast<Result (*)(Arguments..., const char*)>(entry)(arguments...,
-                                                                           extra.text);
+                                                                            extra.text);
     case Suffix::kV: {
       CallBuffer& buffer = const_cast<CallBuffer&>(*extra.buffer);
       const Result result =
@@ -184,11 +189,15 @@ int ProviderDefFunction::callExec(const Extra& extra, const Values* inputs, Valu
 
 namespace {
 
-bool isSet(int slot) { return slot >= 0 && familyOfSlot(slot) <= Family::kSetAS; }
+bool isSet(int slot) {
+  return slot >= 0 && familyOfSlot(slot) <= Family::kSetAS;
+}
 bool isGet(int slot) {
   return slot >= 0 && familyOfSlot(slot) >= Family::kGetI && familyOfSlot(slot) <= Family::kGetL;
 }
-bool isOf(int slot, Family family) { return slot >= 0 && familyOfSlot(slot) == family; }
+bool isOf(int slot, Family family) {
+  return slot >= 0 && familyOfSlot(slot) == family;
+}
 
 }  // namespace
 

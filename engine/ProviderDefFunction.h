@@ -9,17 +9,18 @@
 #include <string>
 #include <vector>
 
+class ElementReader;
 class ProviderDefModule;
 
 /// A plug-in function: its symbol, its calling type, its module, and the calls themselves.
 ///
-/// The type code fixes the C signature (docs/plugins.md). An operation that does not fit the type, or
-/// a value of a type that the function cannot take, does not call the plug-in and yields the
+/// The type code fixes the C signature (docs/plugins.md). An operation that does not fit the type,
+/// or a value of a type that the function cannot take, does not call the plug-in and yields the
 /// operation's not-supported result: 0 from set, 99 from exec, the empty value from get.
 ///
 /// All operations throw ProviderDefError when the library or the symbol cannot be loaded, when an
-/// input does not fit the 1024 bytes of a buffer (the plug-in is not called then), and when a result
-/// does not lie within its buffer. They may be called from several threads at once.
+/// input does not fit the 1024 bytes of a buffer (the plug-in is not called then), and when a
+/// result does not lie within its buffer. They may be called from several threads at once.
 class ProviderDefFunction {
  public:
   using Values = std::vector<ProviderDefValue>;
@@ -32,6 +33,8 @@ class ProviderDefFunction {
 
   /// Builds the function from its `function` element; the other arguments as for every element.
   ProviderDefFunction(const char* text, int length, int* consumed, ProviderDefModule* module);
+  /// The same for the element at which `reader` stands; leaves it at the end tag.
+  ProviderDefFunction(ElementReader& reader, ProviderDefModule* module);
   ProviderDefFunction(const ProviderDefFunction& other);
   ProviderDefFunction& operator=(const ProviderDefFunction&) = delete;
 
@@ -77,6 +80,7 @@ class ProviderDefFunction {
  private:
   struct Extra;
 
+  void read(ElementReader& reader);
   int slot() const { return functionTypeSlot(type_); }
   bool isType(Family family, Suffix suffix) const;
   /// The entry point after loadFunction().

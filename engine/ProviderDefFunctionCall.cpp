@@ -66,7 +66,9 @@ ProviderDefValue ProviderDefFunctionCall::getValue(int index) const {
   }
 }
 
-int ProviderDefFunctionCall::getValue() const { return function().get().getIntValue(); }
+int ProviderDefFunctionCall::getValue() const {
+  return function().get().getIntValue();
+}
 
 int ProviderDefFunctionCall::setValue(const ProviderDefValue& value, int index) const {
   if (arguments_.empty()) return function().set(value);

@@ -6,13 +6,14 @@
 
 #include <vector>
 
+class ElementReader;
 class ProviderDefModule;
 
 /// A call of a plug-in function with the arguments that the definition gives.
 ///
-/// The arguments decide which operation of the function is used; where they do not fit together, the
-/// result is the operation's not-supported one (docs/definition-files.md). ProviderDefError from
-/// loading or calling passes through.
+/// The arguments decide which operation of the function is used; where they do not fit together,
+/// the result is the operation's not-supported one (docs/definition-files.md). ProviderDefError
+/// from loading or calling passes through.
 class ProviderDefFunctionCall {
  public:
   using Values = std::vector<ProviderDefValue>;
@@ -24,6 +25,8 @@ class ProviderDefFunctionCall {
 
   /// Builds the call from its `functioncall` element; see ProviderDefModule for the arguments.
   ProviderDefFunctionCall(const char* text, int length, int* consumed, ProviderDefModule* module);
+  /// The same for the element at which `reader` stands; leaves it at the end tag.
+  ProviderDefFunctionCall(ElementReader& reader, ProviderDefModule* module);
 
   ProviderDefFunctionCall(const ProviderDefFunctionCall&);
   ProviderDefFunctionCall(ProviderDefFunctionCall&&) noexcept;
@@ -46,6 +49,7 @@ class ProviderDefFunctionCall {
   void init() const;
 
  private:
+  void read(ElementReader& reader, ProviderDefModule* module);
   ProviderDefFunction& function() const;
   Values evaluate(int index) const;
 

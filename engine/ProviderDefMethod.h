@@ -5,11 +5,15 @@
 #include <string>
 #include <vector>
 
+class ElementReader;
+
 /// Which call carries out a method of a class.
 class ProviderDefMethod {
  public:
   /// Builds the method from its `method` element; see ProviderDefModule for the arguments.
   ProviderDefMethod(const char* text, int length, int* consumed, ProviderDefModule* module);
+  /// The same for the element at which `reader` stands; leaves it at the end tag.
+  ProviderDefMethod(ElementReader& reader, ProviderDefModule* module);
 
   const std::string& getName() const { return name_; }
 
@@ -20,6 +24,8 @@ class ProviderDefMethod {
   }
 
  private:
+  void read(ElementReader& reader, ProviderDefModule* module);
+
   std::string name_;
   ProviderDefFunctionCall call_;
 };

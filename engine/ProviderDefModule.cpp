@@ -26,7 +26,9 @@ std::recursive_mutex& openingMutex() {
 
 class ModuleLock {
  public:
-  explicit ModuleLock(Vaneth::Mutex& mutex) : mutex_(mutex) { mutex_.lock(Vaneth::Mutex::kInfinite); }
+  explicit ModuleLock(Vaneth::Mutex& mutex) : mutex_(mutex) {
+    mutex_.lock(Vaneth::Mutex::kInfinite);
+  }
   ~ModuleLock() { mutex_.unlock(); }
   ModuleLock(const ModuleLock&) = delete;
   ModuleLock& operator=(const ModuleLock&) = delete;
@@ -37,16 +39,6 @@ class ModuleLock {
 
 }  // namespace
 
-ProviderDefModule::ProviderDefModule(const char* text, int length, int* consumed)
-    : firstFunction_(functionCount()) {
-  try {
-    parse(text, length, consumed);
-  } catch (...) {
-    detachFunctions();
-    throw;
-  }
-}
-
 ProviderDefModule::ProviderDefModule(const ProviderDefModule& other)
     : name_(other.name_),
       init_(other.init_),
@@ -56,10 +48,14 @@ ProviderDefModule::ProviderDefModule(const ProviderDefModule& other)
       handle_(other.handle_),
       firstFunction_(functionCount()) {}
 
-ProviderDefModule::~ProviderDefModule() { detachFunctions(); }
+ProviderDefModule::~ProviderDefModule() {
+  detachFunctions();
+}
 
 // A function whose module never came to be, or has gone, fails as one that cannot be loaded.
-void ProviderDefModule::detachFunctions() { replaceModule(this, nullptr, firstFunction_); }
+void ProviderDefModule::detachFunctions() {
+  replaceModule(this, nullptr, firstFunction_);
+}
 
 std::string ProviderDefModule::libraryFile() const {
   return path_ == kShort ? "../lib/lib" + name_ + ".so" : name_;

@@ -6,6 +6,7 @@
 #include <memory>
 #include <string>
 
+class ElementReader;
 class ProviderDefFunctionCall;
 
 /// A plug-in library and the call that initialises it.
@@ -22,6 +23,8 @@ class ProviderDefModule {
   /// `text` starts at the start tag and has `length` characters; `*consumed` becomes the number of
   /// characters up to and including the end tag. Throws ProviderDefXMLError.
   ProviderDefModule(const char* text, int length, int* consumed);
+  /// The same for the element at which `reader` stands; leaves it at the end tag.
+  explicit ProviderDefModule(ElementReader& reader);
   ProviderDefModule(const ProviderDefModule& other);
   ProviderDefModule& operator=(const ProviderDefModule&) = delete;
   ~ProviderDefModule();
@@ -39,15 +42,16 @@ class ProviderDefModule {
 
   /// The address of an exported symbol, never null.
   ///
-  /// Opens the library when it is not open and runs the initialisation call, once per opening. Throws
-  /// ProviderDefError "Couldn't load module " + module name (the next call tries again) or "Couldn't
-  /// load function " + `name`. Safe from several threads.
+  /// Opens the library when it is not open and runs the initialisation call, once per opening.
+  /// Throws ProviderDefError "Couldn't load module " + module name (the next call tries again) or
+  /// "Couldn't load function " + `name`. Safe from several threads.
   void* getFunction(const std::string& name);
 
  private:
   enum PathType { kFull = 0, kShort = 1 };
 
-  void parse(const char* text, int length, int* consumed);
+  void read(ElementReader& reader);
+  void readOrDetach(ElementReader& reader);
   void open();
   std::string libraryFile() const;
   void detachFunctions();

@@ -12,6 +12,8 @@ class ProviderDefProperty {
  public:
   /// Builds the property from its `property` element; see ProviderDefModule for the arguments.
   ProviderDefProperty(const char* text, int length, int* consumed, ProviderDefModule* module);
+  /// The same for the element at which `reader` stands; leaves it at the end tag.
+  ProviderDefProperty(ElementReader& reader, ProviderDefModule* module);
 
   const std::string& getName() const { return name_; }
   /// True when the value read is turned into a text through ValueMap and Values qualifiers.
@@ -25,6 +27,7 @@ class ProviderDefProperty {
   int setValue(const ProviderDefValue& value, int index) const;
 
  private:
+  void read(ElementReader& reader, ProviderDefModule* module);
   void readGet(ElementReader& reader, ProviderDefModule* module);
   void readSet(ElementReader& reader, ProviderDefModule* module);
 

@@ -20,7 +20,9 @@ bool containsAll(const std::vector<T>& whole, const std::vector<T>& part) {
 }
 
 // As %s shows it: up to an embedded NUL.
-std::string_view shown(const std::string& text) { return std::string_view(text.c_str()); }
+std::string_view shown(const std::string& text) {
+  return std::string_view(text.c_str());
+}
 
 }  // namespace
 

@@ -6,9 +6,9 @@
 
 /// One value on its way between a definition, a plug-in function and the CIM side.
 ///
-/// A plain value: a copy shares nothing with its source. No accessor checks the type code; each reads
-/// its own field, which is zero or empty unless a constructor set it. Strings are bytes without an
-/// assumed encoding. Throws only std::bad_alloc. Concurrent reads are safe.
+/// A plain value: a copy shares nothing with its source. No accessor checks the type code; each
+/// reads its own field, which is zero or empty unless a constructor set it. Strings are bytes
+/// without an assumed encoding. Throws only std::bad_alloc. Concurrent reads are safe.
 class ProviderDefValue {
  public:
   /// Type codes, as getType() gives them.
@@ -66,7 +66,6 @@ class ProviderDefValue {
 
   /// The mirror of partof: `a.include(b)` is `b.partof(a)`.
   bool include(const ProviderDefValue& other) const { return other.partof(*this); }
-
 
  private:
   int type_ = kInteger;

@@ -12,6 +12,9 @@ namespace {
 template <class T>
 class NamedList {
  public:
+  // Most look-ups miss, while definitions are read: sparse buckets let them end at once.
+  NamedList() { byName_.max_load_factor(0.25f); }
+
   T* find(std::string_view name) const {
     const auto found = byName_.find(name);
     return found == byName_.end() ? nullptr : found->second;
@@ -22,6 +25,13 @@ class NamedList {
     T* added = objects_.back().get();
     byName_.emplace(added->getName(), added);
     return added;
+  }
+
+  /// Adds the object when its name is new; gives the first object of the name. One look-up.
+  T* addNew(std::unique_ptr<T> object) {
+    const auto [entry, isNew] = byName_.try_emplace(object->getName(), object.get());
+    if (isNew) objects_.push_back(std::move(object));
+    return entry->second;
   }
 
   void clear() {
@@ -64,10 +74,18 @@ ProviderDefModule* getModule(const std::string& name) {
   return module;
 }
 
+namespace {
+
+void noteMissingFunction() {
+  static char miss[] = "Can not find a function\n";
+  debug(9, miss);
+}
+
+}  // namespace
+
 ProviderDefFunction* getFunction(const std::string& name) {
   ProviderDefFunction* function = functions().find(name);
-  static char miss[] = "Can not find a function\n";
-  if (function == nullptr) debug(9, miss);
+  if (function == nullptr) noteMissingFunction();
   return function;
 }
 
@@ -79,12 +97,21 @@ ProviderDefFunction* registerFunction(std::unique_ptr<ProviderDefFunction> funct
   return functions().add(std::move(function));
 }
 
+ProviderDefFunction* registerNewFunction(std::unique_ptr<ProviderDefFunction> function) {
+  const ProviderDefFunction* added = function.get();
+  ProviderDefFunction* registered = functions().addNew(std::move(function));
+  if (registered == added) noteMissingFunction();
+  return registered;
+}
+
 ProviderDefFunctionCall* keepInitCall(std::unique_ptr<ProviderDefFunctionCall> call) {
   initCalls().push_back(std::move(call));
   return initCalls().back().get();
 }
 
-size_t functionCount() { return functions().objects().size(); }
+size_t functionCount() {
+  return functions().objects().size();
+}
 
 void replaceModule(const ProviderDefModule* from, ProviderDefModule* to, size_t first) {
   const auto& all = functions().objects();
@@ -93,7 +120,9 @@ void replaceModule(const ProviderDefModule* from, ProviderDefModule* to, size_t 
   }
 }
 
-void releaseFunctions() { functions().clear(); }
+void releaseFunctions() {
+  functions().clear();
+}
 
 void releaseModules() {
   modules().clear();

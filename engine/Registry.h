@@ -10,11 +10,11 @@
 
 // The process-wide registries of modules and functions.
 //
-// They own their objects; a pointer stays valid until the release. No lock is taken: they are filled
-// while definition files are read, before any request, and emptied after the last one.
+// They own their objects; a pointer stays valid until the release. No lock is taken: they are
+// filled while definition files are read, before any request, and emptied after the last one.
 
-/// Finds a registered module by its exact, case-sensitive name; the first one wins. nullptr (noted at
-/// level 9 on standard output) when there is none. Takes constant time.
+/// Finds a registered module by its exact, case-sensitive name; the first one wins. nullptr (noted
+/// at level 9 on standard output) when there is none. Takes constant time.
 ProviderDefModule* getModule(const std::string& name);
 
 /// The same for functions.
@@ -23,8 +23,12 @@ ProviderDefFunction* getFunction(const std::string& name);
 ProviderDefModule* registerModule(std::unique_ptr<ProviderDefModule> module);
 ProviderDefFunction* registerFunction(std::unique_ptr<ProviderDefFunction> function);
 
-/// Keeps a module's initialisation call until releaseModules(): a call may outlive the module object
-/// that was read with it, since a registered module of the same name can take it over.
+/// Registers a function whose name is new; gives the registered function of that name, which is the
+/// first one that was declared.
+ProviderDefFunction* registerNewFunction(std::unique_ptr<ProviderDefFunction> function);
+
+/// Keeps a module's initialisation call until releaseModules(): a call may outlive the module
+/// object that was read with it, since a registered module of the same name can take it over.
 ProviderDefFunctionCall* keepInitCall(std::unique_ptr<ProviderDefFunctionCall> call);
 
 /// How many functions are registered.
@@ -37,8 +41,8 @@ void replaceModule(const ProviderDefModule* from, ProviderDefModule* to, size_t 
 /// Destroys every registered function.
 void releaseFunctions();
 
-/// Destroys every registered module, which closes its library, and empties the class and association
-/// lists. Call releaseFunctions() first.
+/// Destroys every registered module, which closes its library, and empties the class and
+/// association lists. Call releaseFunctions() first.
 void releaseModules();
 
 /// Empties the class and the association list. The definition registries implement it.

@@ -7,8 +7,8 @@ namespace Vaneth {
 
 /// A recursive lock with a time-out: its owner may lock it again and unlocks it as often.
 ///
-/// Recursive because a module's initialisation call resolves functions of the very module whose lock
-/// the opening thread holds.
+/// Recursive because a module's initialisation call resolves functions of the very module whose
+/// lock the opening thread holds.
 class Mutex {
  public:
   /// A wait without end.

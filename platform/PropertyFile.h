@@ -16,9 +16,9 @@ class PropertyFileError : public std::runtime_error {
 
 /// A text file of `key = value` lines.
 ///
-/// UTF-8, or Latin-1 where a line is not valid UTF-8. Blanks around key and value are dropped; lines
-/// that start with '#' or ';', `[section]` lines and lines without '=' are skipped; of a key that
-/// stands twice the last value counts. Not for use by several threads at once.
+/// UTF-8, or Latin-1 where a line is not valid UTF-8. Blanks around key and value are dropped;
+/// lines that start with '#' or ';', `[section]` lines and lines without '=' are skipped; of a key
+/// that stands twice the last value counts. Not for use by several threads at once.
 class PropertyFile {
  public:
   /// The only mode there is: existing file, read only.

@@ -25,8 +25,7 @@ void CommonProvider::associatorNames(const OperationContext& context,
   const auto candidates = getProviderDefAssociation(associationName, objectClass, resultName);
   const CIMObjectPath object = withoutPlace(objectName);
   DEBUG_FORMAT(7, "associatorNames : object: %s, association : %s, result : %s",
-               make_string(object.toString()).c_str(), associationName.c_str(),
-               resultName.c_str());
+               make_string(object.toString()).c_str(), associationName.c_str(), resultName.c_str());
   if (candidates.empty()) {
     throw CIMException(CIM_ERR_NOT_SUPPORTED, String("CommonProvider::associatorNames"));
   }
@@ -45,8 +44,7 @@ void CommonProvider::associatorNames(const OperationContext& context,
 void CommonProvider::deliverTargets(const OperationContext& context,
                                     const CIMNamespaceName& nameSpace, const CIMObjectPath& object,
                                     const ProviderDefAssociation& association,
-                                    const std::string& objectClass,
-                                    const std::string& targetClass,
+                                    const std::string& objectClass, const std::string& targetClass,
                                     ObjectPathResponseHandler& handler) {
   DEBUG_FORMAT(8, "Result class is : %s", targetClass.c_str());
   const auto enumerateSide = [&](const std::string& className) {
@@ -67,9 +65,9 @@ void CommonProvider::deliverTargets(const OperationContext& context,
   const auto sourceProperties = association.getClassProperties(objectClass);
   for (Uint32 s = 0; s < sources.size(); ++s) {
     if (withoutPlace(sources[s].getPath()) != object) continue;
-    const auto related = association.getAssociation(
-        objectClass, static_cast<int>(s), getPropertyValues(sources[s], sourceProperties),
-        targetClass, targetValues);
+    const auto related = association.getAssociation(objectClass, static_cast<int>(s),
+                                                    getPropertyValues(sources[s], sourceProperties),
+                                                    targetClass, targetValues);
     DEBUG_FORMAT(8, "Number of associated instance is : %d\n", static_cast<int>(related.size()));
     for (const int k : related) {
       // A defined class may count more instances than could be built.

@@ -158,4 +158,6 @@ std::vector<ProviderDefValue> getPropertyValues(CIMInstance& instance,
 }  // namespace Vaneth
 
 // A fixed placeholder: no query is looked up, whatever its text.
-ProviderDefValue getCimProperty(const std::string&) { return ProviderDefValue(0); }
+ProviderDefValue getCimProperty(const std::string&) {
+  return ProviderDefValue(0);
+}

@@ -27,9 +27,9 @@ Pegasus::CIMValue toCimValue(const ProviderDefValue& value, Pegasus::CIMType typ
 
 /// Turns a CIM value into a definition value, read as the type given.
 ///
-/// Booleans are 1 or 0, 64-bit integers keep their low 32 bits, reals are truncated towards zero and
-/// saturate at the range of int (NaN is 0); datetimes and references give their text form. A null
-/// value reads as 0 or "". TypeMismatchException when the value is of another type.
+/// Booleans are 1 or 0, 64-bit integers keep their low 32 bits, reals are truncated towards zero
+/// and saturate at the range of int (NaN is 0); datetimes and references give their text form. A
+/// null value reads as 0 or "". TypeMismatchException when the value is of another type.
 ProviderDefValue fromCimValue(const Pegasus::CIMValue& value, Pegasus::CIMType type, bool isArray);
 
 /// The key binding type of a property's CIM type.
@@ -38,8 +38,8 @@ Pegasus::CIMKeyBinding::Type keyBindingType(Pegasus::CIMType type);
 /// Reads a property by its declared type.
 ProviderDefValue getPropertyValue(Pegasus::CIMProperty property);
 
-/// Reads the named properties of an instance: one value for each name, in the order of the names; the
-/// empty value for a property that the instance does not have.
+/// Reads the named properties of an instance: one value for each name, in the order of the names;
+/// the empty value for a property that the instance does not have.
 std::vector<ProviderDefValue> getPropertyValues(Pegasus::CIMInstance& instance,
                                                 const std::vector<std::string>& names);
 

@@ -18,7 +18,9 @@ namespace {
 // The one text of every operation that the provider refuses, whichever it is.
 const char kRefusal[] = "CommonProvider::deleteInstance";
 
-[[noreturn]] void refuse() { throw CIMException(CIM_ERR_NOT_SUPPORTED, String(kRefusal)); }
+[[noreturn]] void refuse() {
+  throw CIMException(CIM_ERR_NOT_SUPPORTED, String(kRefusal));
+}
 
 }  // namespace
 
@@ -54,8 +56,8 @@ void CommonProvider::deleteInstance(const OperationContext&, const CIMObjectPath
 }
 
 void CommonProvider::references(const OperationContext&, const CIMObjectPath&, const CIMName&,
-                                const String&, const Boolean, const Boolean,
-                                const CIMPropertyList&, ObjectResponseHandler&) {
+                                const String&, const Boolean, const Boolean, const CIMPropertyList&,
+                                ObjectResponseHandler&) {
   refuse();
 }
 

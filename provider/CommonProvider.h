@@ -14,9 +14,9 @@ namespace Vaneth {
 /// The provider object that the CIM server creates: serves every class that the definition files of
 /// the working directory declare.
 ///
-/// The definitions live in process-wide registries, not in the object. Operations may be called from
-/// several threads at once, between initialize() and terminate(). Nothing is kept between requests:
-/// each one evaluates the definitions anew.
+/// The definitions live in process-wide registries, not in the object. Operations may be called
+/// from several threads at once, between initialize() and terminate(). Nothing is kept between
+/// requests: each one evaluates the definitions anew.
 ///
 /// Unknown classes, methods and instances are no errors: the operation ends quietly. The only
 /// CIMException thrown is CIM_ERR_NOT_SUPPORTED.
@@ -41,8 +41,8 @@ class CommonProvider : public Pegasus::CIMInstanceProvider,
                    const Pegasus::CIMPropertyList& propertyList,
                    Pegasus::InstanceResponseHandler& handler) override;
 
-  /// Delivers the instances of a defined class, one for each index, or those of an association class,
-  /// one for each related pair. The flags and the property list are ignored.
+  /// Delivers the instances of a defined class, one for each index, or those of an association
+  /// class, one for each related pair. The flags and the property list are ignored.
   void enumerateInstances(const Pegasus::OperationContext& context,
                           const Pegasus::CIMObjectPath& classReference,
                           const Pegasus::Boolean includeQualifiers,
@@ -54,8 +54,8 @@ class CommonProvider : public Pegasus::CIMInstanceProvider,
                               const Pegasus::CIMObjectPath& classReference,
                               Pegasus::ObjectPathResponseHandler& handler) override;
 
-  /// Writes the properties that both the definition and the instance have. Which ones failed is told
-  /// by the log alone.
+  /// Writes the properties that both the definition and the instance have. Which ones failed is
+  /// told by the log alone.
   void modifyInstance(const Pegasus::OperationContext& context,
                       const Pegasus::CIMObjectPath& instanceReference,
                       const Pegasus::CIMInstance& instanceObject,
@@ -98,8 +98,8 @@ class CommonProvider : public Pegasus::CIMInstanceProvider,
                   const Pegasus::CIMPropertyList& propertyList,
                   Pegasus::ObjectResponseHandler& handler) override;
   void referenceNames(const Pegasus::OperationContext& context,
-                      const Pegasus::CIMObjectPath& objectName,
-                      const Pegasus::CIMName& resultClass, const Pegasus::String& role,
+                      const Pegasus::CIMObjectPath& objectName, const Pegasus::CIMName& resultClass,
+                      const Pegasus::String& role,
                       Pegasus::ObjectPathResponseHandler& handler) override;
 
   void invokeMethod(const Pegasus::OperationContext& context,

@@ -49,8 +49,7 @@ void setValue(CIMProperty& property, CIMClass& cimClass, const ProviderDefProper
     DEBUG_FORMAT(9, "DATE TIME: %s\n", value.getStringValue().c_str());
     value = definition.getValue(index);
   }
-  property.setValue(
-      toCimValue(value, property.getType(), property.isArray(), WideSource::kLong));
+  property.setValue(toCimValue(value, property.getType(), property.isArray(), WideSource::kLong));
 }
 
 bool isKey(CIMProperty& property) {
@@ -86,8 +85,8 @@ CIMInstance buildInstance(const ProviderDefClass& definition, CIMClass& cimClass
     DEBUG_FORMAT(9, "CommonProvider: end of a property process %s\n", text.c_str());
   }
   if (count != 0) {
-    instance.setPath(CIMObjectPath(String(), classPath.getNameSpace(), classPath.getClassName(),
-                                   keys));
+    instance.setPath(
+        CIMObjectPath(String(), classPath.getNameSpace(), classPath.getClassName(), keys));
   }
   return instance;
 }

@@ -74,10 +74,9 @@ void CommonProvider::enumerateAssociation(const OperationContext& context,
   handler.processing();
   const CIMNamespaceName& nameSpace = classReference.getNameSpace();
   const auto enumerateSide = [&](const std::string& className) {
-    const Instances instances =
-        enumerateAny(context, nameSpace, className,
-                     "enumerateInstances in CommonProvider:enumerateInstances " + className +
-                         " Entry\n");
+    const Instances instances = enumerateAny(
+        context, nameSpace, className,
+        "enumerateInstances in CommonProvider:enumerateInstances " + className + " Entry\n");
     DEBUG_FORMAT(9, "Source Instances %s: %d\n", className.c_str(),
                  static_cast<int>(instances.size()));
     return instances;
@@ -93,9 +92,9 @@ void CommonProvider::enumerateAssociation(const OperationContext& context,
       secondValues.push_back(getPropertyValues(second[k], secondProperties));
     }
     for (Uint32 j = 0; j < first.size(); ++j) {
-      const auto related = association.getAssociation(
-          firstClass, static_cast<int>(j), getPropertyValues(first[j], firstProperties),
-          secondClass, secondValues);
+      const auto related = association.getAssociation(firstClass, static_cast<int>(j),
+                                                      getPropertyValues(first[j], firstProperties),
+                                                      secondClass, secondValues);
       for (const int k : related) {
         // A defined class may count more instances than could be built.
         if (static_cast<Uint32>(k) >= second.size()) continue;
@@ -118,12 +117,11 @@ CIMInstance CommonProvider::buildAssociationInstance(const OperationContext& con
                                                      const CIMObjectPath& second) {
   CIMInstance instance(classReference.getClassName());
   CIMClass cimClass =
-      cimom_->getClass(context, classReference.getNameSpace(), classReference.getClassName(),
-                       false, true, false, CIMPropertyList());
+      cimom_->getClass(context, classReference.getNameSpace(), classReference.getClassName(), false,
+                       true, false, CIMPropertyList());
   Array<CIMKeyBinding> keys;
   const auto addReference = [&](const std::string& name, const CIMObjectPath& path) {
-    CIMProperty property =
-        cimClass.getProperty(cimClass.findProperty(CIMName(make_String(name))));
+    CIMProperty property = cimClass.getProperty(cimClass.findProperty(CIMName(make_String(name))));
     property.setValue(CIMValue(path));
     instance.addProperty(CIMProperty(property.getName(), property.getValue()));
     keys.append(CIMKeyBinding(property.getName(), property.getValue().toString(),
@@ -132,8 +130,8 @@ CIMInstance CommonProvider::buildAssociationInstance(const OperationContext& con
   const auto [firstName, secondName] = association.getPropertyNamePair();
   addReference(firstName, first);
   addReference(secondName, second);
-  instance.setPath(CIMObjectPath(String(), classReference.getNameSpace(),
-                                 classReference.getClassName(), keys));
+  instance.setPath(
+      CIMObjectPath(String(), classReference.getNameSpace(), classReference.getClassName(), keys));
   return instance;
 }
 
@@ -151,9 +149,8 @@ void CommonProvider::enumerateInstanceNames(const OperationContext& context,
 
 void CommonProvider::getInstance(const OperationContext& context,
                                  const CIMObjectPath& instanceReference,
-                                 const Boolean includeQualifiers,
-                                 const Boolean includeClassOrigin, const CIMPropertyList&,
-                                 InstanceResponseHandler& handler) {
+                                 const Boolean includeQualifiers, const Boolean includeClassOrigin,
+                                 const CIMPropertyList&, InstanceResponseHandler& handler) {
   handler.processing();
   SimpleInstanceResponseHandler collected;
   enumerateInstances(context, instanceReference, includeQualifiers, includeClassOrigin,

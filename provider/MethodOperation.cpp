@@ -27,8 +27,8 @@ bool hasFlag(CIMParameter& parameter, const char* qualifier) {
          readFlag(parameter, qualifier);
 }
 
-// Appends the value that was sent for a declared in-parameter. A parameter that was not sent appends
-// nothing: those behind it move up.
+// Appends the value that was sent for a declared in-parameter. A parameter that was not sent
+// appends nothing: those behind it move up.
 void addInput(CIMParameter& declared, const Array<CIMParamValue>& sent,
               std::vector<ProviderDefValue>& inputs) {
   if (!readFlag(declared, "in")) return;
@@ -88,9 +88,9 @@ void CommonProvider::invokeMethod(const OperationContext& context,
   try {
     CIMClass cimClass = fetchClass(context, objectReference);
     CIMMethod method = cimClass.getMethod(cimClass.findMethod(methodName));
-    // The sense of "static" is the definitions' own: an instance is looked up for methods so marked.
-    const int index =
-        readFlag(method, "static") ? findPlace(context, objectReference).index : 0;
+    // The sense of "static" is the definitions' own: an instance is looked up for methods so
+    // marked.
+    const int index = readFlag(method, "static") ? findPlace(context, objectReference).index : 0;
     const std::vector<ProviderDefValue> inputs = readInputs(method, inParameters);
     std::vector<ProviderDefValue> outputs;
     const int result = defined->exec(inputs, outputs, index);

@@ -47,8 +47,7 @@ void CommonProvider::modifyInstance(const OperationContext& context,
   const Place place = findPlace(context, instanceReference);
   if (place.found) {
     CIMClass cimClass = fetchClass(context, instanceReference);
-    DEBUG_FORMAT(9, "number of properties is %d\n",
-                 static_cast<int>(cimClass.getPropertyCount()));
+    DEBUG_FORMAT(9, "number of properties is %d\n", static_cast<int>(cimClass.getPropertyCount()));
     for (Uint32 j = 0; j < cimClass.getPropertyCount(); ++j) {
       DEBUG_FORMAT(9, "CommonProvider: for each property %d\n", static_cast<int>(j));
       writeProperty(*definition, cimClass, j, instanceObject, place.index);

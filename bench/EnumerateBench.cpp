@@ -1,0 +1,266 @@
+// enumerateInstances of 1,000 instances with ten properties: through the provider library, and
+// through a provider class written by hand for the one class, over the same API and plug-in. Both
+// fetch the class for every instance.
+
+#include "provider/SimpleInstanceResponseHandler.h"
+
+#include <Pegasus/Common/CIMClass.h>
+#include <Pegasus/Common/CIMProperty.h>
+#include <Pegasus/Common/CIMQualifier.h>
+#include <Pegasus/Embedded/CIMOMHandleRep.h>
+#include <Pegasus/Provider/CIMInstanceProvider.h>
+
+#include <benchmark/benchmark.h>
+#include <dlfcn.h>
+#include <unistd.h>
+
+#include <cstdio>
+#include <cstring>
+#include <filesystem>
+#include <fstream>
+#include <stdexcept>
+
+using namespace Pegasus;
+
+namespace {
+
+struct PropertyRow {
+  const char* name;
+  CIMType type;
+  bool isArray;
+  bool key;
+  const char* function;
+  const char* functionType;
+};
+
+constexpr PropertyRow kProperties[] = {
+    {"DeviceID", CIMTYPE_STRING, false, true, "benchText", "getSi"},
+    {"Caption", CIMTYPE_STRING, false, false, "benchText", "getSi"},
+    {"Number", CIMTYPE_UINT32, false, false, "benchNumber", "getIi"},
+    {"Percent", CIMTYPE_UINT8, false, false, "benchNumber", "getIi"},
+    {"Offset", CIMTYPE_SINT16, false, false, "benchNumber", "getIi"},
+    {"Size", CIMTYPE_UINT64, false, false, "benchLong", "getLi"},
+    {"Ready", CIMTYPE_BOOLEAN, false, false, "benchNumber", "getIi"},
+    {"Load", CIMTYPE_REAL64, false, false, "benchNumber", "getIi"},
+    {"Counters", CIMTYPE_SINT32, true, false, "benchNumbers", "getAIi"},
+    {"Labels", CIMTYPE_STRING, true, false, "benchTexts", "getASi"},
+};
+
+CIMClass benchClass() {
+  CIMClass cimClass(CIMName("Bench_Device"));
+  for (const PropertyRow& row : kProperties) {
+    CIMProperty property(CIMName(row.name), CIMValue(row.type, row.isArray));
+    property.addQualifier(CIMQualifier(CIMName("Key"), CIMValue(row.key)));
+    property.addQualifier(
+        CIMQualifier(CIMName("Description"), CIMValue(String("A property of the device."))));
+    cimClass.addProperty(property);
+  }
+  return cimClass;
+}
+
+class BenchHost : public CIMOMHandleRep {
+ public:
+  CIMClass getClass(const OperationContext&, const CIMNamespaceName&, const CIMName&, Boolean,
+                    Boolean, Boolean, const CIMPropertyList&) override {
+    return class_.clone();
+  }
+  CIMInstance getInstance(const OperationContext&, const CIMNamespaceName&, const CIMObjectPath&,
+                          Boolean, Boolean, Boolean, const CIMPropertyList&) override {
+    throw CIMException(CIM_ERR_NOT_SUPPORTED);
+  }
+  Array<CIMInstance> enumerateInstances(const OperationContext&, const CIMNamespaceName&,
+                                        const CIMName&, Boolean, Boolean, Boolean, Boolean,
+                                        const CIMPropertyList&) override {
+    throw CIMException(CIM_ERR_NOT_SUPPORTED);
+  }
+
+ private:
+  CIMClass class_ = benchClass();
+};
+
+// What somebody would write for this one class: the property names, types and calls in the code, and
+// each value set on the class's own property, as in the library.
+class HandWritten {
+ public:
+  HandWritten() : library_(dlopen(BENCH_PLUGIN, RTLD_NOW)) {
+    text_ = reinterpret_cast<int (*)(void*, int)>(dlsym(library_, "benchText"));
+    number_ = reinterpret_cast<int (*)(int)>(dlsym(library_, "benchNumber"));
+    long_ = reinterpret_cast<long (*)(int)>(dlsym(library_, "benchLong"));
+    numbers_ = reinterpret_cast<int (*)(void*, int)>(dlsym(library_, "benchNumbers"));
+    texts_ = reinterpret_cast<int (*)(void*, int)>(dlsym(library_, "benchTexts"));
+  }
+  ~HandWritten() { dlclose(library_); }
+  HandWritten(const HandWritten&) = delete;
+  HandWritten& operator=(const HandWritten&) = delete;
+
+  void enumerate(CIMOMHandle& cimom, const OperationContext& context, const CIMObjectPath& path,
+                 InstanceResponseHandler& handler) {
+    handler.processing();
+    for (int i = 0; i < 1000; ++i) {
+      CIMClass cimClass = cimom.getClass(context, path.getNameSpace(), path.getClassName(), false,
+                                         true, true, CIMPropertyList());
+      CIMInstance instance(path.getClassName());
+      Array<CIMKeyBinding> keys;
+      set(cimClass, instance, keys, "DeviceID", CIMValue(text(i)));
+      set(cimClass, instance, keys, "Caption", CIMValue(text(i)));
+      set(cimClass, instance, keys, "Number", CIMValue(static_cast<Uint32>(number_(i))));
+      set(cimClass, instance, keys, "Percent", CIMValue(static_cast<Uint8>(number_(i))));
+      set(cimClass, instance, keys, "Offset", CIMValue(static_cast<Sint16>(number_(i))));
+      set(cimClass, instance, keys, "Size", CIMValue(static_cast<Uint64>(long_(i))));
+      set(cimClass, instance, keys, "Ready", CIMValue(number_(i) != 0));
+      set(cimClass, instance, keys, "Load", CIMValue(static_cast<Real64>(number_(i))));
+      set(cimClass, instance, keys, "Counters", CIMValue(numbers(i)));
+      set(cimClass, instance, keys, "Labels", CIMValue(texts(i)));
+      instance.setPath(CIMObjectPath(String(), path.getNameSpace(), path.getClassName(), keys));
+      handler.deliver(instance);
+    }
+    handler.complete();
+  }
+
+ private:
+  static void set(CIMClass& cimClass, CIMInstance& instance, Array<CIMKeyBinding>& keys,
+                  const char* name, const CIMValue& value) {
+    CIMProperty property = cimClass.getProperty(cimClass.findProperty(CIMName(name)));
+    property.setValue(value);
+    Boolean key = false;
+    property.getQualifier(property.findQualifier(CIMName("key"))).getValue().get(key);
+    if (key) keys.append(CIMKeyBinding(property.getName(), property.getValue()));
+    instance.addProperty(CIMProperty(property.getName(), property.getValue()));
+  }
+
+  String text(int index) {
+    char buffer[1024];
+    text_(buffer, index);
+    return String(buffer);
+  }
+  Array<Sint32> numbers(int index) {
+    char buffer[1024];
+    numbers_(buffer, index);
+    Array<Sint32> result;
+    int count;
+    std::memcpy(&count, buffer + 4, 4);
+    for (int i = 0; i < count; ++i) {
+      int value;
+      std::memcpy(&value, buffer + 12 + 8 * i, 4);
+      result.append(value);
+    }
+    return result;
+  }
+  Array<String> texts(int index) {
+    char buffer[1024];
+    texts_(buffer, index);
+    Array<String> result;
+    int count;
+    std::memcpy(&count, buffer + 4, 4);
+    const char* item = buffer + 8;
+    for (int i = 0; i < count; ++i) {
+      result.append(String(item + 8));
+      item += 33 + std::strlen(item + 8);
+    }
+    return result;
+  }
+
+  void* library_;
+  int (*text_)(void*, int);
+  int (*number_)(int);
+  long (*long_)(int);
+  int (*numbers_)(void*, int);
+  int (*texts_)(void*, int);
+};
+
+std::string definitionText() {
+  std::string text = std::string("<plugin><module name=\"") + BENCH_PLUGIN +
+                     "\"/><class name=\"Bench_Device\" namespace=\"root/bench\"><instances>"
+                     "<functioncall><function name=\"benchCount\" type=\"getI\"/></functioncall>"
+                     "</instances>";
+  for (const PropertyRow& row : kProperties) {
+    text += std::string("<property name=\"") + row.name + "\"><get><functioncall><function name=\"" +
+            row.function + "\" type=\"" + row.functionType +
+            "\"/><argument type=\"index\"/></functioncall></get></property>";
+  }
+  return text + "</class></plugin>";
+}
+
+// The working directory of a server: the definition file in run/, where the process is while the
+// object lives.
+class WorkingDirectory {
+ public:
+  WorkingDirectory() : before_(std::filesystem::current_path()) {
+    char name[] = "/tmp/commonprovider-bench-XXXXXX";
+    if (mkdtemp(name) == nullptr) throw std::runtime_error("no temporary directory");
+    tree_ = name;
+    std::filesystem::create_directory(tree_ / "run");
+    std::ofstream(tree_ / "run" / "bench.xml") << definitionText();
+    std::filesystem::current_path(tree_ / "run");
+  }
+  ~WorkingDirectory() {
+    std::filesystem::current_path(before_);
+    std::filesystem::remove_all(tree_);
+  }
+
+ private:
+  std::filesystem::path before_;
+  std::filesystem::path tree_;
+};
+
+const CIMObjectPath& benchPath() {
+  static const CIMObjectPath path(String(), CIMNamespaceName("root/bench"),
+                                  CIMName("Bench_Device"));
+  return path;
+}
+
+// Checks what was delivered, so that both sides are known to do the same work.
+void check(benchmark::State& state, Vaneth::SimpleInstanceResponseHandler& handler) {
+  if (handler.instances.size() != 1000 || handler.instances[999].getPropertyCount() != 10 ||
+      handler.instances[999].getPath().toString() !=
+          String("root/bench:Bench_Device.DeviceID=\"item 00999\"")) {
+    state.SkipWithError("not the instances expected");
+  }
+  state.SetItemsProcessed(state.iterations() * 1000);
+}
+
+void enumerateHandWritten(benchmark::State& state) {
+  BenchHost host;
+  setEmbeddedHost(&host);
+  CIMOMHandle cimom;
+  HandWritten provider;
+  Vaneth::SimpleInstanceResponseHandler last;
+  for (auto _ : state) {
+    Vaneth::SimpleInstanceResponseHandler handler;
+    provider.enumerate(cimom, OperationContext(), benchPath(), handler);
+    last = handler;
+  }
+  check(state, last);
+  setEmbeddedHost(nullptr);
+}
+BENCHMARK(enumerateHandWritten)->Unit(benchmark::kMicrosecond);
+
+void enumerateLibrary(benchmark::State& state) {
+  const WorkingDirectory directory;
+  BenchHost host;
+  setEmbeddedHost(&host);
+  CIMOMHandle cimom;
+  void* library = dlopen(COMMONPROVIDER_LIBRARY, RTLD_NOW);
+  if (library == nullptr) throw std::runtime_error(dlerror());
+  const auto create = reinterpret_cast<CIMProvider* (*)(const String&)>(
+      dlsym(library, "PegasusCreateProvider"));
+  CIMProvider* provider = create(String("CommonProvider"));
+  provider->initialize(cimom);
+  auto* instances = dynamic_cast<CIMInstanceProvider*>(provider);
+  {
+    Vaneth::SimpleInstanceResponseHandler last;
+    for (auto _ : state) {
+      Vaneth::SimpleInstanceResponseHandler handler;
+      instances->enumerateInstances(OperationContext(), benchPath(), false, false,
+                                    CIMPropertyList(), handler);
+      last = handler;
+    }
+    check(state, last);
+  }
+  provider->terminate();
+  dlclose(library);
+  setEmbeddedHost(nullptr);
+}
+BENCHMARK(enumerateLibrary)->Unit(benchmark::kMicrosecond);
+
+}  // namespace
