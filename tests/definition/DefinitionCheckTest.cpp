@@ -1,0 +1,104 @@
+#include "definition/DefinitionCheck.h"
+
+#include <gmock/gmock.h>
+
+#include <string>
+
+#include "definition/DefinitionRegistry.h"
+#include "tests/definition/Reading.h"
+#include "tests/support/LogLevel.h"
+#include "tests/support/TemporaryTree.h"
+
+namespace {
+
+using definition::CheckResult;
+using definition::Problem;
+
+class DefinitionCheck : public Registered {
+ protected:
+  CheckResult check(const std::string& text) {
+    TemporaryTree::write("a.xml", text);
+    return definition::checkDefinitionFiles({"a.xml"});
+  }
+
+  TemporaryTree tree_;
+  LogLevel level_{0};
+};
+
+struct PlaceCase {
+  const char* name;
+  std::string text;
+  int line, column;
+  std::string message, source;  // the message's first line
+};
+
+class DefinitionPlace : public DefinitionCheck, public testing::WithParamInterface<PlaceCase> {};
+
+TEST_P(DefinitionPlace, PointsAtTheUnitThatWasFound) {
+  const CheckResult result = check(GetParam().text);
+  ASSERT_EQ(result.problems.size(), 1u);
+  const Problem& problem = result.problems[0];
+  EXPECT_EQ(problem.file, "a.xml");
+  EXPECT_EQ(problem.line, GetParam().line);
+  EXPECT_EQ(problem.column, GetParam().column);
+  EXPECT_EQ(problem.message.substr(0, problem.message.find('\n')), GetParam().message);
+  EXPECT_EQ(problem.source, GetParam().source);
+}
+
+const std::string kRest =
+    ": the rest of the file is not read (module, then classes, then associations)";
+
+INSTANTIATE_TEST_SUITE_P(
+    Table, DefinitionPlace,
+    testing::Values(
+        PlaceCase{"Tag", "<plugin>\n <module name='m'>\n  <class/>\n", 3, 3,
+                  "the end of module element missing before: class", "  <class/>"},
+        PlaceCase{"Text", "<plugin><module name='m'>\r\n\t text\r\n</module>", 2, 3,
+                  "the end of module element missing before: text", "\t text"},
+        PlaceCase{"FirstLine", "<plugin><module name='m'>x", 1, 26,
+                  "the end of module element missing before: x", "<plugin><module name='m'>x"},
+        PlaceCase{"Attribute",
+                  "<plugin><module name='m'><functioncall><function name='f' type='getI'/>\n"
+                  "<argument type='element'>\n<functioncall><function name='g'/><argument "
+                  "type='x'/>",
+                  3, 35, "invalid attribute: x",
+                  "<functioncall><function name='g'/><argument type='x'/>"},
+        PlaceCase{"MissingContent", kClass + "\n<instances/>\n</class>", 3, 1,
+                  "constant or functioncall elememt is missing in class element before: class",
+                  "</class>"},
+        PlaceCase{"EndOfFile", "<plugin><module name='m'>\n", 2, 1,
+                  "the end of module element missing before: ", ""},
+        PlaceCase{"NoPluginEnd", kModule + "\n", 2, 1, "the end of plugin element missing", ""},
+        PlaceCase{"NoDefinitionFile", "\n <?xml version='1.0'?>\n" + kModule, 2, 2,
+                  "not a definition file: it must begin with the plugin element",
+                  " <?xml version='1.0'?>"},
+        PlaceCase{"ClassAfterAssociation",
+                  kModule + "\n<association></association>\n<class name='C'/></plugin>", 3, 1,
+                  "unexpected class" + kRest, "<class name='C'/></plugin>"},
+        PlaceCase{"LongLine", kModule + std::string(300, ' ') + "x</plugin>", 1, 327,
+                  "unexpected x" + kRest, kModule + std::string(174, ' ')}),
+    kCaseName);
+
+TEST_F(DefinitionCheck, ListsWhatTheFilesServeAndLeavesNothingBehind) {
+  const CheckResult result =
+      definition::checkDefinitionFiles({"no.xml", DATA_FOLDER "/every_element.xml"});
+  ASSERT_EQ(result.problems.size(), 1u);
+  EXPECT_EQ(result.problems[0].file, "no.xml");
+  EXPECT_EQ(result.problems[0].line, 0);
+  EXPECT_EQ(result.problems[0].message, "No such file or directory");
+
+  std::string served;
+  for (const auto& one : result.served) {
+    served += one.nameSpace + ":" + one.className + (one.association ? " association" : "") +
+              (one.hasMethods ? " methods" : "") + "\n";
+  }
+  EXPECT_EQ(served,
+            "root/sample:Sample_Disk methods\n"
+            "root/sample:Sample_Part\n"
+            "root/sample:Sample_DiskPart association\n");
+  EXPECT_TRUE(registeredClasses().empty());
+  EXPECT_EQ(getModule("sample"), nullptr);
+  EXPECT_EQ(functionCount(), 0u);
+}
+
+}  // namespace

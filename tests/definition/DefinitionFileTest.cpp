@@ -1,0 +1,214 @@
+#include "definition/DefinitionFile.h"
+
+#include <gmock/gmock.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <filesystem>
+#include <string>
+#include <vector>
+
+#include "definition/DefinitionRegistry.h"
+#include "tests/definition/Reading.h"
+#include "tests/support/LogLevel.h"
+#include "tests/support/TemporaryTree.h"
+
+namespace {
+
+using testing::ElementsAre;
+
+class DefinitionFile : public Registered {
+ protected:
+  // Writes and reads a file; its entries in the log.
+  std::string reading(const std::string& text) {
+    TemporaryTree::write("definitions.xml", text);
+    return readingOf("definitions.xml");
+  }
+
+  std::string readingOf(const std::string& file) {
+    std::filesystem::remove(tree_.logs() / "CommonProvider.log");
+    EXPECT_EQ(readProviderDefXML(file), 0);
+    return tree_.log();
+  }
+
+  static std::vector<std::string> classes() {
+    std::vector<std::string> names;
+    for (const auto& one : registeredClasses()) names.push_back(one.getName());
+    return names;
+  }
+
+  TemporaryTree tree_;
+  LogLevel level_{1};
+};
+
+std::string classText(const std::string& name, int instances = 1) {
+  return "<class name='" + name + "'><instances><constant type='int'>" + std::to_string(instances) +
+         "</constant></instances></class>";
+}
+
+TEST_F(DefinitionFile, EveryElementIsReadAndRegistered) {
+  EXPECT_EQ(readingOf(DATA_FOLDER "/every_element.xml"), "");
+  ASSERT_NE(getModule("sample"), nullptr);
+  EXPECT_EQ(getModule("sample")->getPath(), 1);
+  EXPECT_EQ(getModule("sample")->getInit()->getDefFunction(), getFunction("startUp"));
+  EXPECT_EQ(getModule("/opt/sample/libparts.so")->getPath(), 0);
+
+  const struct {
+    const char *name, *module;
+    int type;
+  } functions[] = {{"startUp", "sample", 100},     {"diskCount", "sample", 100},
+                   {"diskName", "sample", 111},    {"renameDisk", "sample", 11},
+                   {"diskLabel", "sample", 113},   {"resetDisk", "resetter", 201},
+                   {"linkedParts", "linker", 131}, {"partName", "/opt/sample/libparts.so", 111}};
+  for (const auto& row : functions) {
+    const ProviderDefFunction* function = getFunction(row.name);
+    ASSERT_NE(function, nullptr) << row.name;
+    EXPECT_EQ(function->getModule(), getModule(row.module)) << row.name;
+    EXPECT_EQ(function->getType(), row.type) << row.name;
+  }
+  EXPECT_EQ(functionCount(), std::size(functions));
+
+  EXPECT_THAT(classes(), ElementsAre("Sample_Disk", "Sample_Part"));
+  const ProviderDefClass* disk = getProviderDefClass("SAMPLE_disk");
+  ASSERT_EQ(disk, &registeredClasses()[0]);
+  EXPECT_EQ(disk->getNamespace(), "root/sample");
+  EXPECT_EQ(disk->getProperties().size(), 4u);
+  EXPECT_TRUE(disk->getProperty("Status")->getGetValuemap());
+  EXPECT_EQ(disk->getProperty("Status")->getValue(3).getIntValue(), 2);
+  EXPECT_TRUE(disk->getProperty("Removable")->getValue(0).getBoolValue());
+  EXPECT_NE(disk->getMethod("Reset"), nullptr);
+  EXPECT_EQ(getProviderDefClass("Sample_Part")->getNumberOfInstances(), 4);
+
+  const ProviderDefAssociation* linked = getProviderDefAssociation("sample_diskpart");
+  ASSERT_NE(linked, nullptr);
+  EXPECT_EQ(linked->getClassNamePairs().size(), 3u);
+  EXPECT_EQ(linked->getConditions().size(), 3u);
+  EXPECT_THAT(linked->getClassProperties("Sample_Disk"), ElementsAre("DeviceID", "Label"));
+}
+
+TEST_F(DefinitionFile, AFileReadTwiceAddsItsClassesOnly) {
+  readingOf(DATA_FOLDER "/every_element.xml");
+  const ProviderDefClass* disk = getProviderDefClass("Sample_Disk");
+  const ProviderDefModule* module = getModule("sample");
+  const ProviderDefFunctionCall* init = module->getInit();
+  const size_t functions = functionCount();
+  EXPECT_EQ(readingOf(DATA_FOLDER "/every_element.xml"), "");
+  EXPECT_EQ(registeredClasses().size(), 4u);
+  EXPECT_EQ(registeredAssociations().size(), 2u);
+  EXPECT_EQ(getProviderDefClass("Sample_Disk"), disk);
+  EXPECT_EQ(getModule("sample"), module);
+  EXPECT_EQ(module->getInit(), init);
+  EXPECT_EQ(functionCount(), functions);
+}
+
+TEST_F(DefinitionFile, AModuleNamedAgainTakesOverTheInitialisationCallItLacks) {
+  const auto withInit = [](const std::string& function) {
+    return "<plugin><module name='m' path='short'><functioncall><function name='" + function +
+           "' type='getI'/></functioncall></module></plugin>";
+  };
+  reading("<plugin><module name='m'/>" + classText("A") + "</plugin>");
+  const ProviderDefModule* first = getModule("m");
+  EXPECT_FALSE(first->getNeedInit());
+  reading(withInit("start"));
+  EXPECT_EQ(getModule("m"), first);
+  EXPECT_EQ(first->getPath(), 0);
+  EXPECT_EQ(first->getInit()->getDefFunction(), getFunction("start"));
+  EXPECT_EQ(getFunction("start")->getModule(), first);
+  reading(withInit("other"));
+  EXPECT_EQ(first->getInit()->getDefFunction(), getFunction("start"));
+  EXPECT_EQ(getFunction("other")->getModule(), first);
+}
+
+TEST_F(DefinitionFile, TheFirstClassOfANameWins) {
+  reading(kModule + classText("Foo_Bar", 1) + classText("FOO_BAR", 2));
+  reading("<plugin><module name='n'/>" + classText("foo_bar", 3) + classText("Other", 4));
+  EXPECT_THAT(classes(), ElementsAre("Foo_Bar", "FOO_BAR", "foo_bar", "Other"));
+  EXPECT_EQ(getProviderDefClass("foo_BAR")->getNumberOfInstances(), 1);
+  EXPECT_EQ(getProviderDefClass("other")->getNumberOfInstances(), 4);
+  EXPECT_EQ(getProviderDefClass("Foo"), nullptr);
+  EXPECT_EQ(getProviderDefClass(""), nullptr);
+}
+
+TEST_F(DefinitionFile, ASyntaxErrorKeepsWhatStoodBefore) {
+  EXPECT_EQ(reading(kModule + classText("A") + classText("B") +
+                    "<class name='100%n'><property name='P'/></class>" + classText("D") +
+                    "<association name='E'></association></plugin>"),
+            "XML syntax error: instance elememt is missing in class element before: property\n"
+            "class:100%n\n\n");
+  EXPECT_THAT(classes(), ElementsAre("A", "B"));
+  EXPECT_NE(getModule("m"), nullptr);
+  EXPECT_TRUE(registeredAssociations().empty());
+  reading(kModule + classText("D"));
+  EXPECT_NE(getProviderDefClass("D"), nullptr);
+}
+
+struct EndCase {
+  const char* name;
+  std::string text;
+  std::vector<std::string> classes;
+  size_t associations;
+};
+
+class DefinitionFileEnd : public DefinitionFile, public testing::WithParamInterface<EndCase> {};
+
+TEST_P(DefinitionFileEnd, IsSilent) {
+  EXPECT_EQ(reading(GetParam().text), "");
+  EXPECT_EQ(classes(), GetParam().classes);
+  EXPECT_EQ(registeredAssociations().size(), GetParam().associations);
+}
+
+const std::string kAssociation = "<association name='L'></association>";
+
+INSTANTIATE_TEST_SUITE_P(
+    Order, DefinitionFileEnd,
+    testing::Values(
+        EndCase{"ClassAfterAssociation",
+                kModule + classText("A") + kAssociation + classText("B") + kAssociation,
+                {"A"},
+                1},
+        EndCase{"XmlDeclaration", "<?xml version='1.0'?>" + kModule + classText("A"), {}, 0},
+        EndCase{"NoPluginElement", classText("A") + kAssociation, {"A"}, 1},
+        EndCase{"ModuleWithoutPlugin", "<module name='m'/>" + classText("A"), {}, 0},
+        EndCase{"PluginInCapitals", "<Plugin>" + classText("A"), {}, 0},
+        EndCase{"NoModule", " \n<plugin a='b'>" + classText("A"), {"A"}, 0},
+        EndCase{"TextBetween", kModule + classText("A") + "and" + classText("B"), {"A"}, 0},
+        EndCase{"TrailingText", kModule + classText("A") + "</plugin><<class>junk='", {"A"}, 0},
+        EndCase{"NoEnd", kModule + classText("A"), {"A"}, 0},
+        EndCase{"TextOnly", "just text", {}, 0}),
+    kCaseName);
+
+TEST_F(DefinitionFile, FunctionsWithoutModuleFailWhenCalled) {
+  reading(
+      "<class name='A'><instances><functioncall><function name='f' type='getI'/>"
+      "</functioncall></instances></class>");
+  ASSERT_EQ(getProviderDefClass("A"), &registeredClasses()[0]);
+  EXPECT_EQ(getFunction("f")->getModule(), nullptr);
+}
+
+TEST_F(DefinitionFile, WhatCannotBeReadGivesOneLine) {
+  const std::string prefix = "Couldn't read definition file ";
+  EXPECT_EQ(readingOf("no%n.xml"), prefix + "no%n.xml: No such file or directory\n");
+  EXPECT_EQ(readingOf("."), prefix + ".: not a regular file\n");
+  EXPECT_EQ(reading(""), prefix + "definitions.xml: empty\n");
+  ASSERT_EQ(mkfifo("pipe.xml", 0600), 0);
+  EXPECT_EQ(readingOf("pipe.xml"), prefix + "pipe.xml: not a regular file\n");
+  TemporaryTree::write("big.xml", kModule);
+  ASSERT_EQ(truncate("big.xml", 65 << 20), 0);
+  EXPECT_EQ(readingOf("big.xml"), prefix + "big.xml: larger than 64 MiB\n");
+  EXPECT_EQ(getModule("m"), nullptr);
+}
+
+TEST_F(DefinitionFile, AnUnreadableFileGivesOneLine) {
+  TemporaryTree::write("secret.xml", kModule);
+  ASSERT_EQ(chmod("secret.xml", 0), 0);
+  // Root reads everything: look at the file as somebody else, who may still write the log.
+  const uid_t user = geteuid();
+  std::filesystem::permissions(tree_.root(), std::filesystem::perms{0755});
+  std::filesystem::permissions(tree_.logs(), std::filesystem::perms{0777});
+  if (user == 0 && seteuid(65534) != 0) GTEST_SKIP() << "cannot change the user";
+  const std::string log = readingOf("secret.xml");
+  ASSERT_EQ(seteuid(user), 0);
+  EXPECT_EQ(log, "Couldn't read definition file secret.xml: Permission denied\n");
+}
+
+}  // namespace

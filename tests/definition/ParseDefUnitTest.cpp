@@ -1,0 +1,170 @@
+#include "definition/ParseDefUnit.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <vector>
+
+#include "engine/ciEqual.h"
+#include "tests/definition/Reading.h"
+#include "tests/support/LogLevel.h"
+#include "tests/support/TemporaryTree.h"
+
+namespace {
+
+using namespace std::string_literals;
+
+// "tag" or "text", the flags, the name in brackets, the attributes, the length.
+std::string shown(const std::string& text) {
+  const ParseDefUnit unit(text.data(), static_cast<int>(text.size()));
+  std::string result = unit.getKind() == ParseDefUnit::kTag ? "tag" : "text";
+  if (unit.isStart()) result += " start";
+  if (unit.isEnd()) result += " end";
+  result += " [" + unit.getName() + "]";
+  for (const auto& [name, value] : unit.getAttributes()) result += " " + name + "=[" + value + "]";
+  return result + " " + std::to_string(unit.getLength());
+}
+
+struct UnitCase {
+  const char* name;
+  std::string text, shown;
+};
+
+class Unit : public testing::TestWithParam<UnitCase> {};
+
+TEST_P(Unit, IsCutFromTheText) {
+  EXPECT_EQ(shown(GetParam().text), GetParam().shown);
+  // Traced reading is a second build of the same states; no log file can be opened here.
+  const LogLevel level(9);
+  EXPECT_EQ(shown(GetParam().text), GetParam().shown);
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Tags, Unit,
+    testing::Values(UnitCase{"Start", "<plugin><b/>", "tag start [plugin] 8"},
+                    UnitCase{"Empty", "<module name='x'/>", "tag start end [module] name=[x] 18"},
+                    UnitCase{"EmptyWithoutAttribute", "<a/>", "tag start end [a] 4"},
+                    UnitCase{"EmptyWithBlanks", " \n<a / >", "tag start end [a] 8"},
+                    UnitCase{"Closing", "</module>", "tag end [module] 9"},
+                    UnitCase{"ClosingWithBlanks", "</ \t\nmodule >", "tag end [module] 13"},
+                    UnitCase{"ClosingWithAttribute", "</a b='c'>", "tag end [a] b=[c] 10"},
+                    UnitCase{"ClosingAndEmpty", "</a/>", "tag end [a] 5"},
+                    UnitCase{"BlankAfterOpen", "< a>", "tag start [a] 4"},
+                    UnitCase{"SlashInName", "<a/b c='d'>", "tag start end [a] 11"},
+                    UnitCase{"NoName", "</>", "tag end [] 3"},
+                    UnitCase{"TwoSlashes", "<//>", "tag end [] 4"},
+                    UnitCase{"NameBeginsWithGreater", "<>x>", "tag start [>x] 4"},
+                    UnitCase{"Declaration", "<?xml version=\"1.0\"?>",
+                             "tag start [?xml] version=[1.0] 21"},
+                    UnitCase{"Comment", "<!-- c --><a/>", "tag start [!--] 14"}),
+    kCaseName);
+
+INSTANTIATE_TEST_SUITE_P(
+    Attributes, Unit,
+    testing::Values(
+        UnitCase{"InOrderWithDuplicates", "<a b='1' c='2' b='3'>",
+                 "tag start [a] b=[1] c=[2] b=[3] 21"},
+        UnitCase{"NoBlankBetween", "<a b='1'c=\"2\"/>", "tag start end [a] b=[1] c=[2] 15"},
+        UnitCase{"OtherQuoteInside", "<a b='x\"y' c=\"x'y\">", "tag start [a] b=[x\"y] c=[x'y] 19"},
+        UnitCase{"TakenLiterally", "<a b=' <c/>=\n&lt; '>", "tag start [a] b=[ <c/>=\n&lt; ] 20"},
+        UnitCase{"EmptyValue", "<a b=''>", "tag start [a] b=[] 8"},
+        UnitCase{"BlanksAroundEquals", "<a b = 'c'>", "tag start [a] b=[c] 11"},
+        UnitCase{"JunkBeforeEquals", "<a b junk/>='c'>", "tag start [a] b=[c] 16"},
+        UnitCase{"UnquotedIsSkipped", "<a b=no c='d'>", "tag start [a] b=[d] 14"},
+        UnitCase{"UnquotedRunsOn", "<a b=1><c d='e'>", "tag start [a] b=[e] 16"},
+        UnitCase{"NameBeginsWithEquals", "<a =b='c'>", "tag start [a] =b=[c] 10"},
+        UnitCase{"NameWithGreater", "<a b>c='d'>", "tag start [a] b>c=[d] 11"}),
+    kCaseName);
+
+INSTANTIATE_TEST_SUITE_P(Texts, Unit,
+                         testing::Values(UnitCase{"Trimmed", "  hello world  <a>",
+                                                  "text [hello world] 15"},
+                                         UnitCase{"NoEntities", "a&lt;b]]><", "text [a&lt;b]]>] 9"},
+                                         UnitCase{"WideWhiteSpace",
+                                                  "\0\x7F\xA0 a\xFF"
+                                                  "b \x80\xFF<"s,
+                                                  "text [a\xFF"
+                                                  "b] 10"},
+                                         UnitCase{"WhiteSpaceInTag",
+                                                  "\x85<\0a\x9F"
+                                                  "b\0=\xFF'\xA0'\x01>"s,
+                                                  "tag start [a] b=[\xA0] 14"},
+                                         UnitCase{"NulInside", "a\0b<"s, "text [a\0b] 3"s}),
+                         kCaseName);
+
+// Cut off in each state: what was collected is kept, all characters count.
+INSTANTIATE_TEST_SUITE_P(
+    CutOff, Unit,
+    testing::Values(UnitCase{"Nothing", "", "text [] 0"}, UnitCase{"Before", "  ", "text [] 2"},
+                    UnitCase{"InText", " a b ", "text [a b] 5"},
+                    UnitCase{"AfterOpen", "< ", "tag [] 2"},
+                    UnitCase{"AfterClosingSlash", "</ ", "tag end [] 3"},
+                    UnitCase{"InName", "<mod", "tag start [mod] 4"},
+                    UnitCase{"BetweenAttributes", "<m a='1' ", "tag start [m] a=[1] 9"},
+                    UnitCase{"InAttribute", "<m a='1' at", "tag start [m] a=[1] 11"},
+                    UnitCase{"AfterAttribute", "<m at ", "tag start [m] 6"},
+                    UnitCase{"AfterEquals", "<m at=v", "tag start [m] 7"},
+                    UnitCase{"InDoubleQuotes", "<m at=\"v'>", "tag start [m] 10"},
+                    UnitCase{"InSingleQuotes", "<m at='v\">", "tag start [m] 10"},
+                    UnitCase{"AfterSlash", "<m/ ", "tag start end [m] 4"}),
+    kCaseName);
+
+TEST(Unit, OfANegativeLengthIsEmpty) {
+  const ParseDefUnit unit("<a/>", -1);
+  EXPECT_EQ(unit.getKind(), ParseDefUnit::kText);
+  EXPECT_EQ(unit.getLength(), 0);
+}
+
+TEST(IsSpace, HoldsForThreeRangesOfBytes) {
+  std::vector<std::pair<int, int>> ranges;
+  for (int c = 0; c < 256; ++c) {
+    if (!isSpace(static_cast<unsigned char>(c))) continue;
+    if (ranges.empty() || ranges.back().second != c - 1) ranges.emplace_back(c, c);
+    ranges.back().second = c;
+  }
+  EXPECT_EQ(ranges, (std::vector<std::pair<int, int>>{{0, 0x20}, {0x7F, 0xA0}, {0xFF, 0xFF}}));
+}
+
+TEST(CiEqual, IgnoresTheCaseOfLettersOnly) {
+  EXPECT_TRUE(ci_equal("", ""));
+  EXPECT_TRUE(ci_equal("Demo_DISK1", "dEMO_disk1"));
+  EXPECT_FALSE(ci_equal("a", "ab"));
+  EXPECT_FALSE(ci_equal("[", "{"));  // they differ in the bit that letters differ in
+  EXPECT_FALSE(ci_equal("a\0b"s, "a\0c"s));
+}
+
+TEST(Trace, NotesEveryCharacterBeforeItIsHandled) {
+  const TemporaryTree tree;
+  const LogLevel level(9);
+  shown("<a b='c'/>");
+  shown(" x <b>");
+  EXPECT_EQ(tree.log(),
+            "Enter ParseDefUnit length=10\n"
+            "state 0, char <\n"
+            "state 2, char a\n"
+            "state 3, char  \n"
+            "element a\n"
+            "state 4, char b\n"
+            "state 5, char =\n"
+            "state 7, char '\n"
+            "state 9, char c\n"
+            "state 9, char '\n"
+            "Attribute: b=c\n"
+            "state 4, char /\n"
+            "state 10, char >\n"
+            "Enter ParseDefUnit length=6\n"
+            "state 0, char  \n"
+            "state 0, char x\n"
+            "state 1, char  \n"
+            "state 1, char <\n"
+            "CDATA x\n");
+}
+
+TEST(Trace, StaysAwayBelowLevelNine) {
+  const TemporaryTree tree;
+  const LogLevel level(8);
+  shown("<a b='c'/>");
+  EXPECT_EQ(tree.log(), "");
+}
+
+}  // namespace
