@@ -1,0 +1,217 @@
+#include "association/ProviderDefAssociation.h"
+
+#include <gmock/gmock.h>
+
+#include <string>
+#include <vector>
+
+#include "definition/DefinitionRegistry.h"
+#include "tests/definition/Reading.h"
+#include "tests/support/StdoutCapture.h"
+
+namespace {
+
+using testing::ElementsAre;
+using testing::IsEmpty;
+using Values = ProviderDefAssociation::Values;
+
+std::string group(const std::string& first, const std::string& second, const std::string& content) {
+  return "<classname name='" + first + "'/><classname name='" + second + "'/><condition>" +
+         content + "</condition>";
+}
+
+std::string association(const std::string& name, const std::string& groups) {
+  return "<association name='" + name + "'>" + groups + "</association>";
+}
+
+std::string classText(const std::string& name, int instances) {
+  return "<class name='" + name + "'><instances><constant type='int'>" + std::to_string(instances) +
+         "</constant></instances></class>";
+}
+
+// Property 0 of the first class equals property 0, or 1, of the second.
+const std::string kSame = "<equal>0 0</equal>";
+const std::string kSameAsNext = "<equal>0 1</equal>";
+
+struct LinkCase {
+  const char* name;
+  std::string groups;
+  const char *source, *target;
+  int index;
+  Values sourceValues;
+  std::vector<Values> targetValues;
+  std::vector<int> linked;
+};
+
+class Link : public Registered, public testing::WithParamInterface<LinkCase> {};
+
+// Two has two instances, None has none and Broken a negative number; other classes are unknown.
+TEST_P(Link, GivesTheTargetsByIndex) {
+  const LinkCase& c = GetParam();
+  ASSERT_EQ(errorOfReading(kModule + classText("Two", 2) + classText("None", 0) +
+                           classText("Broken", -5)),
+            "");
+  const auto built = element<ProviderDefAssociation>(association("A", c.groups));
+  const StdoutCapture quiet;
+  EXPECT_EQ(built.getAssociation(c.source, c.index, c.sourceValues, c.target, c.targetValues),
+            c.linked);
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Orientation, Link,
+    testing::Values(
+        LinkCase{"NoPair", group("A", "B", "<true/>"), "A", "C", 0, {}, {{}}, {}},
+        LinkCase{"SameClassTwiceIsNoPair", group("A", "B", "<true/>"), "A", "A", 0, {}, {{}}, {}},
+        LinkCase{"Forward",
+                 group("A", "B", kSameAsNext),
+                 "a",
+                 "b",
+                 0,
+                 {"x", "y"},
+                 {{"x", "y"}, {"y", "x"}, {"z", "x"}},
+                 {1, 2}},
+        // The pair's first class stays side 1: it is the target here.
+        LinkCase{"Reverse",
+                 group("B", "A", kSameAsNext),
+                 "A",
+                 "B",
+                 0,
+                 {"x", "y"},
+                 {{"x", "y"}, {"y", "x"}, {"y", "y"}},
+                 {1, 2}},
+        LinkCase{"EqualNamesAreForward",
+                 group("A", "a", kSameAsNext),
+                 "A",
+                 "A",
+                 0,
+                 {"x", "y"},
+                 {{"x", "y"}, {"y", "x"}},
+                 {1}},
+        // By pair first, then by index; nothing is sorted or made unique.
+        LinkCase{"TwoPairs",
+                 group("A", "B", kSame) + group("B", "A", "<true/>"),
+                 "A",
+                 "B",
+                 0,
+                 {5},
+                 {{4}, {5}},
+                 {1, 0, 1}},
+        LinkCase{
+            "OtherPairsAreLeftOut",
+            group("A", "C", "<true/>") + group("A", "B", "<false/>") + group("A", "B", "<true/>"),
+            "A",
+            "B",
+            0,
+            {},
+            {{}},
+            {0}},
+        LinkCase{"NoGroup", "", "A", "B", 0, {}, {{}}, {}}),
+    kCaseName);
+
+INSTANTIATE_TEST_SUITE_P(
+    Count, Link,
+    testing::Values(
+        LinkCase{"UnknownTargetCountsItsValues",
+                 group("A", "B", "<true/>"),
+                 "A",
+                 "B",
+                 0,
+                 {},
+                 {{}, {}, {}},
+                 {0, 1, 2}},
+        LinkCase{"KnownTargetCountsItself",
+                 group("A", "Two", "<true/>"),
+                 "A",
+                 "two",
+                 0,
+                 {},
+                 {{}, {}, {}},
+                 {0, 1}},
+        LinkCase{"MissingValuesAreEmpty",
+                 group("A", "Two", "<equal>0 0</equal>"),
+                 "A",
+                 "Two",
+                 0,
+                 {0},
+                 {{7}},
+                 {1}},
+        LinkCase{"NoInstances", group("A", "None", "<true/>"), "A", "None", 0, {}, {{}}, {}},
+        LinkCase{
+            "NegativeNumber", group("A", "Broken", "<true/>"), "A", "Broken", 0, {}, {{}}, {}}),
+    kCaseName);
+
+class Associations : public Registered {};
+
+TEST_F(Associations, TheWholeTraceGoesToStandardOutput) {
+  const auto built = element<ProviderDefAssociation>(association(
+      "A", group("X", "Y", "<true/>") + group("A", "B", "<false/>") + group("B", "A", "<true/>")));
+  StdoutCapture captured;
+  built.getAssociation("A", 7, {}, "B", {{}, {}});
+  EXPECT_EQ(captured.text(),
+            "ProviderDefAssociation::getAssociation Entry\n"
+            "pairs 1, numinst 2, numcond 3\n"
+            "ProviderDefCondition::getValue( 7, 0) type = 6 \n"
+            "ProviderDefCondition::getValue( 7, 1) type = 6 \n"
+            "pairs 2, numinst 2, numcond 3\n"
+            "ProviderDefCondition::getValue( 0, 7) type = 5 \n"
+            "putting associated index : 0\n"
+            "ProviderDefCondition::getValue( 1, 7) type = 5 \n"
+            "putting associated index : 1\n"
+            "ProviderDefAssociation::getAssociation Exit. Number of results is 2 \n");
+}
+
+TEST_F(Associations, TheOtherClassIsThatOfTheFirstPairWithTheName) {
+  const auto built = element<ProviderDefAssociation>(association(
+      "A", group("X", "Y", "<true/>") + group("Z", "X", "<true/>") + group("S", "S", "<true/>")));
+  EXPECT_EQ(built.getPair("x"), "Y");
+  EXPECT_EQ(built.getPair("Y"), "X");
+  EXPECT_EQ(built.getPair("z"), "X");
+  EXPECT_EQ(built.getPair("s"), "S");
+  EXPECT_EQ(built.getPair("Q"), "");
+  EXPECT_EQ(built.getPair(""), "");
+}
+
+TEST_F(Associations, ClassPropertiesAreThoseOfTheFirstEntry) {
+  const auto built = element<ProviderDefAssociation>(
+      "<association><classname name='X'/><classname name='Y'><propertyname name='p'/>"
+      "<propertyname name='q'/></classname><condition><true/></condition>"
+      "<classname name='x'><propertyname name='r'/></classname><classname name='y'/>"
+      "<condition><true/></condition></association>");
+  EXPECT_THAT(built.getClassProperties("x"), IsEmpty());
+  EXPECT_THAT(built.getClassProperties("y"), ElementsAre("p", "q"));
+  EXPECT_THAT(built.getClassProperties(""), IsEmpty());
+}
+
+TEST_F(Associations, AreFoundByNameAndByTheClassesOfEachPair) {
+  ASSERT_EQ(
+      errorOfReading(kModule +
+                     association("One", group("A", "B", "<true/>") + group("B", "a", "<true/>") +
+                                            group("C", "C", "<true/>")) +
+                     association("Two", group("B", "D", "<true/>")) +
+                     association("ONE", group("A", "D", "<true/>"))),
+      "");
+  const auto* all = &registeredAssociations();
+  EXPECT_EQ(getProviderDefAssociation("one"), &(*all)[0]);
+  EXPECT_EQ(getProviderDefAssociation("TWO"), &(*all)[1]);
+  EXPECT_EQ(getProviderDefAssociation("Three"), nullptr);
+  EXPECT_EQ(getProviderDefAssociation(""), nullptr);
+
+  const struct {
+    const char *name, *class1, *class2;
+    std::vector<int> found;  // positions in the registry, once for each pair that matches
+  } cases[] = {
+      {"", "", "", {0, 0, 0, 1, 2}}, {"", "A", "", {0, 0, 2}}, {"", "", "a", {0, 0, 2}},
+      {"", "B", "", {0, 0, 1}},      {"one", "B", "", {0, 0}}, {"", "D", "A", {2}},
+      {"", "a", "d", {2}},           {"", "C", "C", {0}},      {"", "C", "", {0}},
+      {"One", "", "", {0, 0, 0, 2}}, {"Two", "A", "", {}},     {"", "B", "B", {}},
+      {"None", "", "", {}},
+  };
+  for (const auto& c : cases) {
+    std::vector<const ProviderDefAssociation*> expected;
+    for (const int position : c.found) expected.push_back(&(*all)[static_cast<size_t>(position)]);
+    EXPECT_EQ(getProviderDefAssociation(c.name, c.class1, c.class2), expected)
+        << c.name << " " << c.class1 << " " << c.class2;
+  }
+}
+
+}  // namespace
