@@ -1,0 +1,249 @@
+// Which operation a call's arguments choose, and the properties, methods and classes on top of it.
+
+#include "engine/ProviderDefClass.h"
+#include "tests/engine/RecorderTest.h"
+#include "tests/support/LogLevel.h"
+
+using namespace std::string_literals;
+
+namespace {
+
+const char kIndex[] = "<argument type=\"index\"/>";
+const char kInput[] = "<argument type=\"input\"/>";
+const char kOutput[] = "<argument type=\"output\"/>";
+
+std::string element(const std::string& content) {
+  return "<argument type=\"element\">" + content + "</argument>";
+}
+
+const std::string kText = element("<constant type=\"string\">seven</constant>");
+const std::string kNumber = element("<constant type=\"int\">9</constant>");
+const std::string kQuery = element("<cimproperty>any</cimproperty>");
+
+// The index of all calls here is 4. Packed items:
+const std::string kFour = "\0\0\0\0\4\0\0\0"s;
+const std::string kNine = "\0\0\0\0\x09\0\0\0"s;
+const std::string kSeven = "\1\0\0\0\5\0\0\0seven\0"s;
+const std::string kNotSupported = "\1\0\0\0\x0d\0\0\0Not Supported\0"s;
+
+struct Case {
+  const char* type;
+  std::string arguments;
+  const char* result;  // Of a call that reaches the plug-in, and of one that does not.
+  bool called;
+  int number = 0;
+  const char* word = "";
+  std::string extra = "";
+};
+
+class FunctionCall : public RecorderTest {
+ protected:
+  FunctionCall() {
+    recorder_->result = 11;
+    recorder_->longResult = 12;
+    answer("\x63");
+  }
+
+  static ProviderDefFunctionCall call(const std::string& type, const std::string& arguments) {
+    return fromText<ProviderDefFunctionCall>(callText("alltypes", type, type, arguments));
+  }
+
+  static std::string text(const ProviderDefValue& value) { return valueText(value); }
+
+  template <class Run, size_t size>
+  void expectEach(const Case (&cases)[size], Run run) {
+    for (const Case& c : cases) {
+      SCOPED_TRACE(c.type + (" " + c.arguments));
+      recorder_->calls = recorder_->number = 0;
+      recorder_->word[0] = '\0';
+      std::memset(recorder_->extra, 0, sizeof recorder_->extra);
+      EXPECT_EQ(text(run(call(c.type, c.arguments))), c.result);
+      EXPECT_EQ(recorder_->calls, c.called ? 1 : 0);
+      if (c.called) {
+        EXPECT_EQ(recorder_->function, std::string(c.type));
+      }
+      EXPECT_EQ(recorder_->number, c.number);
+      EXPECT_STREQ(recorder_->word, c.word);
+      EXPECT_EQ(trimmed(recorder_->extra), trimmed(c.extra));
+    }
+  }
+};
+
+}  // namespace
+
+TEST_F(FunctionCall, GetValue) {
+  const Case cases[] = {
+      {"getI", "", "0 11", true},
+      {"getIi", "", "0 0", false},
+      {"getIi", kIndex, "0 11", true, 4},
+      {"getIw", kIndex, "0 0", false},
+      {"getLi", kNumber, "6 12", true, 9},
+      {"getIw", kText, "0 11", true, 0, "seven"},
+      {"getIi", kQuery, "0 11", true, 0},
+      {"getI", kInput, "1 Not Supported", false},
+      {"getI", kOutput, "0 0", false},
+      {"getIv", kIndex + kText, "0 11", true, 0, "", kFour + kSeven},
+      {"getIv", kText + kOutput + kIndex + kNumber, "0 11", true, 0, "", kSeven + kFour + kNine},
+      {"getIv", kInput + std::string(kIndex), "0 11", true, 0, "", kNotSupported + kFour},
+      {"getIv", kOutput + std::string(kOutput), "0 11", true},
+      {"getIi", kIndex + kText, "0 0", false},
+      {"setI", "", "0 0", false},
+  };
+  expectEach(cases, [](const ProviderDefFunctionCall& call) { return call.getValue(4); });
+}
+
+TEST_F(FunctionCall, GetValueWithoutIndexIgnoresTheArguments) {
+  EXPECT_EQ(call("getI", "").getValue(), 11);
+  EXPECT_EQ(call("getI", kIndex).getValue(), 11);
+  EXPECT_EQ(call("getL", "").getValue(), 0) << "the integer field of a long";
+  EXPECT_EQ(call("getIi", kIndex).getValue(), 0);
+}
+
+TEST_F(FunctionCall, SetValue) {
+  const Case cases[] = {
+      {"setI", "", "0 11", true},
+      {"setIi", "", "0 0", false},
+      {"setIi", kIndex, "0 11", true, 4},
+      {"setSi", kNumber, "0 11", true, 9},
+      {"setIw", kText, "0 11", true, 0, "seven"},
+      {"setIi", kInput, "0 0", false},
+      {"setIi", kOutput, "0 0", false},
+      {"setIv", kIndex + kText, "0 11", true, 0, "", kFour + kSeven},
+      {"setIv", kInput + kNumber + kOutput, "0 11", true, 0, "", kNotSupported + kNine},
+      {"setIi", kIndex + kText, "0 0", false},
+      {"getI", "", "0 0", false},
+  };
+  expectEach(cases, [](const ProviderDefFunctionCall& call) { return call.setValue(-8, 4); });
+  EXPECT_EQ(recorder_->value, -8);
+}
+
+TEST_F(FunctionCall, Exec) {
+  const std::string in = kInput, out = kOutput, index = kIndex;
+  const Case cases[] = {
+      {"execA", "", "0 11", true},
+      {"execB", "", "0 99", false},
+      {"execAi", index, "0 11", true, 4},
+      {"execAw", kText, "0 11", true, 0, "seven"},
+      {"execAw", index, "0 99", false},
+      {"execB", in, "0 11", true},
+      {"execC", in, "0 99", false},
+      {"execC", out, "0 11", true},
+      {"execC", in + out, "0 11", true},
+      {"execC", out + in, "0 11", true},
+      {"execB", in + in, "0 0", false},
+      {"execC", out + out, "0 0", false},
+      {"execBi", in + index, "0 11", true, 4},
+      {"execBw", kText + in, "0 11", true, 0, "seven"},
+      {"execB", in + index, "0 11", true},
+      {"execBi", in + kText, "0 99", false},
+      {"execCi", in + out + index, "0 11", true, 4},
+      {"execCi", out + index, "0 11", true, 4},
+      {"execCi", in + index, "0 99", false},
+      {"execBi", in + out + index, "0 99", false},
+      {"execB", index + index, "0 0", false},
+      {"execC", in + index + out + kText, "0 0", false},
+  };
+  const Values inputs{7};
+  Values outputs;
+  expectEach(cases, [&](const ProviderDefFunctionCall& call) {
+    return ProviderDefValue(call.exec(inputs, outputs, 4));
+  });
+  EXPECT_TRUE(outputs.empty());
+}
+
+TEST_F(FunctionCall, ExecHandsInputsInAndOutputsOut) {
+  answer("\0\0\0\0\5\0\0\0\x63"s);
+  Values outputs{1};
+  EXPECT_EQ(call("execCi", std::string(kIndex) + kInput + kOutput).exec(Values{9}, outputs, 4), 11);
+  EXPECT_EQ(trimmed(recorder_->in), kNine + "\x63");
+  EXPECT_EQ(valueText(outputs), "0 1; 0 5; ");
+}
+
+TEST_F(FunctionCall, NestedCallsAreEvaluatedFirstWithTheSameIndex) {
+  answer("\2\0\0\0\1\0\0\0????\7\0\0\0"s);
+  const std::string inner = callText("alltypes", "getAIi", "getAIi", kIndex);
+  EXPECT_EQ(text(call("getIv", element(inner)).getValue(4)), "0 11");
+  EXPECT_EQ(recorder_->calls, 2);
+  EXPECT_EQ(recorder_->number, 4);
+  EXPECT_EQ(trimmed(recorder_->extra), "\2\0\0\0\1\0\0\0\0\0\0\0\7"s);
+
+  const std::string deep = callText("alltypes", "getIi", "getIi",
+                                    element(callText("alltypes", "getIi", "getIi", kIndex)));
+  EXPECT_EQ(text(call("getLi", element(deep)).getValue(4)), "6 12");
+  EXPECT_EQ(recorder_->calls, 5);
+  EXPECT_EQ(recorder_->number, 11);
+}
+
+TEST_F(FunctionCall, ACopyIsIndependent) {
+  auto original = std::make_unique<ProviderDefFunctionCall>(
+      call("getIi", element(callText("alltypes", "getIi", "getIi", kNumber))));
+  const ProviderDefFunctionCall copy = *original;
+  original.reset();
+  EXPECT_EQ(text(copy.getValue(4)), "0 11");
+  EXPECT_EQ(recorder_->calls, 2);
+}
+
+TEST_F(FunctionCall, ErrorsPassThrough) {
+  const auto missing = fromText<ProviderDefFunctionCall>(callText("alltypes", "missing", "getI"));
+  Values outputs;
+  const std::string message = "Couldn't load function missing";
+  EXPECT_EQ(errorOf([&] { missing.getValue(0); }), message);
+  EXPECT_EQ(errorOf([&] { missing.getValue(); }), message);
+  EXPECT_EQ(errorOf([&] { missing.setValue(1, 0); }), message);
+  EXPECT_EQ(errorOf([&] { missing.exec({}, outputs, 0); }), message);
+  EXPECT_EQ(errorOf([] { ProviderDefFunctionCall().getValue(0); }), "Couldn't load function ");
+}
+
+TEST_F(FunctionCall, PropertiesUseTheirSidesOrConstants) {
+  const auto property = [](const std::string& get, const std::string& set) {
+    return fromText<ProviderDefProperty>("<property name=\"P\"><get>" + get + "</get>" + set +
+                                         "</property>");
+  };
+  const std::string constant = "<constant type=\"string\">fixed</constant>";
+  const auto fixed = property(constant, "");
+  EXPECT_EQ(text(fixed.getValue(0)), "1 fixed");
+  EXPECT_EQ(text(fixed.getValue(1)), "1 fixed");
+  EXPECT_EQ(fixed.setValue(5, 0), 0);
+  EXPECT_EQ(property(constant, "<set>" + constant + "</set>").setValue(5, 0), 0);
+  EXPECT_EQ(recorder_->calls, 0);
+
+  const auto called = property(callText("alltypes", "getIi", "getIi", kIndex),
+                               "<set>" + callText("alltypes", "setIi", "setIi", kIndex) + "</set>");
+  EXPECT_EQ(text(called.getValue(3)), "0 11");
+  EXPECT_EQ(recorder_->number, 3);
+  EXPECT_EQ(called.setValue(5, 2), 11);
+  EXPECT_EQ(recorder_->value, 5);
+  EXPECT_EQ(recorder_->number, 2);
+}
+
+TEST_F(FunctionCall, ClassesCountAndFindByExactName) {
+  const auto definition = [](const std::string& instances) {
+    return fromText<ProviderDefClass>(
+        "<class name=\"C\" namespace=\"root\"><instances>" + instances +
+        "</instances>"
+        "<property name=\"P\"><get><constant type=\"int\">1</constant></get></property>"
+        "<property name=\"P\"><get><constant type=\"int\">2</constant></get></property>"
+        "<method name=\"M\">" +
+        callText("alltypes", "execBi", "execBi", kIndex + std::string(kInput)) +
+        "</method></class>");
+  };
+  EXPECT_EQ(definition("<constant type=\"int\">3</constant>").getNumberOfInstances(), 3);
+  const auto counted = definition(callText("alltypes", "getI", "getI"));
+  for (const int count : {0, 5, -1, kMaxInstances, kMaxInstances + 1}) {
+    recorder_->result = count;
+    EXPECT_EQ(counted.getNumberOfInstances(), count);
+    EXPECT_EQ(boundedNumberOfInstances(counted), std::min(count, 1000000));
+  }
+
+  ASSERT_NE(counted.getProperty("P"), nullptr);
+  EXPECT_EQ(text(counted.getProperty("P")->getValue(0)), "0 1");
+  ASSERT_NE(counted.getMethod("M"), nullptr);
+  Values outputs;
+  recorder_->result = 6;
+  EXPECT_EQ(counted.getMethod("M")->exec(Values{9}, outputs, 4), 6);
+  EXPECT_EQ(recorder_->number, 4);
+  for (const char* name : {"", "p", "m", "PP"}) {
+    EXPECT_EQ(counted.getProperty(name), nullptr) << name;
+    EXPECT_EQ(counted.getMethod(name), nullptr) << name;
+  }
+}

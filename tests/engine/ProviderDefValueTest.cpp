@@ -1,0 +1,170 @@
+#include "engine/ProviderDefValue.h"
+
+#include "tests/engine/ValueText.h"
+#include "tests/support/LogLevel.h"
+#include "tests/support/StdoutCapture.h"
+#include "tests/support/TemporaryTree.h"
+
+#include <gtest/gtest.h>
+
+#include <climits>
+
+namespace {
+
+ProviderDefValue indexString(const char* text) {
+  ProviderDefValue value(text);
+  value.setIndexStringType();
+  return value;
+}
+
+const char kEqualTrace[] = "ProviderDefValue::equal(ProviderDefValue value)";
+
+}  // namespace
+
+TEST(ProviderDefValue, EachConstructorSetsItsTypeAndItsFieldAlone) {
+  struct Case {
+    ProviderDefValue value;
+    int type, number;
+    long longNumber;
+    bool truth;
+    const char* text;
+    Ints numbers;
+    Texts texts;
+  };
+  const Case cases[] = {
+      {ProviderDefValue(), 0, 0, 0, false, "", {}, {}},
+      {INT_MIN, 0, INT_MIN, INT_MIN, false, "", {}, {}},
+      {LONG_MAX, 6, 0, LONG_MAX, false, "", {}, {}},
+      {true, 5, 0, 0, true, "", {}, {}},
+      {"a", 1, 0, 0, false, "a", {}, {}},
+      {std::string("b"), 1, 0, 0, false, "b", {}, {}},
+      {Ints{3, 4}, 2, 0, 0, false, "", {3, 4}, {}},
+      {Texts{"c", ""}, 3, 0, 0, false, "", {}, {"c", ""}},
+      {indexString("d"), 4, 0, 0, false, "d", {}, {}},
+  };
+  for (const Case& c : cases) {
+    SCOPED_TRACE(valueText(c.value));
+    EXPECT_EQ(c.value.getType(), c.type);
+    EXPECT_EQ(c.value.getIntValue(), c.number);
+    EXPECT_EQ(c.value.getLongValue(), c.longNumber);
+    EXPECT_EQ(c.value.getBoolValue(), c.truth);
+    EXPECT_EQ(c.value.getStringValue(), c.text);
+    EXPECT_EQ(c.value.getIntArray(), c.numbers);
+    EXPECT_EQ(c.value.getStringArray(), c.texts);
+  }
+}
+
+TEST(ProviderDefValue, CopiesShareNothing) {
+  for (const ProviderDefValue& original : oneOfEachType()) {
+    ProviderDefValue copy = original;
+    ProviderDefValue assigned;
+    assigned = copy;
+    copy = ProviderDefValue(Texts{"other"});
+    EXPECT_EQ(valueText(assigned), valueText(original));
+  }
+}
+
+TEST(ProviderDefValue, StringConstructorAloneIsLogged) {
+  const TemporaryTree tree;
+  const LogLevel level(9);
+  const Values values{1, 2L, true, Ints{3}};
+  EXPECT_EQ(tree.log(), "");
+  const ProviderDefValue text(std::string("%s"));
+  EXPECT_EQ(tree.log(), "ProviderDefValue Constructor (string)\n");
+}
+
+TEST(ProviderDefValue, Equal) {
+  struct Case {
+    ProviderDefValue a, b;
+    bool equal;
+    std::string strings;  // What the trace says of two strings.
+  };
+  const Case cases[] = {
+      {5, 5, true, ""},
+      {5, 6, false, ""},
+      {5, 5L, false, ""},
+      {5L, 5L, false, ""},
+      {true, true, false, ""},
+      {indexString("a"), indexString("a"), false, ""},
+      {indexString("a"), "a", false, ""},
+      {"abc", "abc", true, "Comparing strings: abc, abc\n"},
+      {"abc", "ABC", false, "Comparing strings: abc, ABC\n"},
+      {"", "%n%s", false, "Comparing strings: , %n%s\n"},
+      {std::string("a\0b", 3), std::string("a\0c", 3), false, "Comparing strings: a, a\n"},
+      {"1", 1, false, ""},
+      {Ints{}, Ints{}, true, ""},
+      {Ints{1, 2}, Ints{1, 2}, true, ""},
+      {Ints{1, 2}, Ints{2, 1}, false, ""},
+      {Ints{1}, Ints{1, 2}, false, ""},
+      {Ints{}, Texts{}, false, ""},
+      {Texts{"a", "b"}, Texts{"a", "b"}, true, ""},
+      {Texts{"a", "b"}, Texts{"a", "B"}, false, ""},
+      {Texts{"a"}, Texts{"a", "a"}, false, ""},
+  };
+  for (const Case& c : cases) {
+    StdoutCapture out;
+    const bool equal = c.a.equal(c.b);
+    const std::string trace = out.text();
+    SCOPED_TRACE(valueText(Values{c.a, c.b}));
+    EXPECT_EQ(equal, c.equal);
+    EXPECT_EQ(trace, kEqualTrace + c.strings);
+  }
+}
+
+struct PartOfCase {
+  ProviderDefValue part, whole;
+  bool expected;
+};
+
+class PartOf : public testing::TestWithParam<PartOfCase> {};
+
+// include() is the mirror of partof(), row by row; neither writes a trace.
+TEST_P(PartOf, AndInclude) {
+  const auto& [part, whole, expected] = GetParam();
+  StdoutCapture out;
+  const bool isPart = part.partof(whole);
+  const bool includes = whole.include(part);
+  EXPECT_EQ(out.text(), "");
+  EXPECT_EQ(isPart, expected);
+  EXPECT_EQ(includes, expected);
+}
+
+// Two strings: true unless the first match is at position 0.
+INSTANTIATE_TEST_SUITE_P(
+    Strings, PartOf,
+    testing::Values(PartOfCase{"abc", "xabc", true}, PartOfCase{"abc", "abcd", false},
+                    PartOfCase{"abc", "abcabc", false}, PartOfCase{"abc", "zzz", true},
+                    PartOfCase{"abc", "ABCabc", true}, PartOfCase{"abc", "", true},
+                    PartOfCase{"", "zzz", false}, PartOfCase{"", "", false}));
+
+INSTANTIATE_TEST_SUITE_P(
+    Integers, PartOf,
+    testing::Values(PartOfCase{2, Ints{1, 2}, true}, PartOfCase{3, Ints{1, 2}, false},
+                    PartOfCase{0, Ints{}, false}, PartOfCase{Ints{1, 1, 2}, Ints{2, 1}, true},
+                    PartOfCase{Ints{1, 3}, Ints{2, 1}, false}, PartOfCase{Ints{}, Ints{}, true},
+                    PartOfCase{Ints{}, Ints{1}, true}, PartOfCase{Ints{3}, Ints{}, false}));
+
+// A string array is never part of a string array; an integer array always is.
+INSTANTIATE_TEST_SUITE_P(
+    Texts, PartOf,
+    testing::Values(PartOfCase{"b", Texts{"a", "b"}, true}, PartOfCase{"B", Texts{"a", "b"}, false},
+                    PartOfCase{"", Texts{"ab"}, false}, PartOfCase{"", Texts{""}, true},
+                    PartOfCase{Ints{1}, Texts{"1"}, true}, PartOfCase{Ints{1}, Texts{}, true},
+                    PartOfCase{Texts{"a"}, Texts{"a"}, false},
+                    PartOfCase{Texts{}, Texts{}, false}));
+
+TEST(PartOf, IsFalseForEveryOtherPairOfTypes) {
+  const bool decidedByContent[7][7] = {
+      // whole: 0, 1, 2, 3, 4, 5, 6
+      {false, false, true, false},  // part: integer
+      {false, true, false, true},   // string
+      {false, false, true, true},   // integer array
+  };
+  for (const ProviderDefValue& part : oneOfEachType()) {
+    for (const ProviderDefValue& whole : oneOfEachType()) {
+      if (decidedByContent[part.getType()][whole.getType()]) continue;
+      EXPECT_FALSE(part.partof(whole)) << valueText(Values{part, whole});
+      EXPECT_FALSE(whole.include(part)) << valueText(Values{part, whole});
+    }
+  }
+}

@@ -1,0 +1,71 @@
+#include "engine/Registry.h"
+
+#include "tests/engine/PluginTest.h"
+#include "tests/support/LogLevel.h"
+#include "tests/support/StdoutCapture.h"
+
+class Registry : public PluginTest {};
+
+TEST_F(Registry, FindsTheFirstOfExactlyTheName) {
+  ProviderDefModule* first = registerModule(std::make_unique<ProviderDefModule>("disk", true));
+  registerModule(std::make_unique<ProviderDefModule>("disk", false));
+  ProviderDefFunction* size =
+      registerFunction(std::make_unique<ProviderDefFunction>("size", 100, first));
+  registerFunction(std::make_unique<ProviderDefFunction>("size", 110, first));
+  for (int i = 0; i < 100; ++i) {  // The lists move; the objects stay.
+    registerModule(std::make_unique<ProviderDefModule>("m" + std::to_string(i), true));
+    registerFunction(std::make_unique<ProviderDefFunction>("f" + std::to_string(i), 100, first));
+  }
+  EXPECT_EQ(getModule("disk"), first);
+  EXPECT_EQ(getFunction("size"), size);
+  EXPECT_EQ(functionCount(), 102u);
+  for (const char* name : {"", "Disk", "dis", "disk ", "size"}) EXPECT_EQ(getModule(name), nullptr);
+  for (const char* name : {"", "Size", "siz", "size ", "disk"}) {
+    EXPECT_EQ(getFunction(name), nullptr);
+  }
+}
+
+TEST_F(Registry, NotesAMissOnStandardOutputAtLevel9) {
+  for (const int level : {8, 9}) {
+    const LogLevel setLevel(level);
+    StdoutCapture out;
+    getModule("none");
+    getFunction("none");
+    EXPECT_EQ(out.text(), level == 9 ? "Can not find module\nCan not find a function\n" : "");
+  }
+  EXPECT_EQ(tree_.log(), "");
+}
+
+TEST_F(Registry, ReleaseClosesTheLibrariesAndEmptiesTheLists) {
+  for (int round = 0; round < 2; ++round) {
+    EXPECT_EQ(function("alltypes", "getI", "getI").get().getType(), 0);
+    EXPECT_EQ(function("lifecycle", "getStarts", "getI").get().getType(), 0);
+    EXPECT_TRUE(isOpen("alltypes"));
+    EXPECT_TRUE(isOpen("lifecycle"));
+    releaseFunctions();
+    EXPECT_EQ(getFunction("getI"), nullptr);
+    EXPECT_TRUE(isOpen("alltypes"));
+    releaseModules();
+    EXPECT_EQ(getModule("alltypes"), nullptr);
+    EXPECT_FALSE(isOpen("alltypes"));
+    EXPECT_FALSE(isOpen("lifecycle"));
+  }
+}
+
+TEST_F(Registry, ReplacesModulesFromAPositionOn) {
+  ProviderDefModule* from = &module("a");
+  ProviderDefModule* to = &module("b");
+  for (int i = 0; i < 3; ++i) {
+    registerFunction(std::make_unique<ProviderDefFunction>("f", 100, i == 1 ? to : from));
+  }
+  ProviderDefFunction* first = getFunction("f");
+  ProviderDefFunction* last = &function("a", "last", "getI");
+  replaceModule(from, to, 1);
+  EXPECT_EQ(first->getModule(), from);
+  EXPECT_EQ(last->getModule(), to);
+}
+
+TEST_F(Registry, AFunctionWhoseModuleIsGoneCannotBeLoaded) {
+  ProviderDefFunction orphan("size", 100, nullptr);
+  EXPECT_EQ(errorOf([&] { orphan.get(); }), "Couldn't load function size");
+}

@@ -1,0 +1,55 @@
+#include "tests/engine/ValueText.h"
+
+#include <ostream>
+#include <sstream>
+
+const Values& oneOfEachType() {
+  static const Values values = [] {
+    ProviderDefValue indexString("index");
+    indexString.setIndexStringType();
+    return Values{7, "seven", Ints{7}, Texts{"seven"}, indexString, true, 7L};
+  }();
+  return values;
+}
+
+namespace {
+
+template <class T>
+std::string listText(const std::vector<T>& items) {
+  std::ostringstream text;
+  const char* separator = "{";
+  for (const T& item : items) {
+    text << separator << item;
+    separator = ", ";
+  }
+  return items.empty() ? "{}" : text.str() + "}";
+}
+
+}  // namespace
+
+std::string valueText(const ProviderDefValue& value) {
+  const std::string type = std::to_string(value.getType()) + " ";
+  switch (value.getType()) {
+    case ProviderDefValue::kString:
+    case ProviderDefValue::kIndexString:
+      return type + value.getStringValue();
+    case ProviderDefValue::kIntArray:
+      return type + listText(value.getIntArray());
+    case ProviderDefValue::kStringArray:
+      return type + listText(value.getStringArray());
+    case ProviderDefValue::kBoolean:
+      return type + (value.getBoolValue() ? "true" : "false");
+    default:
+      return type + std::to_string(value.getLongValue());
+  }
+}
+
+std::string valueText(const Values& values) {
+  std::string text;
+  for (const ProviderDefValue& value : values) text += valueText(value) + "; ";
+  return text;
+}
+
+void PrintTo(const ProviderDefValue& value, std::ostream* stream) {
+  *stream << valueText(value);
+}
