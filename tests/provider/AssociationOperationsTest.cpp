@@ -1,0 +1,132 @@
+// associatorNames and associators.
+
+#include "LinkTest.h"
+
+using namespace Pegasus;
+
+namespace {
+
+struct NamesCase {
+  const char* name;
+  const char* object;
+  const char* associationClass;
+  const char* resultClass;
+  std::vector<std::string> paths;
+};
+
+std::ostream& operator<<(std::ostream& out, const NamesCase& given) {
+  return out << given.name;
+}
+
+class AssociationOperations : public LinkTest, public testing::WithParamInterface<NamesCase> {
+ protected:
+  void SetUp() override {
+    LinkTest::SetUp();
+    start(classes() + association("T_Link", itemsAndParts()) +
+          association("T_Other", itemsAndParts() + itemsAndVolumes()));
+  }
+
+  static CIMName nameOrNull(const char* text) { return *text == '\0' ? CIMName() : CIMName(text); }
+
+  RecordingHandler names(const char* object, const char* associationClass = "",
+                         const char* resultClass = "") {
+    RecordingHandler handler;
+    provider->associatorNames(context, pathOf(object), nameOrNull(associationClass),
+                              nameOrNull(resultClass), String("role"), String("other"), handler);
+    return handler;
+  }
+
+  RecordingHandler associators(const char* object, const char* associationClass = "",
+                               const char* resultClass = "") {
+    const CIMPropertyList nothing{Array<CIMName>()};
+    RecordingHandler handler;
+    provider->associators(context, pathOf(object), nameOrNull(associationClass),
+                          nameOrNull(resultClass), String(), String(), true, true, nothing,
+                          handler);
+    return handler;
+  }
+};
+
+TEST_P(AssociationOperations, NamesOfTheLinked) {
+  const NamesCase& given = GetParam();
+  std::vector<std::string> events = given.paths;
+  events.insert(events.begin(), "processing");
+  events.push_back("complete");
+  EXPECT_EQ(names(given.object, given.associationClass, given.resultClass).events, events);
+}
+
+const char kItemA[] = "root/t:T_Item.Name=\"a\"";
+const std::string kA = kItemA;
+const std::string kB = "root/t:T_Item.Name=\"b\"";
+const std::string kPart0 = "root/t:T_Part.Id=\"p 0\"";
+const std::string kPart1 = "root/t:T_Part.Id=\"p 1\"";
+const std::string kPart2 = "root/t:T_Part.Id=\"p 2\"";
+
+// T_Other has two pairs: it is a candidate once for each that fits. Without a result class each
+// candidate leads to the other class of its first pair.
+INSTANTIATE_TEST_SUITE_P(
+    Requests, AssociationOperations,
+    testing::Values(
+        NamesCase{"OneAssociation", kItemA, "T_Link", "T_Part", {kPart1}},
+        NamesCase{
+            "SeveralTargets", "root/t:T_Item.Name=\"b\"", "t_link", "T_Part", {kPart0, kPart2}},
+        NamesCase{"TheOtherWay", "root/t:T_Part.Id=\"p 2\"", "T_Link", "", {kB}},
+        NamesCase{"AnyAssociation", kItemA, "", "T_Part", {kPart1, kPart1}},
+        NamesCase{"AnyResult", kItemA, "", "", {kPart1, kPart1, kPart1}},
+        NamesCase{"Foreign", kItemA, "T_Other", "T_Volume", {"T_Volume.Id=1"}},
+        NamesCase{"FromForeign", "root/t:T_Volume.Id=0x1", "", "", {kA}},
+        NamesCase{"ForeignWithoutLink", "root/t:T_Volume.Id=2", "", "", {}},
+        NamesCase{"ObjectOfAnotherHost", "//h/root/t:T_ITEM.NAME=\"a\"", "T_Link", "", {kPart1}},
+        NamesCase{"NoSuchObject", "root/t:T_Item.Name=\"A\"", "T_Link", "", {}},
+        NamesCase{"ClassPath", "root/t:T_Item", "T_Link", "", {}}),
+    kByName);
+
+TEST_F(AssociationOperations, UnmatchedClassesAreNotSupported) {
+  const char* kRequests[][3] = {{"root/t:T_Nothing", "", ""},
+                                {kItemA, "T_Nothing", ""},
+                                {kItemA, "T_Link", "T_Volume"},
+                                {kItemA, "T_Link", "T_Item"}};
+  for (const auto& request : kRequests) {
+    for (const bool objects : {false, true}) {
+      try {
+        objects ? associators(request[0], request[1], request[2])
+                : names(request[0], request[1], request[2]);
+        ADD_FAILURE() << request[0];
+      } catch (const CIMException& error) {
+        EXPECT_EQ(error.getCode(), CIM_ERR_NOT_SUPPORTED);
+        EXPECT_EQ(textOf(error.getMessage()), "CommonProvider::associatorNames");
+      }
+    }
+  }
+}
+
+TEST_F(AssociationOperations, AssociatorsAreWholeInstances) {
+  EXPECT_THAT(associators(kItemA, "T_Link").events,
+              ElementsAre("processing", "object " + kPart1 + " {Id=string p 1, Owner=string a}",
+                          "complete"));
+  host.calls.clear();
+  EXPECT_THAT(associators(kItemA, "T_Other", "T_Volume").events,
+              ElementsAre("processing", "object T_Volume.Id=1 {Owner=string a}", "complete"));
+  EXPECT_EQ(host.calls.back(), "getInstance root/t T_Volume.Id=1 0 1 1 null");
+  EXPECT_THAT(associators("root/t:T_Volume.Id=2").events, ElementsAre("processing", "complete"));
+}
+
+TEST_F(AssociationOperations, TracesToStandardOutput) {
+  StdoutCapture capture;
+  associators(kItemA, "T_Link");
+  std::string traces;
+  std::istringstream lines(capture.text());
+  for (std::string line; std::getline(lines, line);) {
+    if (line.find("ssociat") == std::string::npos || line.find("ProviderDef") == 0 ||
+        line.find("putting") == 0) {
+      continue;
+    }
+    traces += line + "\n";
+  }
+  EXPECT_EQ(traces,
+            "associators\nCommonProvider::associatorNames Entry\n"
+            "Delivering Association names!!! root/t:T_Part.Id=\"p 1\"\n"
+            "CommonProvider::associatorNames Exit\n");
+}
+
+}  // namespace

@@ -1,0 +1,119 @@
+#pragma once
+
+#include <Pegasus/Provider/CIMOMHandle.h>
+#include <dlfcn.h>
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <optional>
+#include <string>
+
+#include "RecordingHandler.h"
+#include "TestHost.h"
+#include "plugins/provider_test_plugin.h"
+#include "provider/CommonProvider.h"
+#include "tests/support/LogLevel.h"
+#include "tests/support/StdoutCapture.h"
+#include "tests/support/TemporaryTree.h"
+
+using testing::ElementsAre;
+using testing::HasSubstr;
+
+/// Names the cases of a table by their `name`.
+inline constexpr auto kByName = [](const auto& given) { return given.param.name; };
+
+// Pieces of definition files.
+
+inline std::string call(const std::string& function, const std::string& type,
+                        const std::string& arguments = "<argument type=\"index\"/>") {
+  return "<functioncall><function name=\"" + function + "\" type=\"" + type + "\"/>" + arguments +
+         "</functioncall>";
+}
+
+inline std::string constant(const std::string& type, const std::string& text) {
+  return "<constant type=\"" + type + "\">" + text + "</constant>";
+}
+
+inline std::string property(const std::string& name, const std::string& get,
+                            const std::string& set = "") {
+  return "<property name=\"" + name + "\"><get>" + get + "</get>" +
+         (set.empty() ? "" : "<set>" + set + "</set>") + "</property>";
+}
+
+inline std::string definedClass(const std::string& name, const std::string& instances,
+                                const std::string& body) {
+  return "<class name=\"" + name + "\" namespace=\"root/t\"><instances>" + instances +
+         "</instances>" + body + "</class>";
+}
+
+/// Names come from the left table of the plug-in.
+inline std::string itemClass(const std::string& body = "") {
+  return definedClass("T_Item", call("leftCount", "getI", ""),
+                      property("Name", call("leftText", "getSi")) + body);
+}
+
+inline std::string definitionFile(const std::string& body) {
+  return "<plugin><module name=\"test\" path=\"short\"/>" + body + "</plugin>";
+}
+
+inline Pegasus::CIMObjectPath pathOf(const char* text) {
+  return Pegasus::CIMObjectPath(Pegasus::String(text));
+}
+
+/// A provider over the plug-in, a definition file and a host, made as a server makes it.
+class ProviderTest : public testing::Test {
+ protected:
+  ProviderTest() {
+    tree.addPlugin("test", PROVIDER_TEST_PLUGIN);
+    Pegasus::setEmbeddedHost(&host);
+    handle.emplace();
+    state = static_cast<TestPluginState*>(dlsym(plugin, "test_plugin_state"));
+    *state = TestPluginState();
+  }
+
+  ~ProviderTest() override {
+    if (provider != nullptr) provider->terminate();
+    Pegasus::setEmbeddedHost(nullptr);
+    dlclose(plugin);
+  }
+
+  void start(const std::string& body) {
+    TemporaryTree::write(tree.run() / "defs.xml", definitionFile(body));
+    provider = dynamic_cast<Vaneth::CommonProvider*>(
+        PegasusCreateProvider(Pegasus::String("CommonProvider")));
+    provider->initialize(*handle);
+  }
+
+  /// Puts another host behind the provider's handle.
+  void use(TestHost& other) {
+    Pegasus::setEmbeddedHost(&other);
+    *handle = Pegasus::CIMOMHandle();
+  }
+
+  void setTable(TestTable& table, std::initializer_list<const char*> texts) {
+    table.count = 0;
+    for (const char* text : texts) table.texts[table.count++] = text;
+  }
+
+  RecordingHandler enumerate(const char* path) {
+    RecordingHandler handler;
+    provider->enumerateInstances(context, pathOf(path), false, false, Pegasus::CIMPropertyList(),
+                                 handler);
+    return handler;
+  }
+
+  RecordingHandler get(const Pegasus::CIMObjectPath& path) {
+    RecordingHandler handler;
+    provider->getInstance(context, path, false, false, Pegasus::CIMPropertyList(), handler);
+    return handler;
+  }
+
+  TemporaryTree tree;
+  LogLevel quiet{0};
+  TestHost host;
+  std::optional<Pegasus::CIMOMHandle> handle;
+  void* plugin = dlopen(PROVIDER_TEST_PLUGIN, RTLD_NOW);
+  TestPluginState* state = nullptr;
+  Vaneth::CommonProvider* provider = nullptr;
+  Pegasus::OperationContext context;
+};

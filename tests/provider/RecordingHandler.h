@@ -1,0 +1,49 @@
+#pragma once
+
+#include <Pegasus/Common/ResponseHandler.h>
+
+#include <string>
+#include <vector>
+
+#include "CimText.h"
+
+/// Notes every call that an operation makes on its handler, in order.
+class RecordingHandler : public Pegasus::InstanceResponseHandler,
+                         public Pegasus::ObjectPathResponseHandler,
+                         public Pegasus::ObjectResponseHandler,
+                         public Pegasus::MethodResultResponseHandler {
+ public:
+  void processing() override { events.push_back("processing"); }
+  void complete() override { events.push_back("complete"); }
+
+  void deliver(const Pegasus::CIMInstance& instance) override {
+    instances.append(instance);
+    events.push_back(textOf(instance));
+  }
+  void deliver(const Pegasus::CIMObjectPath& path) override { events.push_back(textOf(path)); }
+  void deliver(const Pegasus::CIMObject& object) override {
+    events.push_back("object " + textOf(Pegasus::CIMInstance(object)));
+  }
+  void deliver(const Pegasus::CIMValue& value) override {
+    events.push_back("returns " + textOf(value));
+  }
+  void deliver(const Pegasus::Array<Pegasus::CIMInstance>&) override { unexpected(); }
+  void deliver(const Pegasus::Array<Pegasus::CIMObjectPath>&) override { unexpected(); }
+  void deliver(const Pegasus::Array<Pegasus::CIMObject>&) override { unexpected(); }
+
+  void deliverParamValue(const Pegasus::CIMParamValue&) override { unexpected(); }
+  void deliverParamValue(const Pegasus::Array<Pegasus::CIMParamValue>& values) override {
+    std::string text = "out";
+    for (Pegasus::Uint32 i = 0; i < values.size(); ++i) {
+      text += " " + textOf(values[i].getParameterName()) + "=(" + textOf(values[i].getValue()) +
+              ")" + (values[i].isTyped() ? "" : " untyped");
+    }
+    events.push_back(text);
+  }
+
+  std::vector<std::string> events;
+  Pegasus::Array<Pegasus::CIMInstance> instances;
+
+ private:
+  void unexpected() { events.push_back("unexpected delivery"); }
+};
