@@ -52,7 +52,8 @@ void setValue(CIMProperty& property, CIMClass& cimClass, const ProviderDefProper
   property.setValue(toCimValue(value, property.getType(), property.isArray(), WideSource::kLong));
 }
 
-bool isKey(CIMProperty& property) {
+// Read through a constant handle: asking for a changeable qualifier would copy the shared ones.
+bool isKey(const CIMConstProperty& property) {
   Boolean key = false;
   property.getQualifier(property.findQualifier(CIMName("key"))).getValue().get(key);
   return key;

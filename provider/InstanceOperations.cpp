@@ -56,7 +56,7 @@ void CommonProvider::enumerateDefined(const OperationContext& context,
     } catch (const ProviderDefError& error) {
       // The text as it stands: the message goes to the log alone.
       TraceLine() << "ProviderDefError $s\n";
-      debug(1, error.getMessage().c_str());
+      debugFormat(1, "%s\n", error.getMessage().c_str());
     } catch (...) {
       debug(9, "Unknown exception\n");
     }

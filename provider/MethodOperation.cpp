@@ -98,7 +98,7 @@ void CommonProvider::invokeMethod(const OperationContext& context,
     handler.deliverParamValue(delivered);
     handler.deliver(CIMValue(Sint32(result)));
   } catch (const ProviderDefError& error) {
-    debug(1, error.getMessage().c_str());
+    debugFormat(1, "%s\n", error.getMessage().c_str());
   }
   handler.complete();
 }

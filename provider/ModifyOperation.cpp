@@ -69,7 +69,7 @@ void CommonProvider::writeProperty(const ProviderDefClass& definition, CIMClass&
     const auto value = valueToWrite(sent.getProperty(found), declared, cimClass, *defined);
     if (value) defined->setValue(*value, index);
   } catch (const ProviderDefError& error) {
-    debug(1, error.getMessage().c_str());
+    debugFormat(1, "%s\n", error.getMessage().c_str());
   } catch (...) {
     // A value of another type than the class declares: the property is left out.
   }
