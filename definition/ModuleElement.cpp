@@ -33,7 +33,7 @@ void ProviderDefModule::read(ElementReader& reader) {
   withContext("module", name_, [&] {
     for (const auto& [key, value] : reader.unit().getAttributes()) {
       if (key == "name") name_ = value;
-      if (key == "path") path_ = value == "short" ? kShort : kFull;
+      if (key == "path" && value == "short") path_ = kShort;
     }
     if (reader.isEmptyElement()) return;
     reader.advance();

@@ -5,12 +5,14 @@
 #include <unistd.h>
 
 #include <filesystem>
+#include <sstream>
 #include <string>
 #include <vector>
 
 #include "definition/DefinitionRegistry.h"
 #include "tests/definition/Reading.h"
 #include "tests/support/LogLevel.h"
+#include "tests/support/StdoutCapture.h"
 #include "tests/support/TemporaryTree.h"
 
 namespace {
@@ -51,15 +53,21 @@ TEST_F(DefinitionFile, EveryElementIsReadAndRegistered) {
   ASSERT_NE(getModule("sample"), nullptr);
   EXPECT_EQ(getModule("sample")->getPath(), 1);
   EXPECT_EQ(getModule("sample")->getInit()->getDefFunction(), getFunction("startUp"));
+  EXPECT_EQ(getModule("resetter")->getInit()->getDefFunction(), getFunction("startReset"));
   EXPECT_EQ(getModule("/opt/sample/libparts.so")->getPath(), 0);
 
   const struct {
     const char *name, *module;
     int type;
-  } functions[] = {{"startUp", "sample", 100},     {"diskCount", "sample", 100},
-                   {"diskName", "sample", 111},    {"renameDisk", "sample", 11},
-                   {"diskLabel", "sample", 113},   {"resetDisk", "resetter", 201},
-                   {"linkedParts", "linker", 131}, {"partName", "/opt/sample/libparts.so", 111}};
+  } functions[] = {{"startUp", "sample", 100},
+                   {"diskCount", "sample", 100},
+                   {"diskName", "sample", 111},
+                   {"renameDisk", "sample", 11},
+                   {"diskLabel", "sample", 113},
+                   {"startReset", "resetter", 100},
+                   {"resetDisk", "resetter", 201},
+                   {"linkedParts", "linker", 131},
+                   {"partName", "/opt/sample/libparts.so", 111}};
   for (const auto& row : functions) {
     const ProviderDefFunction* function = getFunction(row.name);
     ASSERT_NE(function, nullptr) << row.name;
@@ -177,12 +185,37 @@ INSTANTIATE_TEST_SUITE_P(
         EndCase{"TextOnly", "just text", {}, 0}),
     kCaseName);
 
-TEST_F(DefinitionFile, FunctionsWithoutModuleFailWhenCalled) {
-  reading(
-      "<class name='A'><instances><functioncall><function name='f' type='getI'/>"
-      "</functioncall></instances></class>");
-  ASSERT_EQ(getProviderDefClass("A"), &registeredClasses()[0]);
-  EXPECT_EQ(getFunction("f")->getModule(), nullptr);
+// Without the single characters. A start tag is seen by what holds the element, then by the
+// element.
+TEST_F(DefinitionFile, TheTraceShowsTheElementsAsTheyAreRead) {
+  const LogLevel level(9);
+  StdoutCapture quiet;
+  std::istringstream log(
+      reading("<plugin><module name='m'><functioncall><function name='f'/></functioncall></module>"
+              "<class><instances><constant type='int'>1</constant></instances>"
+              "<property><get><constant type='int'>2</constant></get></property></class>"
+              "<association></association>"));
+  quiet.text();
+  std::string trace;
+  for (std::string line; std::getline(log, line);) {
+    if (line.rfind("state ", 0) == 0 || line.rfind("Enter ", 0) == 0) continue;
+    trace += line.substr(0, line.find(" init : ")) + "\n";
+  }
+  EXPECT_EQ(
+      trace,
+      "element plugin\nelement module\nAttribute: name=m\n"
+      "ProviderDefModule Constructor\nelement module\nAttribute: name=m\nelement functioncall\n"
+      "ProviderDefFunctionCall Constructor\nelement functioncall\n"
+      "element function\nAttribute: name=f\n"
+      "ProviderDefFunction Constructor\nelement function\nAttribute: name=f\n"
+      "element functioncall\nsetting needInit=true,\nelement module\nelement class\n"
+      "ProviderDefClass Constructor\nelement class\nelement instances\n"
+      "element constant\nAttribute: type=int\nReading constant value\nCDATA 1\n"
+      "element constant\nelement instances\nelement property\n"
+      "ProviderDefProperty Constructor\nelement property\nelement get\n"
+      "element constant\nAttribute: type=int\nProperty constant type : int\nCDATA 2\n"
+      "element constant\nelement get\nelement property\nelement class\nelement association\n"
+      "ProviderDefAssociation Constructor\nelement association\nelement association\n");
 }
 
 TEST_F(DefinitionFile, WhatCannotBeReadGivesOneLine) {
