@@ -93,7 +93,7 @@ void addGlobalOptions(CLI::App& app, CommandLine& line, Arguments& arguments) {
       ->type_name("FILE");
   app.add_option("--format", arguments.format, "How results are printed; default: table")
       ->check(CLI::IsMember({"table", "mof", "json"}))
-      ->type_name("");
+      ->type_name("FORMAT");
   app.add_flag("--trace", line.trace, "Show the provider's trace lines on standard error");
 }
 

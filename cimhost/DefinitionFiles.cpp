@@ -22,6 +22,7 @@ ServedClass toServedClass(const definition::Served& served, const std::string& f
   result.association = served.association;
   result.hasMethods = served.hasMethods;
   result.file = file;
+  result.properties = served.properties;
   return result;
 }
 

@@ -3,10 +3,8 @@
 #include "cimhost/ConfigurationCheck.h"
 #include "cimhost/DefinitionFiles.h"
 #include "cimhost/HostError.h"
-#include "cimhost/Text.h"
+#include "cimhost/ServedClassCheck.h"
 #include "cimhost/mof/MofReader.h"
-
-#include <algorithm>
 
 namespace cimhost {
 
@@ -14,21 +12,6 @@ namespace {
 
 constexpr const char* kProviderName = "CommonProvider";
 constexpr const char* kDefaultNamespace = "root/cimv2";
-
-bool isDeclared(const ClassRepository& repository, const ServedClass& served) {
-  if (!served.nameSpace.isNull()) return repository.hasClass(served.nameSpace, served.className);
-  const auto spaces = repository.namespaces();
-  return std::any_of(spaces.begin(), spaces.end(), [&](const Pegasus::CIMNamespaceName& space) {
-    return repository.hasClass(space, served.className);
-  });
-}
-
-std::string undeclaredMessage(const ServedClass& served) {
-  std::string text =
-      "class " + toUtf8(served.className.getString()) + " is defined, but not declared";
-  if (!served.nameSpace.isNull()) text += " in namespace " + toUtf8(served.nameSpace.getString());
-  return text + "; no client can reach it";
-}
 
 }  // namespace
 
@@ -72,11 +55,8 @@ void Host::readDeclarations() {
 void Host::readDefinitionFiles() {
   const auto problems = readDefinitions("run/", served_);
   diagnostics_.insert(diagnostics_.end(), problems.begin(), problems.end());
-  for (const ServedClass& served : served_.all()) {
-    if (isDeclared(repository_, served)) continue;
-    diagnostics_.push_back(
-        {Diagnostic::Severity::warning, served.file, 0, 0, undeclaredMessage(served), {}});
-  }
+  const auto mismatches = checkServedClasses(served_, repository_);
+  diagnostics_.insert(diagnostics_.end(), mismatches.begin(), mismatches.end());
 }
 
 }  // namespace cimhost

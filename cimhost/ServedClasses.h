@@ -13,7 +13,8 @@ struct ServedClass {
   Pegasus::CIMName className;
   bool association = false;
   bool hasMethods = false;
-  std::string file;  ///< The definition file.
+  std::string file;                     ///< The definition file.
+  std::vector<std::string> properties;  ///< Of a class: those that have a definition.
 };
 
 /// Which classes the provider is registered for, as a CIM server knows them from its registration

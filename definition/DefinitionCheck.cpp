@@ -7,6 +7,7 @@
 #include "engine/Registry.h"
 
 #include <algorithm>
+#include <utility>
 
 namespace definition {
 namespace {
@@ -72,12 +73,16 @@ void checkFile(const std::string& file, CheckResult& result) {
   }
   for (size_t i = firstClass; i < registeredClasses().size(); ++i) {
     const ProviderDefClass& read = registeredClasses()[i];
-    result.served.push_back(
-        {read.getNamespace(), read.getName(), false, !read.getMethods().empty(), file});
+    std::vector<std::string> properties;
+    for (const ProviderDefProperty& property : read.getProperties()) {
+      properties.push_back(property.getName());
+    }
+    result.served.push_back({read.getNamespace(), read.getName(), false, !read.getMethods().empty(),
+                             file, std::move(properties)});
   }
   for (size_t i = firstAssociation; i < registeredAssociations().size(); ++i) {
     const ProviderDefAssociation& read = registeredAssociations()[i];
-    result.served.push_back({read.getNamespace(), read.getName(), true, false, file});
+    result.served.push_back({read.getNamespace(), read.getName(), true, false, file, {}});
   }
 }
 

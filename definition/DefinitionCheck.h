@@ -22,6 +22,7 @@ struct Served {
   bool association = false;
   bool hasMethods = false;
   std::string file;
+  std::vector<std::string> properties;  ///< Of a class: those that have a definition.
 };
 
 struct CheckResult {

@@ -139,6 +139,30 @@ TEST_F(HostTest, EveryProblemIsReportedAndTheRestServes) {
   EXPECT_THAT(error_.str(), HasSubstr("bad.mof:2:9"));
 }
 
+TEST_F(HostTest, DefinitionsAndDeclarationsThatDoNotFitAreToldApart) {
+  write("mof/root/test/classes.mof",
+        "class A { [Key] string Name; [Key(false)] string Good; string Bad; };");
+  std::string text =
+      "<plugin><module name=\"m\" path=\"short\"></module><class name=\"A\" "
+      "namespace=\"root/test\"><instances><constant type=\"int\">1</constant>"
+      "</instances>";
+  for (const char* name : {"Name", "good", "Bad", "Undeclared", "1x"}) {
+    text += std::string("<property name=\"") + name +
+            "\"><get><constant type=\"string\">v</constant></get></property>";
+  }
+  write("run/a.xml", text + "</class></plugin>");
+  EXPECT_THAT(
+      diagnostics(),
+      ElementsAre("run/a.xml: warning: property good of class A is declared as Good: letter case "
+                  "differs; it is left out",
+                  "run/a.xml: warning: property Bad of class A is declared without [Key] or "
+                  "[Key(false)]; the provider delivers no instance of the class",
+                  "run/a.xml: warning: property Undeclared of class A is defined, but not "
+                  "declared; it is left out",
+                  "run/a.xml: warning: property 1x of class A is defined, but not declared; "
+                  "it is left out"));
+}
+
 TEST_F(HostTest, AGoodHomeChecksWell) {
   writeGoodFiles();
   EXPECT_EQ(run({"check"}), ExitCode::kOk);

@@ -55,10 +55,10 @@ TestHost::TestHost(const std::string& providerName) {
                            "Test_ManyThrows",    "Test_Swallows",      "Test_ServerDisks",
                            "Test_Nested",        "Test_NoNamespace",   "Test_EchoPath"}) {
     repository.addClass(kNamespace, makeClass(name, "", {"Name", "Size"}));
-    served.add({kNamespace, CIMName(name), false, false, "test.xml"});
+    served.add({kNamespace, CIMName(name), false, false, "test.xml", {}});
   }
-  served.add({kNamespace, CIMName("Test_Disk"), false, false, "test.xml"});
-  served.add({CIMNamespaceName(), CIMName("Test_BigDisk"), false, false, "test.xml"});
+  served.add({kNamespace, CIMName("Test_Disk"), false, false, "test.xml", {}});
+  served.add({CIMNamespaceName(), CIMName("Test_BigDisk"), false, false, "test.xml", {}});
   setEmbeddedHost(&cimom);
   handle_ = new CIMOMHandle;
   provider.load(TEST_PROVIDER_FILE, providerName, *handle_);
