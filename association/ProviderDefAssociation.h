@@ -50,6 +50,9 @@ class ProviderDefAssociation {
                                   const Values& sourceValues, const std::string& targetClass,
                                   const std::vector<Values>& targetValues) const;
 
+  /// Prints the object on standard output, for diagnosis; the objects that it refers to as well.
+  void dump() const;
+
  private:
   enum class Direction { kNone, kForward, kReverse };
 

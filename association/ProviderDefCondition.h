@@ -39,6 +39,9 @@ class ProviderDefCondition {
   /// sub-conditions do.
   bool getValue(int index1, const Values& values1, int index2, const Values& values2) const;
 
+  /// Prints the object on standard output, for diagnosis; the objects that it refers to as well.
+  void dump() const;
+
  private:
   // The three kinds of an operand side by side; `kind` says which one holds.
   struct Operand {

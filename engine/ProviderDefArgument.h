@@ -46,6 +46,9 @@ class ProviderDefArgument {
   /// The value of an element argument, for the instance `index`.
   ProviderDefValue evaluate(int index) const;
 
+  /// Prints the object on standard output, for diagnosis; the objects that it refers to as well.
+  void dump() const;
+
  private:
   void read(ElementReader& reader, ProviderDefModule* module);
   void readElement(ElementReader& reader, ProviderDefModule* module);

@@ -30,6 +30,9 @@ class ProviderDefClass {
   /// From the instance-count call, or the constant. May be negative: a plug-in said so.
   int getNumberOfInstances() const;
 
+  /// Prints the object on standard output, for diagnosis; the objects that it refers to as well.
+  void dump() const;
+
  private:
   void read(ElementReader& reader, ProviderDefModule* module);
   void readInstances(ElementReader& reader, ProviderDefModule* module);

@@ -77,6 +77,9 @@ class ProviderDefFunction {
   std::vector<int> makeAI(const char* item, const char** next, const char* end) const;
   std::vector<std::string> makeAS(const char* item, const char** next, const char* end) const;
 
+  /// Prints the object on standard output, for diagnosis; the objects that it refers to as well.
+  void dump() const;
+
  private:
   struct Extra;
 

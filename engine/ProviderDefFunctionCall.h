@@ -48,6 +48,9 @@ class ProviderDefFunctionCall {
   /// Runs a module's initialisation call: a get call with index 0, its value unused.
   void init() const;
 
+  /// Prints the object on standard output, for diagnosis; the objects that it refers to as well.
+  void dump() const;
+
  private:
   void read(ElementReader& reader, ProviderDefModule* module);
   ProviderDefFunction& function() const;

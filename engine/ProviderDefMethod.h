@@ -23,6 +23,9 @@ class ProviderDefMethod {
     return call_.exec(inputs, outputs, index);
   }
 
+  /// Prints the object on standard output, for diagnosis; the objects that it refers to as well.
+  void dump() const;
+
  private:
   void read(ElementReader& reader, ProviderDefModule* module);
 

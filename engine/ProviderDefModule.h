@@ -6,6 +6,10 @@
 #include <memory>
 #include <string>
 
+/// Set while a module dumps its initialisation call, whose function dumps the module again: the
+/// inner dump leaves the call out.
+extern bool inModuleInitDump;
+
 class ElementReader;
 class ProviderDefFunctionCall;
 
@@ -46,6 +50,9 @@ class ProviderDefModule {
   /// Throws ProviderDefError "Couldn't load module " + module name (the next call tries again) or
   /// "Couldn't load function " + `name`. Safe from several threads.
   void* getFunction(const std::string& name);
+
+  /// Prints the object on standard output, for diagnosis; the objects that it refers to as well.
+  void dump() const;
 
  private:
   enum PathType { kFull = 0, kShort = 1 };

@@ -26,6 +26,9 @@ class ProviderDefProperty {
   /// Writes through the set call; 0 when the property has none.
   int setValue(const ProviderDefValue& value, int index) const;
 
+  /// Prints the object on standard output, for diagnosis; the objects that it refers to as well.
+  void dump() const;
+
  private:
   void read(ElementReader& reader, ProviderDefModule* module);
   void readGet(ElementReader& reader, ProviderDefModule* module);

@@ -67,6 +67,9 @@ class ProviderDefValue {
   /// The mirror of partof: `a.include(b)` is `b.partof(a)`.
   bool include(const ProviderDefValue& other) const { return other.partof(*this); }
 
+  /// Prints the object on standard output, for diagnosis; the objects that it refers to as well.
+  void dump() const;
+
  private:
   int type_ = kInteger;
   std::string stringValue_;
