@@ -136,11 +136,11 @@ INSTANTIATE_TEST_SUITE_P(
         Fault{"FixedArrayOfAnotherSize", declared("Fault", CIMTYPE_UINT8, Key::kNo, true, 3),
               call("numbers", "getAIi"), nullptr},
         Fault{"NoSuchFunction", declared("Fault", CIMTYPE_UINT8), call("nowhere", "getIi"),
-              "Couldn't load function nowhere"},
+              "Couldn't load function nowhere\n"},
         Fault{"NoSuchModule", declared("Fault", CIMTYPE_UINT8),
               "<functioncall><function name=\"lost\" type=\"getI\"><module name=\"lost\" "
               "path=\"short\"/></function></functioncall>",
-              "Couldn't load module lost"}),
+              "Couldn't load module lost\n"}),
     kByName);
 
 TEST_F(Enumerate, OneBadInstanceLeavesTheOthers) {

@@ -250,7 +250,7 @@ TEST_F(Method, FailureOfThePluginEndsWithoutDelivery) {
   use(other);
   LogLevel level(1);
   EXPECT_THAT(invoke(kItem, "Lost"), ElementsAre("processing", "complete"));
-  EXPECT_EQ(tree.log(), "Couldn't load function nowhere");
+  EXPECT_EQ(tree.log(), "Couldn't load function nowhere\n");
 }
 
 }  // namespace

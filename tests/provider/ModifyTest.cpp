@@ -97,7 +97,7 @@ TEST_F(ModifyItem, WritesInTheOrderOfTheClassAndLogsWhatFails) {
   LogLevel level(1);
   EXPECT_THAT(modify("root/t:T_Item.Name=\"b\"", sent), ElementsAre("processing", "complete"));
   EXPECT_STREQ(state->record, "number 9@1\ntext 'new'@1\n");
-  EXPECT_EQ(tree.log(), "Couldn't load function nowhere");
+  EXPECT_EQ(tree.log(), "Couldn't load function nowhere\n");
   EXPECT_EQ(host.calls.back(), "getClass root/t T_Item 0 1 1 null");
 }
 
