@@ -136,6 +136,8 @@ TEST_F(Debug, DoesNotEvaluateArgumentsBelowTheLevel) {
 
 TEST_F(Debug, KeepsMessagesOfSeveralThreadsWhole) {
   tree_.setLogLevel("1");
+  debug(1,
+        static_cast<const char*>(""));  // Reads the level: meanwhile another thread's is still 0.
   const auto work = [] {
     for (int i = 0; i < 100; ++i) debug(1, static_cast<const char*>("0123456789\n"));
   };

@@ -82,14 +82,14 @@ TEST_F(ModuleLoading, RunsTheInitCallOnceBeforeAnythingElse) {
 TEST_F(ModuleLoading, InitCallIsAGetCallForIndex0) {
   setInit("lifecycle", callText("lifecycle", "startWith", "getIi", "<argument type=\"index\"/>"));
   EXPECT_EQ(number("lifecycle", "getStarts"), 1);
-  EXPECT_EQ(history(), "ns");
+  EXPECT_EQ(history(), "0s");
 }
 
 TEST_F(ModuleLoading, InitCallMayUseItsOwnModule) {
   const std::string nested = callText("lifecycle", "prepare", "getI");
   setInit("lifecycle", callText("lifecycle", "startWith", "getIi",
                                 "<argument type=\"element\">" + nested + "</argument>"));
-  EXPECT_EQ(history(), "pns");
+  EXPECT_EQ(history(), "p7s");
 }
 
 TEST_F(ModuleLoading, AFailedInitCallFailsTheFirstUseOnly) {

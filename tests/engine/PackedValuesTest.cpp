@@ -205,7 +205,7 @@ TEST_F(PackedLists, OutputsAreReadUpToTheEndMark) {
        "1 ab; 3 {}; "},
       // Only behind a string: elsewhere a tag stands where the item before it ends.
       {"\0\0\0\0\5\0\0\0"
-       "\0\x63\0\0\0"s,
+       "\0\1\0\0\0\1\0\0\0c\0"s,
        "0 5; "},
   };
   recorder_->result = -3;

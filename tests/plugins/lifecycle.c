@@ -19,7 +19,7 @@ int start(void) {
   return starts;
 }
 int startWith(int number) {
-  note('n');
+  note((char)('0' + number));
   factor = number;
   return start();
 }
@@ -50,7 +50,7 @@ int twiceList(const void* in, void* out) {
   return 0;
 }
 
-/* getS: a letter for each step so far: s, n start and startWith, p prepare */
+/* getS: a letter for each step so far: s start, a digit startWith, p prepare */
 int getHistory(char* out) {
   strcpy(out, history);
   return 0;
