@@ -11,196 +11,136 @@
 namespace {
 
 struct ErrorCase {
-  const char* name;
-  std::string text, message;
+  std::string name, text, message;
 };
-
-void PrintTo(const ErrorCase& value, std::ostream* out) {
-  *out << value.text;
-}
 
 class SyntaxError : public Registered, public testing::WithParamInterface<ErrorCase> {};
 
 TEST_P(SyntaxError, GivesTheWholeMessage) {
-  EXPECT_EQ(errorOfReading(GetParam().text), GetParam().message);
+  EXPECT_EQ(errorOfReading(GetParam().text), GetParam().message) << GetParam().text;
 }
 
-// Lines of context.
+// Cases that stand behind `before`, with the same lines of context at the end of their messages.
+auto within(const std::string& before, const std::string& context, std::vector<ErrorCase> cases) {
+  for (ErrorCase& one : cases) {
+    one.text = before + one.text;
+    one.message += context;
+  }
+  return testing::ValuesIn(cases);
+}
+
+#define ERRORS(suite, cases) INSTANTIATE_TEST_SUITE_P(suite, SyntaxError, cases, kCaseName)
+
+const std::string kCall = "\nfunctioncall:\n";
 const std::string kInModule = "\nmodule:m\n";
-const std::string kInCall = "\nfunctioncall:\n";
-const std::string kInClass = "\nclass:C\n";
-const std::string kInProperty = "\nproperty:P\n" + kInClass;
-const std::string kInMethod = "\nmethod:M\n" + kInClass;
-const std::string kInAssociation = "\nassociation:A\n";
-const std::string kInCondition = "\ncondition:\n";
+const std::vector<ErrorCase> kModuleErrors = {
+    {"OtherElement", "<class/>", "the end of module element missing before: class"},
+    {"Text", " some text <b>", "the end of module element missing before: some text"},
+    {"NoCallContent", "<functioncall/></module>",
+     "function elememt is missing before: module" + kCall},
+    {"EndOfFile", "", "the end of module element missing before: "}};
+ERRORS(Module, within("<plugin><module name='m'>", kInModule, kModuleErrors));
 
 const std::string kInit = "<plugin><module name='m'><functioncall>";
 const std::string kFunction = "<function name='f' type='getI'/>";
+const std::vector<ErrorCase> kCallErrors = {
+    {"ArgumentFirst", "<argument type='index'/>", "function elememt is missing before: argument"},
+    {"Text", kFunction + "5", "Unexpected elememt before: 5"},
+    {"FunctionEnd", "<function name='f' type='getI'><argument/>",
+     "end of the function element missing before: argument\nfunction:f\n"},
+    {"ModuleOfFunction", "<function name='f'><module name='n'>x",
+     "the end of module element missing before: x\nmodule:n\n\nfunction:f\n"}};
+ERRORS(Call, within(kInit, kCall + kInModule, kCallErrors));
 
-INSTANTIATE_TEST_SUITE_P(
-    Module, SyntaxError,
-    testing::Values(ErrorCase{"OtherElement", "<plugin><module name='m'><class/>",
-                              "the end of module element missing before: class" + kInModule},
-                    ErrorCase{"Text", "<plugin><module name='m'> some text <b>",
-                              "the end of module element missing before: some text" + kInModule},
-                    ErrorCase{"EndOfFile", "<plugin><module>",
-                              "the end of module element missing before: \nmodule:\n"}),
-    kCaseName);
+const std::string kElement = "<argument type='element'>";
+const std::vector<ErrorCase> kArgumentErrors = {
+    {"Kind", "<argument type='inout'/>", "invalid attribute: inout"},
+    {"NoKind", "<argument/>", "invalid attribute: "},
+    {"OtherElement", kElement + "<string>", "Unexpected element in the function element: string"},
+    {"NoElement", "<argument type='element'/></functioncall>",
+     "Unexpected element in the function element: functioncall"},
+    {"TwoConstants", kElement + "<constant type='int'>1</constant><constant>",
+     "the end of argument element missing before: constant"},
+    {"ContentOfIndex", "<argument type='index'>1</argument>",
+     "the end of argument element missing before: 1"},
+    {"ConstantEnd", kElement + "<constant type='int'>1<b/>",
+     "the end of constant element missing before: b"},
+    {"QueryEnd", kElement + "<cimproperty>A.B<b/>",
+     "the end of cimproperty element missing before: b"},
+    {"NestedCall", kElement + "<functioncall><function name='g'/><argument type='x'/>",
+     "invalid attribute: x\nargument:\n" + kCall}};
+ERRORS(Argument, within(kInit + kFunction, "\nargument:\n" + kCall + kInModule, kArgumentErrors));
 
-INSTANTIATE_TEST_SUITE_P(
-    Call, SyntaxError,
-    testing::Values(ErrorCase{"ArgumentFirst", kInit + "<argument type='index'/>",
-                              "function elememt is missing before: argument" + kInCall + kInModule},
-                    ErrorCase{"NoContent", "<plugin><module name='m'><functioncall/></module>",
-                              "function elememt is missing before: module" + kInCall + kInModule},
-                    ErrorCase{"Text", kInit + kFunction + "5",
-                              "Unexpected elememt before: 5" + kInCall + kInModule},
-                    ErrorCase{"FunctionEnd", kInit + "<function name='f' type='getI'><argument/>",
-                              "end of the function element missing before: argument\nfunction:f\n" +
-                                  kInCall + kInModule},
-                    ErrorCase{
-                        "ModuleOfFunction", kInit + "<function name='f'><module name='n'>x",
-                        "the end of module element missing before: x\nmodule:n\n\nfunction:f\n" +
-                            kInCall + kInModule}),
-    kCaseName);
+const std::string kInClass = "\nclass:C\n";
+const std::string kNoInstances = "instance elememt is missing in class element before: ";
+const std::string kNoCount =
+    "constant or functioncall elememt is missing in class element before: ";
+const std::vector<ErrorCase> kClassErrors = {
+    {"PropertyFirst", "<property name='P'>", kNoInstances + "property"},
+    {"EndOfFile", "", kNoInstances},
+    {"InstancesText", "<instances>3</instances>", kNoCount + "3"},
+    {"NoInstancesContent", "<instances/><property name='P'>", kNoCount + "property"},
+    {"InstancesEnd", "<instances><constant type='int'>1</constant>2",
+     "end of the instances element is missing before: 2"},
+    {"OtherChild", kOneInstance + "<association>", "Unexpected elememt: association"},
+    {"MethodWithConstant", kOneInstance + "<method name='M'><constant type='int'>",
+     "functioncall element is missing before: constant\nmethod:M\n"},
+    {"MethodEnd",
+     kOneInstance + "<method name='M'><functioncall>" + kFunction + "</functioncall></get>",
+     "end of the method element is missing before: get\nmethod:M\n"}};
+ERRORS(Class, within(kClass, kInClass, kClassErrors));
+ERRORS(EmptyClass, within(kModule + "<class name='C'/></plugin>", kInClass,
+                          {{"NoContent", "", kNoInstances + "plugin"}}));
 
-struct ArgumentCase {
-  const char* name;
-  std::string text, error;
-};
-
-class ArgumentError : public Registered, public testing::WithParamInterface<ArgumentCase> {};
-
-TEST_P(ArgumentError, GivesTheWholeMessage) {
-  EXPECT_EQ(errorOfReading(kInit + kFunction + GetParam().text),
-            GetParam().error + "\nargument:\n" + kInCall + kInModule);
-}
-
-INSTANTIATE_TEST_SUITE_P(
-    Argument, ArgumentError,
-    testing::Values(
-        ArgumentCase{"Kind", "<argument type='inout'/>", "invalid attribute: inout"},
-        ArgumentCase{"NoKind", "<argument/>", "invalid attribute: "},
-        ArgumentCase{"OtherElement", "<argument type='element'><string>",
-                     "Unexpected element in the function element: string"},
-        ArgumentCase{"NoElement", "<argument type='element'/></functioncall>",
-                     "Unexpected element in the function element: functioncall"},
-        ArgumentCase{"TwoConstants",
-                     "<argument type='element'><constant type='int'>1</constant><constant>",
-                     "the end of argument element missing before: constant"},
-        ArgumentCase{"ContentOfIndex", "<argument type='index'>1</argument>",
-                     "the end of argument element missing before: 1"},
-        ArgumentCase{"ConstantEnd", "<argument type='element'><constant type='int'>1<b/>",
-                     "the end of constant element missing before: b"},
-        ArgumentCase{"QueryEnd", "<argument type='element'><cimproperty>A.B<b/>",
-                     "the end of cimproperty element missing before: b"},
-        ArgumentCase{"NestedCall",
-                     "<argument type='element'><functioncall><function name='g'/><argument "
-                     "type='x'/>",
-                     "invalid attribute: x\nargument:\n\nfunctioncall:\n"}),
-    kCaseName);
-
-INSTANTIATE_TEST_SUITE_P(
-    Class, SyntaxError,
-    testing::Values(
-        ErrorCase{"PropertyFirst", kClass + "<property name='P'>",
-                  "instance elememt is missing in class element before: property" + kInClass},
-        ErrorCase{"NoContent", kModule + "<class name='C'/></plugin>",
-                  "instance elememt is missing in class element before: plugin" + kInClass},
-        ErrorCase{"EndOfFile", kClass,
-                  "instance elememt is missing in class element before: " + kInClass},
-        ErrorCase{
-            "InstancesText", kClass + "<instances>3</instances>",
-            "constant or functioncall elememt is missing in class element before: 3" + kInClass},
-        ErrorCase{"NoInstancesContent", kClass + "<instances/><property name='P'>",
-                  "constant or functioncall elememt is missing in class element before: property" +
-                      kInClass},
-        ErrorCase{"InstancesEnd", kClass + "<instances><constant type='int'>1</constant>2",
-                  "end of the instances element is missing before: 2" + kInClass},
-        ErrorCase{"OtherChild", kClassBody + "<association name='A'>",
-                  "Unexpected elememt: association" + kInClass}),
-    kCaseName);
-
-const std::string kProperty = kClassBody + "<property name='P'>";
 const std::string kConstant = "<constant type='int'>1</constant>";
 const std::string kGet = "<get>" + kConstant + "</get>";
-
-INSTANTIATE_TEST_SUITE_P(
-    Member, SyntaxError,
-    testing::Values(
-        ErrorCase{"NoGet", kProperty + "<set>", "get element is missing before: set" + kInProperty},
-        ErrorCase{"NoContent", kClassBody + "<property name='P'/><method>",
-                  "get element is missing before: method" + kInProperty},
-        ErrorCase{"SetInGet", kProperty + "<get><set>",
-                  "constant or functioncall elememt is missing in property element before: set" +
-                      kInProperty},
-        ErrorCase{"TextInSet", kProperty + kGet + "<set>1",
-                  "constant or functioncall elememt is missing in property element before: 1" +
-                      kInProperty},
-        ErrorCase{"GetEnd", kProperty + "<get>" + kConstant + "<set>",
-                  "end of the get element is missing before: set" + kInProperty},
-        ErrorCase{"TwoConversions",
-                  kProperty + "<get>" + kConstant + "<conversion type='valuemap'/><conversion/>",
-                  "end of the get element is missing before: conversion" + kInProperty},
-        ErrorCase{"SetEnd", kProperty + kGet + "<set>" + kConstant + "<conversion/>",
-                  "end of the set element is missing before: conversion" + kInProperty},
-        ErrorCase{"ConversionAfterSet",
-                  kProperty + kGet + "<set>" + kConstant + "</set><conversion type='valuemap'/>",
-                  "end of the property element is missing before: conversion" + kInProperty},
-        ErrorCase{"MethodWithConstant", kClassBody + "<method name='M'>" + kConstant,
-                  "functioncall element is missing before: constant" + kInMethod},
-        ErrorCase{
-            "MethodEnd",
-            kClassBody + "<method name='M'><functioncall>" + kFunction + "</functioncall></get>",
-            "end of the method element is missing before: get" + kInMethod}),
-    kCaseName);
+const std::string kNoValue =
+    "constant or functioncall elememt is missing in property element before: ";
+const std::vector<ErrorCase> kPropertyErrors = {
+    {"NoGet", "<set>", "get element is missing before: set"},
+    {"SetInGet", "<get><set>", kNoValue + "set"},
+    {"NoGetContent", "<get/></property>", kNoValue + "property"},
+    {"TextInSet", kGet + "<set>1", kNoValue + "1"},
+    {"GetEnd", "<get>" + kConstant + "<set>", "end of the get element is missing before: set"},
+    {"TwoConversions", "<get>" + kConstant + "<conversion type='valuemap'/><conversion/>",
+     "end of the get element is missing before: conversion"},
+    {"SetEnd", kGet + "<set>" + kConstant + "<conversion/>",
+     "end of the set element is missing before: conversion"},
+    {"ConversionAfterSet", kGet + "<set>" + kConstant + "</set><conversion type='valuemap'/>",
+     "end of the property element is missing before: conversion"}};
+ERRORS(Property,
+       within(kClassBody + "<property name='P'>", "\nproperty:P\n" + kInClass, kPropertyErrors));
 
 const std::string kAssociation = kModule + "<association name='A'>";
+const std::string kInAssociation = "\nassociation:A\n";
 const std::string kPair = "<classname name='X'/><classname name='Y'/>";
-const std::string kCondition = kAssociation + kPair + "<condition>";
+const std::vector<ErrorCase> kAssociationErrors = {
+    {"OneClass", "<classname name='X'/></association>",
+     "classname element is missing before : association"},
+    {"ConditionAfterOneClass", "<classname name='X'/><condition>",
+     "classname element is missing before : condition"},
+    {"ThreeClasses", kPair + "<classname/>", "condition element is missing before : classname"},
+    {"NoCondition", kPair + "</association>", "condition element is missing before : association"},
+    {"OtherElement", "<class name='C'>", "Unexpected element: class"},
+    {"OtherInClassname", "<classname name='X'><property/>", "Unexpected element: property"},
+    {"EndOfFile", kPair + "<condition><true/></condition>", "Unexpected element: "}};
+ERRORS(Association, within(kAssociation, kInAssociation, kAssociationErrors));
 
-INSTANTIATE_TEST_SUITE_P(
-    Association, SyntaxError,
-    testing::Values(ErrorCase{"OneClass", kAssociation + "<classname name='X'/></association>",
-                              "classname element is missing before : association" + kInAssociation},
-                    ErrorCase{"ConditionAfterOneClass",
-                              kAssociation + "<classname name='X'/><condition>",
-                              "classname element is missing before : condition" + kInAssociation},
-                    ErrorCase{"ThreeClasses", kAssociation + kPair + "<classname name='Z'/>",
-                              "condition element is missing before : classname" + kInAssociation},
-                    ErrorCase{"NoCondition", kAssociation + kPair + "</association>",
-                              "condition element is missing before : association" + kInAssociation},
-                    ErrorCase{"OtherElement", kAssociation + "<class name='C'>",
-                              "Unexpected element: class" + kInAssociation},
-                    ErrorCase{"OtherInClassname", kAssociation + "<classname name='X'><property/>",
-                              "Unexpected element: property" + kInAssociation},
-                    ErrorCase{"EndOfFile", kCondition + "<true/></condition>",
-                              "Unexpected element: " + kInAssociation}),
-    kCaseName);
-
-INSTANTIATE_TEST_SUITE_P(
-    Condition, SyntaxError,
-    testing::Values(
-        ErrorCase{"Operator", kCondition + "<equals>",
-                  "Unexpected element in condition: equals" + kInCondition + kInAssociation},
-        ErrorCase{"NoOperator", kCondition + "</condition>",
-                  "Unexpected element in condition: condition" + kInCondition + kInAssociation},
-        ErrorCase{"ElementForOperand", kCondition + "<equal><argument/>",
-                  "Unexpected element in condition: argument" + kInCondition + kInAssociation},
-        ErrorCase{"OneOperand", kCondition + "<partof>0</partof>",
-                  "Unexpected element in condition: partof" + kInCondition + kInAssociation},
-        ErrorCase{"OtherClosing", kCondition + "<include>0 1</equal>",
-                  "Unexpected element in condition: equal" + kInCondition + kInAssociation},
-        ErrorCase{
-            "OneSubCondition", kCondition + "<and><condition><true/></condition></and>",
-            "Unexpected element in condition: and" + kInCondition + kInCondition + kInAssociation},
-        ErrorCase{"Nested", kCondition + "<or><condition><and><condition><xor>",
-                  "Unexpected element in condition: xor" + kInCondition + kInCondition +
-                      kInCondition + kInAssociation},
-        ErrorCase{
-            "CallOfOperand", kCondition + "<equal><functioncall>1",
-            "function elememt is missing before: 1" + kInCall + kInCondition + kInAssociation}),
-    kCaseName);
+const std::string kInCondition = "\ncondition:\n";
+const std::string kUnexpected = "Unexpected element in condition: ";
+const std::vector<ErrorCase> kConditionErrors = {
+    {"Operator", "<equals>", kUnexpected + "equals"},
+    {"NoOperator", "</condition>", kUnexpected + "condition"},
+    {"ElementForOperand", "<equal><argument/>", kUnexpected + "argument"},
+    {"OneOperand", "<partof>0</partof>", kUnexpected + "partof"},
+    {"OtherClosing", "<include>0 1</equal>", kUnexpected + "equal"},
+    {"OneSubCondition", "<and><condition><true/></condition></and>",
+     kUnexpected + "and" + kInCondition},
+    {"Nested", "<or><condition><and><condition><xor>",
+     kUnexpected + "xor" + kInCondition + kInCondition},
+    {"CallOfOperand", "<equal><functioncall>1", "function elememt is missing before: 1" + kCall}};
+ERRORS(Condition, within(kAssociation + kPair + "<condition>", kInCondition + kInAssociation,
+                         kConditionErrors));
 
 // The elements around a call look at its name before they build it.
 TEST(CallElement, ChecksItsOwnName) {
@@ -209,7 +149,7 @@ TEST(CallElement, ChecksItsOwnName) {
     ProviderDefFunctionCall("<call>", 6, &used, nullptr);
     FAIL() << "no error";
   } catch (const ProviderDefXMLError& error) {
-    EXPECT_EQ(error.getMessage(), "functioncall elememt is missing before: call" + kInCall);
+    EXPECT_EQ(error.getMessage(), "functioncall elememt is missing before: call" + kCall);
   }
 }
 
