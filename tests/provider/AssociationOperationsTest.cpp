@@ -23,7 +23,8 @@ class AssociationOperations : public LinkTest, public testing::WithParamInterfac
   void SetUp() override {
     LinkTest::SetUp();
     start(classes() + association("T_Link", itemsAndParts()) +
-          association("T_Other", itemsAndParts() + itemsAndVolumes()));
+          association("T_Other", itemsAndParts() + itemsAndVolumes()) +
+          association("T_All", pairOf("T_Volume", "Owner", "T_Part", "Owner", "<true/>")));
   }
 
   static CIMName nameOrNull(const char* text) { return *text == '\0' ? CIMName() : CIMName(text); }
@@ -74,8 +75,8 @@ INSTANTIATE_TEST_SUITE_P(
         NamesCase{"AnyAssociation", kItemA, "", "T_Part", {kPart1, kPart1}},
         NamesCase{"AnyResult", kItemA, "", "", {kPart1, kPart1, kPart1}},
         NamesCase{"Foreign", kItemA, "T_Other", "T_Volume", {"T_Volume.Id=1"}},
-        NamesCase{"FromForeign", "root/t:T_Volume.Id=0x1", "", "", {kA}},
-        NamesCase{"ForeignWithoutLink", "root/t:T_Volume.Id=2", "", "", {}},
+        NamesCase{"FromForeign", "root/t:T_Volume.Id=0x1", "T_Other", "", {kA}},
+        NamesCase{"ForeignWithoutLink", "root/t:T_Volume.Id=2", "T_Other", "", {}},
         NamesCase{"ObjectOfAnotherHost", "//h/root/t:T_ITEM.NAME=\"a\"", "T_Link", "", {kPart1}},
         NamesCase{"NoSuchObject", "root/t:T_Item.Name=\"A\"", "T_Link", "", {}},
         NamesCase{"ClassPath", "root/t:T_Item", "T_Link", "", {}}),
@@ -108,7 +109,22 @@ TEST_F(AssociationOperations, AssociatorsAreWholeInstances) {
   EXPECT_THAT(associators(kItemA, "T_Other", "T_Volume").events,
               ElementsAre("processing", "object T_Volume.Id=1 {Owner=string a}", "complete"));
   EXPECT_EQ(host.calls.back(), "getInstance root/t T_Volume.Id=1 0 1 1 null");
-  EXPECT_THAT(associators("root/t:T_Volume.Id=2").events, ElementsAre("processing", "complete"));
+  EXPECT_THAT(associators("root/t:T_Volume.Id=2", "T_Other").events,
+              ElementsAre("processing", "complete"));
+}
+
+TEST_F(AssociationOperations, WhatCannotBeBuiltIsLeftOut) {
+  setTable(state->right, {"a", nullptr, "a"});
+  // Three parts are counted, two can be built.
+  EXPECT_THAT(names("root/t:T_Volume.Id=2", "T_All").events,
+              ElementsAre("processing", kPart0, kPart2, "complete"));
+  setTable(state->right, {"a", "a"});
+  host.calls.clear();
+  // Two items, two parts, and one part for the first path; then the server knows no class any more.
+  host.callLimit = 6;
+  EXPECT_THAT(associators(kItemA, "T_Link").events,
+              ElementsAre("processing", "object " + kPart0 + " {Id=string p 0, Owner=string a}",
+                          "complete"));
 }
 
 TEST_F(AssociationOperations, TracesToStandardOutput) {

@@ -1,5 +1,7 @@
 // Enumeration of defined classes: how many instances, which properties, what drops an instance.
 
+#include <climits>
+
 #include "ProviderTest.h"
 
 using namespace Pegasus;

@@ -4,6 +4,7 @@
 #include <Pegasus/Common/Exception.h>
 #include <Pegasus/Embedded/CIMOMHandleRep.h>
 
+#include <cstdint>
 #include <initializer_list>
 #include <mutex>
 #include <string>
@@ -20,6 +21,9 @@ class TestHost : public Pegasus::CIMOMHandleRep {
   /// "getClass root/t T_Item 0 1 1 null": the flags in the order of the arguments, then the list.
   std::vector<std::string> calls;
 
+  /// From this many calls on, no class is found.
+  size_t callLimit = SIZE_MAX;
+
   Pegasus::CIMClass getClass(const Pegasus::OperationContext&,
                              const Pegasus::CIMNamespaceName& nameSpace,
                              const Pegasus::CIMName& className, Pegasus::Boolean localOnly,
@@ -29,6 +33,7 @@ class TestHost : public Pegasus::CIMOMHandleRep {
     note("getClass", nameSpace, textOf(className.getString()),
          {localOnly, includeQualifiers, includeClassOrigin}, propertyList);
     for (const Pegasus::CIMClass& cimClass : classes_) {
+      if (calls.size() > callLimit) break;
       if (cimClass.getClassName() == className) return cimClass.clone();
     }
     throw Pegasus::CIMException(Pegasus::CIM_ERR_NOT_FOUND, className.getString());
