@@ -1,0 +1,107 @@
+// The reader on bytes that the provider does not write.
+
+#include <gtest/gtest.h>
+
+#include <cstring>
+#include <memory>
+#include <random>
+
+#include "commonprovider/plugin.h"
+
+using namespace std::string_literals;
+
+namespace {
+
+// 1024 bytes of their own, so that a sanitizer sees a read beyond them.
+struct Buffer {
+  explicit Buffer(const std::string& start, char fill = '\0')
+      : bytes(new char[CP_BUFFER_SIZE]), reader(cp_read(bytes.get())) {
+    std::memset(bytes.get(), fill, CP_BUFFER_SIZE);
+    std::memcpy(bytes.get(), start.data(), start.size());
+  }
+  std::unique_ptr<char[]> bytes;
+  cp_reader reader;
+};
+
+std::string ints(size_t count) {
+  std::string result;
+  for (size_t i = 0; i < count; ++i) result += "\0\0\0\0\7\0\0\0"s;
+  return result;
+}
+
+TEST(Reader, RefusesWhatIsNoItem) {
+  const std::pair<std::string, int> cases[] = {
+      {"\4\0\0\0\0\0\0\0"s, CP_BAD_BUFFER},
+      {"\xff\xff\xff\xff\0\0\0\0"s, CP_BAD_BUFFER},
+      {"\1\0\0\0\xff\xff\xff\xff"s, CP_BAD_BUFFER},
+      {"\1\0\0\0\xf8\3\0\0"s, CP_BAD_BUFFER},  // 1016 bytes: the NUL would be behind the end
+      {"\1\0\0\0\2\0\0\0abc\0"s, CP_BAD_BUFFER},
+      {"\1\0\0\0\xf7\3\0\0"s, CP_OK},
+      {"\2\0\0\0\xff\xff\xff\xff"s, CP_BAD_BUFFER},
+      {"\2\0\0\0\x80\0\0\0"s, CP_BAD_BUFFER},
+      {"\2\0\0\0\x7f\0\0\0"s, CP_OK},
+      {"\2\0\0\0\2\0\0\0\0\0\0\0\1\0\0\0\1\0\0\0\0\0\0\0\0"s, CP_BAD_BUFFER},
+      {"\3\0\0\0\1\0\0\0\0\0\0\0\1\0\0\0"s, CP_BAD_BUFFER},
+      {"\3\0\0\0\1\0\0\0\3\0\0\0\0\0\0\0"s, CP_BAD_BUFFER},
+      {"\3\0\0\0\2\0\0\0\1\0\0\0\1\0\0\0a\0\1\0\0\0\xff\3\0\0"s, CP_BAD_BUFFER},
+      {"\x63\0\0\0"s, CP_END}};
+  for (const auto& [bytes, expected] : cases) {
+    Buffer buffer(bytes);
+    cp_item item;
+    EXPECT_EQ(cp_next(&buffer.reader, &item), expected) << testing::PrintToString(bytes);
+    EXPECT_EQ(buffer.reader.at == buffer.bytes.get(), expected != CP_OK);
+  }
+}
+
+TEST(Reader, StopsAtTheBuffersEnd) {
+  const std::pair<std::string, int> cases[] = {
+      {ints(128), CP_END},
+      {ints(127) + "\1\0\0\0\0\0\0\0"s, CP_BAD_BUFFER},
+      {ints(126) + "\1\0\0\0\4\0\0\0abcd\0"s, CP_BAD_BUFFER},  // three bytes are left
+      {ints(126) + "\1\0\0\0\3\0\0\0abc\0\x63\0\0\0"s, CP_END},
+      {ints(126) + "\1\0\0\0\3\0\0\0abc\0\0\0\0\0"s, CP_BAD_BUFFER}};
+  for (const auto& [bytes, expected] : cases) {
+    Buffer buffer(bytes);
+    cp_item item;
+    int status = CP_OK;
+    while (status == CP_OK) status = cp_next(&buffer.reader, &item);
+    EXPECT_EQ(status, expected) << testing::PrintToString(bytes.substr(1000));
+  }
+}
+
+TEST(Reader, TellsTheLengthOfATextWithANul) {
+  Buffer buffer("\1\0\0\0\3\0\0\0a\0b\0\0\0\0\0\5\0\0\0"s);
+  cp_item item;
+  int number = 0;
+  EXPECT_EQ(cp_next(&buffer.reader, &item), CP_OK);
+  EXPECT_EQ(std::string(item.text, item.length), "a\0b"s);
+  EXPECT_EQ(cp_next_int(&buffer.reader, &number), CP_OK);
+  EXPECT_EQ(number, 5);
+}
+
+// Items of random tags, lengths and counts: whatever comes, reading ends and stays inside.
+TEST(Reader, StaysInTheBufferWhateverItHolds) {
+  std::mt19937 random(20260131);
+  const std::uint32_t words[] = {0, 1, 2, 3, 99, 4, 16, 127, 1007, 1015, 1016, 0x7fffffff, ~0u};
+  for (int round = 0; round < 20000; ++round) {
+    Buffer buffer("");
+    for (int i = 0; i < 40; ++i) {
+      const std::uint32_t word = words[random() % (random() % 4 == 0 ? std::size(words) : 4)];
+      std::memcpy(buffer.bytes.get() + random() % 300, &word, sizeof word);
+    }
+    const char* const end = buffer.reader.end;
+    cp_item item, element;
+    for (const char* before = buffer.reader.at; cp_next(&buffer.reader, &item) == CP_OK;) {
+      ASSERT_GT(buffer.reader.at, before);
+      ASSERT_LE(buffer.reader.at, end);
+      before = buffer.reader.at;
+      int count = 0;
+      while (cp_next(&item.elements, &element) == CP_OK) ++count;
+      ASSERT_EQ(count, item.count);
+      ASSERT_EQ(item.elements.at, item.elements.end);
+      ASSERT_TRUE(item.kind != CP_STRING || item.text[item.length] == 0);
+    }
+  }
+}
+
+}  // namespace

@@ -1,0 +1,122 @@
+// Plug-ins written with the header, called by the provider's engine.
+
+#include <gtest/gtest.h>
+
+#include <memory>
+
+#include "commonprovider/plugin.h"
+#include "engine/ProviderDefFunction.h"
+#include "engine/ProviderDefModule.h"
+#include "tests/engine/ValueText.h"
+
+namespace {
+
+// The parameter is the language in which the plug-in was compiled.
+class RoundTrip : public testing::TestWithParam<const char*> {
+ protected:
+  RoundTrip() {
+    const std::string text =
+        std::string("<module name='" TEST_PLUGIN_FOLDER "/libsdk_") + GetParam() + ".so'/>";
+    int consumed = 0;
+    module_.reset(new ProviderDefModule(text.data(), static_cast<int>(text.size()), &consumed));
+  }
+
+  ProviderDefFunction function(const char* name, const char* type) const {
+    return {name, functionTypeCode(type), module_.get()};
+  }
+
+  // The outputs of an execC function as text, and behind them what it returned.
+  std::string exec(const char* name, const Values& inputs) const {
+    Values outputs;
+    const int result = function(name, "execC").exec(inputs, outputs);
+    return valueText(outputs) + "-> " + std::to_string(result);
+  }
+
+  std::unique_ptr<ProviderDefModule> module_;
+};
+
+INSTANTIATE_TEST_SUITE_P(As, RoundTrip, testing::Values("c", "cpp"),
+                         [](const auto& testCase) { return std::string(testCase.param); });
+
+// What an item needs depends on the one before it: every sequence of three.
+TEST_P(RoundTrip, ListsOfEveryShapeComeBack) {
+  const Values shapes{7, "", "ab", Ints(), Ints{1, -2}, Texts(), Texts{"a", "", "bcd"}};
+  Values list;
+  for (size_t i = 0; i < 8 * 8 * 8; ++i) {
+    list.clear();
+    for (const size_t pick : {i / 64, i / 8 % 8, i % 8}) {
+      if (pick < shapes.size()) list.push_back(shapes[pick]);
+    }
+    EXPECT_EQ(exec("echo", list), valueText(list) + "-> 0");
+    EXPECT_EQ(exec("echoWhole", list), valueText(list) + "-> 0");
+  }
+}
+
+TEST_P(RoundTrip, WhatDoesNotFitAListEndsIt) {
+  const auto text = [](size_t size) { return std::string(size, 'x'); };
+  for (const Values& fits :
+       {Values{text(1011)}, Values{text(1003), 5}, Values{Ints(125, 9)}, Values{Texts{text(979)}},
+        Values{7, Texts{text(971)}}, Values{text(491), Texts{text(479)}}}) {
+    EXPECT_EQ(exec("echo", fits), valueText(fits) + "-> 0");
+    EXPECT_EQ(exec("echoWhole", fits), valueText(fits) + "-> 0");
+  }
+  const Values over{7, Texts{text(972)}, 8};
+  EXPECT_EQ(exec("echoWhole", over), "0 7; -> 4") << "8 is not the second parameter";
+  EXPECT_EQ(exec("echo", over), "0 7; 3 {}; 0 8; -> 0") << "only the element is left out";
+}
+
+TEST_P(RoundTrip, ResultsFillTheBufferAndNoMore) {
+  const struct {
+    const char *function, *type;
+    int most;
+  } cases[] = {{"textOf", "getSi", 1023}, {"intsOf", "getAIi", 127}, {"stringsOf", "getASi", 974}};
+  for (const auto& c : cases) {
+    const ProviderDefValue full = function(c.function, c.type).get(ProviderDefValue(c.most));
+    const ProviderDefValue empty = function(c.function, c.type).get(ProviderDefValue(c.most + 1));
+    const size_t size = full.getStringValue().size() + full.getIntArray().size() +
+                        (full.getStringArray().empty() ? 0 : full.getStringArray()[0].size());
+    EXPECT_EQ(size, static_cast<size_t>(c.most)) << c.function;
+    EXPECT_EQ(full.getStringArray().size(), full.getType() == 3 ? 2u : 0u) << c.function;
+    EXPECT_EQ(empty.getType(), full.getType()) << c.function;
+    EXPECT_EQ(
+        empty.getStringValue().size() + empty.getIntArray().size() + empty.getStringArray().size(),
+        0u)
+        << c.function;
+  }
+}
+
+TEST_P(RoundTrip, ArraysGoInAndComeOut) {
+  for (const Ints& ints : {Ints(), Ints{0}, Ints{-1, 258, 99}, Ints(127, 5)}) {
+    EXPECT_EQ(function("keepInts", "setAI").set(ProviderDefValue(ints)), CP_OK);
+    EXPECT_EQ(function("keptInts", "getAI").get().getIntArray(), ints);
+  }
+  const std::string half(490, 'x');
+  for (const auto& [given, expected] :
+       {std::pair(Texts{}, Texts{}), std::pair(Texts{"", "a", ""}, Texts{"", "a", ""}),
+        std::pair(Texts{half, half, "y"}, Texts{half, "y"})}) {
+    EXPECT_EQ(function("echoStrings", "getASv").get(ProviderDefValue(given)).getStringArray(),
+              expected);
+  }
+}
+
+TEST_P(RoundTrip, AListWithoutAnEndMarkIsRead) {
+  const Values list{7, "ab", Ints{1, 2}, Texts{"c", ""}};
+  EXPECT_EQ(function("kindsOf", "getAIv").get(list).getIntArray(), (Ints{0, 1, 2, 3}));
+}
+
+TEST_P(RoundTrip, AnItemOfAnotherKindStays) {
+  const std::pair<const char*, ProviderDefValue> kinds[] = {
+      {"i", 5}, {"s", "five"}, {"I", Ints{5, 6, 7}}, {"S", Texts{"five"}}};
+  for (const auto& [asked, unused] : kinds) {
+    for (const auto& [given, value] : kinds) {
+      EXPECT_EQ(function("nextOf", "execBw").exec(asked, Values{value}),
+                asked == given ? CP_OK : CP_WRONG_KIND)
+          << asked << given;
+    }
+    EXPECT_EQ(function("nextOf", "execBw").exec(asked, Values()), CP_END);
+  }
+  EXPECT_EQ(function("nextOf", "execBw").exec("t", Values{Ints{5, 6, 7}}), CP_NO_SPACE);
+  EXPECT_EQ(function("nextOf", "execBw").exec("t", Values{Ints{5, 6}}), CP_OK);
+}
+
+}  // namespace

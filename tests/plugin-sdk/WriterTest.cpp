@@ -1,0 +1,161 @@
+// What the header writes: as bytes, and where the buffer ends.
+
+#include "tests/engine/RecorderTest.h"
+
+#include "commonprovider/plugin.h"
+
+#include <functional>
+
+using namespace std::string_literals;
+
+namespace {
+
+// A buffer full of question marks, with more of them behind it.
+struct Buffer {
+  std::string bytes = std::string(CP_BUFFER_SIZE + 64, '?');
+
+  /// What was written, up to the last byte that is no question mark.
+  std::string written() const {
+    EXPECT_EQ(bytes.substr(CP_BUFFER_SIZE), std::string(64, '?'));
+    return bytes.substr(0, bytes.find_last_not_of('?') + 1);
+  }
+};
+
+const std::string kGap(CP_STRING_GAP, '?');
+const char* const kTexts[] = {"a", "bc"};
+const int kInts[] = {7, -1};
+
+TEST(Writer, LaysListsAsTheProviderReadsThem) {
+  const std::pair<std::function<void(cp_writer*)>, std::string> cases[] = {
+      {[](cp_writer*) {}, "\x63\0\0\0"s},
+      {[](cp_writer* w) { cp_put_int(w, -2); }, "\0\0\0\0\xfe\xff\xff\xff\x63\0\0\0"s},
+      {[](cp_writer* w) { cp_put_string(w, "ok"); }, "\1\0\0\0\2\0\0\0ok\0\x63\0\0\0"s},
+      {[](cp_writer* w) {
+         cp_put_string(w, "ok");
+         cp_put_int(w, 5);
+       },
+       "\1\0\0\0\2\0\0\0ok\0\0\0\0\5\0\0\0\x63\0\0\0"s},
+      {[](cp_writer* w) {
+         cp_put_string(w, "ok");
+         cp_put_string(w, "");
+         cp_put_ints(w, kInts, 1);
+       },
+       "\1\0\0\0\2\0\0\0ok\0\1\0\0\0\0\0\0\0\0\2\0\0\0\1\0\0\0\0\0\0\0\x07\0\0\0\x63\0\0\0"s},
+      {[](cp_writer* w) {
+         cp_put_strings(w, kTexts, 2);
+         cp_put_int(w, 5);
+       },
+       "\3\0\0\0\2\0\0\0\1\0\0\0\1\0\0\0a\0"s + kGap + "\1\0\0\0\2\0\0\0bc\0"s + kGap +
+           "\0\0\0\0\5\0\0\0\x63\0\0\0"s},
+      {[](cp_writer* w) {
+         cp_put_strings(w, nullptr, 0);
+         cp_put_string(w, "x");
+       },
+       "\3\0\0\0\0\0\0\0\1\0\0\0\1\0\0\0x\0\x63\0\0\0"s}};
+  for (const auto& [write, expected] : cases) {
+    Buffer buffer;
+    cp_writer writer = cp_write_list(&buffer.bytes[0]);
+    write(&writer);
+    EXPECT_EQ(cp_finish(&writer), CP_OK);
+    EXPECT_EQ(buffer.written(), expected);
+  }
+}
+
+TEST(Writer, LaysResultsAsTheProviderReadsThem) {
+  Buffer text, ints, texts;
+  EXPECT_EQ(cp_return_string(&text.bytes[0], "abc"), CP_OK);
+  EXPECT_EQ(text.written(), "abc\0"s);
+  EXPECT_EQ(cp_return_ints(&ints.bytes[0], kInts, 2), CP_OK);
+  EXPECT_EQ(ints.written(), "\2\0\0\0\2\0\0\0\0\0\0\0\x07\0\0\0\0\0\0\0\xff\xff\xff\xff"s);
+  EXPECT_EQ(cp_return_strings(&texts.bytes[0], kTexts, 2), CP_OK);
+  EXPECT_EQ(texts.written(),
+            "\3\0\0\0\2\0\0\0\1\0\0\0\1\0\0\0a\0"s + kGap + "\1\0\0\0\2\0\0\0bc\0"s);
+}
+
+TEST(Writer, RefusesWhatDoesNotBelongThere) {
+  Buffer buffer;
+  cp_writer list = cp_write_list(&buffer.bytes[0]);
+  EXPECT_EQ(cp_add_int(&list, 1), CP_WRONG_KIND);
+  cp_begin_ints(&list);
+  EXPECT_EQ(cp_add_string(&list, "a"), CP_WRONG_KIND);
+  cp_put_int(&list, 1);
+  EXPECT_EQ(cp_add_int(&list, 1), CP_WRONG_KIND) << "closed by the item behind it";
+  cp_writer ints = cp_write_ints(&buffer.bytes[0]);
+  EXPECT_EQ(cp_put_int(&ints, 1), CP_WRONG_KIND);
+  EXPECT_EQ(cp_begin_strings(&ints), CP_WRONG_KIND);
+  EXPECT_EQ(cp_add_int(&ints, 1), CP_OK);
+  EXPECT_EQ(buffer.bytes.substr(0, 16), "\2\0\0\0\1\0\0\0\0\0\0\0\1\0\0\0"s);
+}
+
+class WriterAtTheEnd : public RecorderTest {
+ protected:
+  std::string read(const Buffer& buffer) {
+    buffer.written();
+    answer(buffer.bytes.substr(0, CP_BUFFER_SIZE));
+    Values outputs;
+    EXPECT_EQ(errorOf([&] { function("execC").exec(Values(), outputs); }), "");
+    return valueText(outputs);
+  }
+};
+
+struct Step {
+  std::function<int(cp_writer*)> write;
+  ProviderDefValue value;
+  int most;  // Bytes of a text before it, so that it still fits.
+};
+
+// A text of every length, then one more item: it arrives whole or not at all, and so does the list.
+TEST_F(WriterAtTheEnd, EveryItemFitsToTheLastByte) {
+  const Step steps[] = {
+      {[](cp_writer* w) { return cp_put_int(w, 5); }, 5, 1011 - 7},
+      {[](cp_writer* w) { return cp_put_string(w, "abc"); }, "abc", 1011 - 12},
+      {[](cp_writer* w) { return cp_put_ints(w, kInts, 2); }, Ints{7, -1}, 1011 - 24},
+      {[](cp_writer* w) { return cp_put_strings(w, kTexts, 2); }, Texts{"a", "bc"}, 1011 - 77},
+      {[](cp_writer* w) { return cp_begin_ints(w); }, Ints(), 1011 - 8},
+      {[](cp_writer* w) { return cp_begin_strings(w); }, Texts(), 1011 - 8}};
+  for (const Step& step : steps) {
+    for (int length = 900; length <= 1013; ++length) {
+      const std::string text(static_cast<size_t>(length), 'x');
+      Buffer buffer;
+      cp_writer writer = cp_write_list(&buffer.bytes[0]);
+      const int first = cp_put_string(&writer, text.c_str());
+      const int second = step.write(&writer);
+      EXPECT_EQ(first, length <= 1011 ? CP_OK : CP_NO_SPACE);
+      EXPECT_EQ(second, length <= step.most ? CP_OK : CP_NO_SPACE) << length;
+      EXPECT_EQ(cp_put_int(&writer, 1) == CP_OK && second != CP_OK, false) << "gap before an item";
+      EXPECT_EQ(read(buffer).substr(0, 2), first == CP_OK ? "1 " : "") << "without cp_finish";
+      if (second == CP_OK) continue;
+      EXPECT_EQ(cp_finish(&writer), CP_NO_SPACE);
+      EXPECT_EQ(read(buffer), first == CP_OK ? "1 " + text + "; " : "");
+    }
+    Buffer buffer;
+    cp_writer writer = cp_write_list(&buffer.bytes[0]);
+    const std::string text(static_cast<size_t>(step.most), 'x');
+    cp_put_string(&writer, text.c_str());
+    step.write(&writer);
+    EXPECT_EQ(cp_finish(&writer), CP_OK);
+    EXPECT_EQ(read(buffer), valueText(Values{text, step.value}));
+  }
+}
+
+// Elements added one by one until none fits; the array keeps those that did.
+TEST_F(WriterAtTheEnd, ArraysKeepWhatFits) {
+  Buffer buffer;
+  cp_writer ints = cp_write_list(&buffer.bytes[0]);
+  cp_begin_ints(&ints);
+  int count = 0;
+  while (cp_add_int(&ints, 3) == CP_OK) ++count;
+  EXPECT_EQ(count, 126);
+  EXPECT_EQ(cp_put_int(&ints, 5), CP_NO_SPACE);
+  EXPECT_EQ(read(buffer), valueText(Values{Ints(126, 3)}));
+
+  cp_writer texts = cp_write_list(&buffer.bytes[0]);
+  cp_begin_strings(&texts);
+  for (count = 0; cp_add_string(&texts, "name") == CP_OK;) ++count;
+  EXPECT_EQ(count, (1024 - 8 - 4) / 37);
+  EXPECT_EQ(cp_add_string(&texts, std::string(100000, 'x').c_str()), CP_NO_SPACE);
+  EXPECT_EQ(cp_finish(&texts), CP_OK);
+  EXPECT_EQ(read(buffer), valueText(Values{Texts(27, "name")}));
+}
+
+}  // namespace

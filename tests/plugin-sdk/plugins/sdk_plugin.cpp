@@ -1,0 +1,2 @@
+// The header as C++ sees it.
+#include "sdk_plugin.c"
