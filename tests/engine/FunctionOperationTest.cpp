@@ -201,7 +201,8 @@ TEST_P(FunctionOperation, RefusesExtraValuesOfAnotherType) {
       const int type = extra.getType();
       const int suffix = code % 10;
       const bool fits = suffix == 0 || (suffix == 3 ? type == 2 || type == 3 : type == suffix - 1);
-      const std::string name = function_type_name_table[functionTypeSlot(code)];
+      const std::string name =
+          function_type_name_table[static_cast<size_t>(functionTypeSlot(code))];
       const std::string expected = prepare(code);
       const ProviderDefValue result = operation.run(function(name), 0, extra);
       EXPECT_EQ(recorder_->calls, fits ? 1 : 0) << name << " " << valueText(extra);
