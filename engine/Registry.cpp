@@ -49,19 +49,24 @@ class NamedList {
   std::unordered_map<std::string_view, T*> byName_;  // the names belong to the objects
 };
 
+// At the end of a process that never released them the modules go before the functions, since a
+// module looks through the functions when it goes.
+struct Registries {
+  NamedList<ProviderDefFunction> functions;
+  NamedList<ProviderDefModule> modules;
+  std::vector<std::unique_ptr<ProviderDefFunctionCall>> initCalls;
+};
+
+Registries& registries() {
+  static Registries all;
+  return all;
+}
+
 NamedList<ProviderDefModule>& modules() {
-  static NamedList<ProviderDefModule> list;
-  return list;
+  return registries().modules;
 }
-
 NamedList<ProviderDefFunction>& functions() {
-  static NamedList<ProviderDefFunction> list;
-  return list;
-}
-
-std::vector<std::unique_ptr<ProviderDefFunctionCall>>& initCalls() {
-  static std::vector<std::unique_ptr<ProviderDefFunctionCall>> list;
-  return list;
+  return registries().functions;
 }
 
 }  // namespace
@@ -89,6 +94,10 @@ ProviderDefFunction* getFunction(const std::string& name) {
   return function;
 }
 
+const std::vector<std::unique_ptr<ProviderDefModule>>& registeredModules() {
+  return modules().objects();
+}
+
 ProviderDefModule* registerModule(std::unique_ptr<ProviderDefModule> module) {
   return modules().add(std::move(module));
 }
@@ -105,8 +114,8 @@ ProviderDefFunction* registerNewFunction(std::unique_ptr<ProviderDefFunction> fu
 }
 
 ProviderDefFunctionCall* keepInitCall(std::unique_ptr<ProviderDefFunctionCall> call) {
-  initCalls().push_back(std::move(call));
-  return initCalls().back().get();
+  registries().initCalls.push_back(std::move(call));
+  return registries().initCalls.back().get();
 }
 
 size_t functionCount() {
@@ -127,5 +136,5 @@ void releaseFunctions() {
 void releaseModules() {
   modules().clear();
   releaseDefinitions();
-  initCalls().clear();
+  registries().initCalls.clear();
 }
