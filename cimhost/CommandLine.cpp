@@ -19,9 +19,11 @@ using ParseTarget = Pegasus::CIMObjectPath (*)(const std::string&);
 constexpr const char* kFooter =
     "Paths are written as root/host:Host_FileSystem.Name=\"/\"\n"
     "\n"
-    "Exit codes: 0 done; 1 check found errors; 2 usage or malformed path; 3 home directory or\n"
-    "provider library unusable; 4 results could not be written; 10 + CIM status code when the\n"
-    "operation failed, for example 16 for CIM_ERR_NOT_FOUND.";
+    "Values are written as NAME=VALUE; NAME alone is null. Arrays: NAME=a,b or NAME=[]\n"
+    "\n"
+    "Exit codes: 0 done; 1 check or dump found errors; 2 usage, malformed path, value that does\n"
+    "not fit; 3 home directory or provider library unusable; 4 results could not be written;\n"
+    "10 + CIM status code when the operation failed, for example 16 for CIM_ERR_NOT_FOUND.";
 
 struct FormatRow {
   const char* name;
@@ -36,6 +38,24 @@ struct Arguments {
   std::string format = "table";
   std::string target;
   std::vector<std::string> properties;
+  std::string associationClass;
+  std::string resultClass;
+  std::string role;
+  std::string resultRole;
+};
+
+// Groups of options, as bits.
+enum Options : unsigned {
+  kNone = 0,
+  kSelection = 1,   // which parts of instances or classes
+  kLocal = 2,       // --local-only
+  kInstances = 4,   // --deep, for instances
+  kClasses = 8,     // --deep, for classes
+  kFilter = 16,     // --result-class and --role
+  kFarFilter = 32,  // --assoc-class and --result-role
+  kValues = 64,     // NAME=VALUE..., at least one
+  kMethod = 128,    // METHOD [NAME=VALUE...]
+  kFiles = 256      // [FILE...]
 };
 
 struct CommandRow {
@@ -44,22 +64,41 @@ struct CommandRow {
   const char* description;
   const char* argument;  // Null: takes none.
   ParseTarget parse;
+  unsigned options;
 };
 
 constexpr CommandRow kCommands[] = {
     {Command::enumerate, "enumerate", "Instances of a class and its subclasses", "NS:CLASS",
-     parseClassPath},
-    {Command::names, "names", "Object paths of the instances", "NS:CLASS", parseClassPath},
-    {Command::get, "get", "One instance", "PATH", parseInstancePath},
-    {Command::declaration, "class", "A class declaration", "NS:CLASS", parseClassPath},
+     parseClassPath, kSelection | kLocal | kInstances},
+    {Command::names, "names", "Object paths of the instances", "NS:CLASS", parseClassPath, kNone},
+    {Command::get, "get", "One instance", "PATH", parseInstancePath, kSelection | kLocal},
+    {Command::modify, "modify", "Write properties of one instance", "PATH", parseInstancePath,
+     kValues},
+    {Command::invoke, "invoke", "Call a method of an instance or a class", "PATH", parseObjectPath,
+     kMethod},
+    {Command::associators, "associators", "Instances that associations link to one instance",
+     "PATH", parseInstancePath, kSelection | kFilter | kFarFilter},
+    {Command::associatorNames, "associator-names", "Object paths of these instances", "PATH",
+     parseInstancePath, kFilter | kFarFilter},
+    {Command::references, "references", "Instances of association classes that link one instance",
+     "PATH", parseInstancePath, kSelection | kFilter},
+    {Command::referenceNames, "reference-names", "Object paths of these instances", "PATH",
+     parseInstancePath, kFilter},
+    {Command::declaration, "class", "A class declaration", "NS:CLASS", parseClassPath,
+     kSelection | kLocal},
     {Command::classes, "classes", "The classes of a namespace, or below a class", "NS[:CLASS]",
-     parseNamespaceOrClass},
+     parseNamespaceOrClass, kClasses},
     {Command::check, "check", "Report every problem in the files of the home directory", nullptr,
-     nullptr}};
+     nullptr, kNone},
+    {Command::dump, "dump", "Print what definition files define; default: all of run/", nullptr,
+     nullptr, kFiles}};
 
-void addInstanceOptions(CLI::App& app, CommandLine& line, Arguments& arguments) {
-  app.add_flag("--local-only,!--no-local-only", line.localOnly,
-               "Leave out properties that the class inherits");
+CLI::Option* addText(CLI::App& app, const char* name, std::string& value, const char* description,
+                     const char* type) {
+  return app.add_option(name, value, description)->type_name(type);
+}
+
+void addSelectionOptions(CLI::App& app, CommandLine& line, Arguments& arguments) {
   app.add_flag("--qualifiers,!--no-qualifiers", line.includeQualifiers, "Include qualifiers");
   app.add_flag("--class-origin,!--no-class-origin", line.includeClassOrigin,
                "Include class origins");
@@ -68,21 +107,48 @@ void addInstanceOptions(CLI::App& app, CommandLine& line, Arguments& arguments) 
       ->allow_extra_args(false);
 }
 
+void addFilterOptions(CLI::App& app, unsigned options, Arguments& arguments) {
+  if ((options & kFarFilter) != 0) {
+    addText(app, "--assoc-class", arguments.associationClass,
+            "Only along this association class and its subclasses", "CLASS");
+    addText(app, "--result-role", arguments.resultRole, "Only results in this role", "NAME");
+  }
+  addText(app, "--result-class", arguments.resultClass, "Only this class and its subclasses",
+          "CLASS");
+  addText(app, "--role", arguments.role, "Only where the object itself has this role", "NAME");
+}
+
+void addValueArguments(CLI::App& app, unsigned options, CommandLine& line) {
+  if ((options & kMethod) != 0) addText(app, "METHOD", line.method, "", "")->required();
+  CLI::Option* values =
+      app.add_option("NAME=VALUE", line.values, "May be repeated; NAME alone is null")
+          ->type_name("");
+  if ((options & kValues) != 0) values->required();
+}
+
 void addCommand(CLI::App& app, const CommandRow& row, CommandLine& line, Arguments& arguments) {
   CLI::App& command = *app.add_subcommand(row.name, row.description);
   command.fallthrough();
   command.callback([&line, &row] { line.command = row.command; });
-  if (row.argument == nullptr) return;
-  command.add_option(row.argument, arguments.target)->required()->type_name("");
-  const bool instances = row.command == Command::enumerate || row.command == Command::get;
-  if (instances || row.command == Command::declaration)
-    addInstanceOptions(command, line, arguments);
-  if (row.command == Command::enumerate || row.command == Command::classes) {
+  if (row.argument != nullptr) {
+    addText(command, row.argument, arguments.target, "", "")->required();
+  }
+  if ((row.options & kLocal) != 0) {
+    command.add_flag("--local-only,!--no-local-only", line.localOnly,
+                     "Leave out properties that the class inherits");
+  }
+  if ((row.options & kSelection) != 0) addSelectionOptions(command, line, arguments);
+  if ((row.options & (kInstances | kClasses)) != 0) {
     command.add_flag("--deep,!--no-deep", line.deep,
-                     row.command == Command::enumerate
+                     (row.options & kInstances) != 0
                          ? "Include properties of subclasses (default)"
                          : "Include subclasses of subclasses (default)");
   }
+  if ((row.options & (kFilter | kFarFilter)) != 0) {
+    addFilterOptions(command, row.options, arguments);
+  }
+  if ((row.options & (kValues | kMethod)) != 0) addValueArguments(command, row.options, line);
+  if ((row.options & kFiles) != 0) command.add_option("FILE", line.files)->type_name("");
 }
 
 void addGlobalOptions(CLI::App& app, CommandLine& line, Arguments& arguments) {
@@ -104,6 +170,20 @@ Pegasus::CIMPropertyList toPropertyList(const std::vector<std::string>& names) {
   return Pegasus::CIMPropertyList(list);
 }
 
+Pegasus::CIMName toName(const std::string& name) {
+  return name.empty() ? Pegasus::CIMName() : Pegasus::CIMName(fromUtf8(name));
+}
+
+// For references the class of the results is that of the associations.
+AssociationFilter toFilter(const Arguments& arguments, Command command) {
+  AssociationFilter filter{toName(arguments.associationClass), toName(arguments.resultClass),
+                           fromUtf8(arguments.role), fromUtf8(arguments.resultRole)};
+  if (command == Command::references || command == Command::referenceNames) {
+    std::swap(filter.associationClass, filter.resultClass);
+  }
+  return filter;
+}
+
 // Throws PathArgumentError and Pegasus::Exception.
 void convertArguments(const Arguments& arguments, CommandLine& line) {
   for (const FormatRow& row : kFormats) {
@@ -115,6 +195,7 @@ void convertArguments(const Arguments& arguments, CommandLine& line) {
     }
   }
   line.properties = toPropertyList(arguments.properties);
+  line.filter = toFilter(arguments, line.command);
 }
 
 }  // namespace

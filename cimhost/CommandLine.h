@@ -1,5 +1,6 @@
 #pragma once
 
+#include "cimhost/Requests.h"
 #include "cimhost/output/ResultWriter.h"
 
 #include <Pegasus/Common/CIMObjectPath.h>
@@ -8,14 +9,15 @@
 #include <optional>
 #include <ostream>
 #include <string>
+#include <vector>
 
 namespace cimhost {
 
 /// Exit codes of the program. An operation that fails with CIM status c gives kOperation + c.
 struct ExitCode {
   static constexpr int kOk = 0;
-  static constexpr int kProblems = 1;     ///< check found errors
-  static constexpr int kUsage = 2;        ///< command line, malformed path
+  static constexpr int kProblems = 1;     ///< check or dump found errors
+  static constexpr int kUsage = 2;        ///< command line, malformed path, value that does not fit
   static constexpr int kCannotStart = 3;  ///< home directory or provider library
   static constexpr int kOutput = 4;       ///< results could not be written
   static constexpr int kOperation = 10;
@@ -23,19 +25,38 @@ struct ExitCode {
 
 /// What the program is asked to do, checked as far as possible without a home directory.
 struct CommandLine {
-  enum class Command { enumerate, names, get, declaration, classes, check };
+  enum class Command {
+    enumerate,
+    names,
+    get,
+    modify,
+    invoke,
+    associators,
+    associatorNames,
+    references,
+    referenceNames,
+    declaration,
+    classes,
+    check,
+    dump
+  };
 
   Command command = Command::check;
   std::string home;
   std::string providerFile;  ///< Empty: search for it.
   OutputFormat format = OutputFormat::table;
   bool trace = false;
-  Pegasus::CIMObjectPath target;  ///< Host empty; class null for `classes NS`; nothing for `check`.
+  Pegasus::CIMObjectPath
+      target;  ///< Host empty; class null for `classes NS`. None for `check` and `dump`.
   bool deep = true;
   bool localOnly = false;
   bool includeQualifiers = false;
   bool includeClassOrigin = false;
   Pegasus::CIMPropertyList properties;  ///< Null unless given.
+  AssociationFilter filter;
+  std::string method;
+  std::vector<std::string> values;  ///< NAME=VALUE of `modify` and `invoke`.
+  std::vector<std::string> files;   ///< Of `dump`.
 };
 
 /// Reads the command line. No value: help was asked for and went to `out` (exitCode kOk), or the

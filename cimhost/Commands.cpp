@@ -1,10 +1,13 @@
 #include "cimhost/Commands.h"
 
+#include "cimhost/DefinitionFiles.h"
+#include "cimhost/RequestArguments.h"
 #include "cimhost/output/DisplayText.h"
 
 #include <unistd.h>
 
 #include <algorithm>
+#include <cstdio>
 #include <string>
 
 namespace cimhost {
@@ -14,17 +17,25 @@ namespace {
 using Command = CommandLine::Command;
 
 // Knows whether anything came: what a failed operation delivered before is still closed properly.
-class CountingWriter final : public ResultWriter {
+// Leaves out the host's own name, so that a printed path can be given to the next command.
+class CommandWriter final : public ResultWriter {
  public:
-  explicit CountingWriter(std::unique_ptr<ResultWriter> writer) : writer_(std::move(writer)) {}
+  CommandWriter(std::unique_ptr<ResultWriter> writer, Pegasus::String hostName)
+      : writer_(std::move(writer)), hostName_(std::move(hostName)) {}
 
   bool deliverInstance(const Pegasus::CIMInstance& instance) override {
     any_ = true;
-    return writer_->deliverInstance(instance);
+    Pegasus::CIMObjectPath path = instance.getPath();
+    if (!leaveOutHost(path)) return writer_->deliverInstance(instance);
+    Pegasus::CIMInstance printed = instance.clone();
+    printed.setPath(path);
+    return writer_->deliverInstance(printed);
   }
   bool deliverPath(const Pegasus::CIMObjectPath& path) override {
     any_ = true;
-    return writer_->deliverPath(path);
+    Pegasus::CIMObjectPath printed = path;
+    leaveOutHost(printed);
+    return writer_->deliverPath(printed);
   }
   bool deliverClass(const Pegasus::CIMClass& declaration) override {
     any_ = true;
@@ -34,12 +45,24 @@ class CountingWriter final : public ResultWriter {
     any_ = true;
     return writer_->deliverClassName(name);
   }
+  bool deliverMethodResult(const Pegasus::CIMValue& returnValue,
+                           const Pegasus::Array<Pegasus::CIMParamValue>& parameters) override {
+    any_ = true;
+    return writer_->deliverMethodResult(returnValue, parameters);
+  }
   void finish() override { writer_->finish(); }
 
   bool any() const { return any_; }
 
  private:
+  bool leaveOutHost(Pegasus::CIMObjectPath& path) const {
+    if (path.getHost().size() == 0 || path.getHost() != hostName_) return false;
+    path.setHost(Pegasus::String());
+    return true;
+  }
+
   std::unique_ptr<ResultWriter> writer_;
+  Pegasus::String hostName_;
   bool any_ = false;
 };
 
@@ -64,8 +87,38 @@ OperationStatus listClasses(const CommandLine& line, const Operations& operation
   return operations.enumerateClasses({nameSpace, className, line.deep, true, true, false}, writer);
 }
 
-OperationStatus runOperationCommand(const CommandLine& line, const Operations& operations,
+OperationStatus findClass(const CommandLine& line, const Host& host,
+                          Pegasus::CIMClass& declaration) {
+  return runOperation([&] {
+    declaration = host.repository().getClass(line.target.getNameSpace(), line.target.getClassName(),
+                                             false, true, true, Pegasus::CIMPropertyList());
+  });
+}
+
+// Throws ValueArgumentError before anything is asked of the provider.
+OperationStatus modify(const CommandLine& line, const Host& host,
+                       const Pegasus::OperationContext& context) {
+  Pegasus::CIMClass declaration;
+  OperationStatus status = findClass(line, host, declaration);
+  // Of an instance's class, unlike the target of a method, this is what a client is told.
+  if (status.code == Pegasus::CIM_ERR_NOT_FOUND) status.code = Pegasus::CIM_ERR_INVALID_CLASS;
+  if (!status.ok()) return status;
+  return host.operations().modifyInstance(context,
+                                          makeModifyRequest(declaration, line.target, line.values));
+}
+
+OperationStatus invoke(const CommandLine& line, const Host& host,
+                       const Pegasus::OperationContext& context, ResultWriter& writer) {
+  Pegasus::CIMClass declaration;
+  const OperationStatus status = findClass(line, host, declaration);
+  if (!status.ok()) return status;
+  return host.operations().invokeMethod(
+      context, makeInvokeRequest(declaration, line.target, line.method, line.values), writer);
+}
+
+OperationStatus runOperationCommand(const CommandLine& line, const Host& host,
                                     ResultWriter& writer) {
+  const Operations& operations = host.operations();
   const Pegasus::OperationContext context = makeContext(userName());
   const Pegasus::CIMNamespaceName& nameSpace = line.target.getNameSpace();
   const Pegasus::CIMName& className = line.target.getClassName();
@@ -77,6 +130,20 @@ OperationStatus runOperationCommand(const CommandLine& line, const Operations& o
       return operations.enumerateInstanceNames(context, {nameSpace, className}, writer);
     case Command::get:
       return operations.getInstance(context, {nameSpace, line.target, selectionOf(line)}, writer);
+    case Command::modify:
+      return modify(line, host, context);
+    case Command::invoke:
+      return invoke(line, host, context, writer);
+    case Command::associators:
+      return operations.associators(
+          context, {nameSpace, line.target, line.filter, selectionOf(line)}, writer);
+    case Command::associatorNames:
+      return operations.associatorNames(context, {nameSpace, line.target, line.filter}, writer);
+    case Command::references:
+      return operations.references(
+          context, {nameSpace, line.target, line.filter, selectionOf(line)}, writer);
+    case Command::referenceNames:
+      return operations.referenceNames(context, {nameSpace, line.target, line.filter}, writer);
     case Command::declaration:
       return operations.getClass({nameSpace, className, line.localOnly, line.includeQualifiers,
                                   line.includeClassOrigin, line.properties},
@@ -84,9 +151,16 @@ OperationStatus runOperationCommand(const CommandLine& line, const Operations& o
     case Command::classes:
       return listClasses(line, operations, writer);
     case Command::check:
+    case Command::dump:
       break;
   }
   return {};
+}
+
+ResultForm formOf(Command command) {
+  const bool single =
+      command == Command::get || command == Command::invoke || command == Command::declaration;
+  return single ? ResultForm::single : ResultForm::list;
 }
 
 std::string counted(std::ptrdiff_t count, const std::string& noun) {
@@ -96,17 +170,31 @@ std::string counted(std::ptrdiff_t count, const std::string& noun) {
 }  // namespace
 
 bool needsProvider(Command command) {
-  return command == Command::enumerate || command == Command::names || command == Command::get;
+  switch (command) {
+    case Command::declaration:
+    case Command::classes:
+    case Command::check:
+    case Command::dump:
+      return false;
+    default:
+      return true;
+  }
 }
 
 int runCommand(const CommandLine& line, const Host& host, std::ostream& out, std::ostream& error) {
   if (line.command == Command::check) return runCheck(host, out);
   for (const Diagnostic& problem : host.diagnostics()) error << problem.toString() << '\n';
-  const bool single = line.command == Command::get || line.command == Command::declaration;
-  CountingWriter writer(
-      makeResultWriter(line.format, out, single ? ResultForm::single : ResultForm::list));
-  const OperationStatus status = runOperationCommand(line, host.operations(), writer);
-  if (status.ok() || writer.any()) writer.finish();
+  CommandWriter writer(makeResultWriter(line.format, out, formOf(line.command)),
+                       host.operations().hostName());
+  OperationStatus status;
+  try {
+    status = runOperationCommand(line, host, writer);
+  } catch (const ValueArgumentError& problem) {
+    error << "cimhost: " << problem.what() << '\n';
+    return ExitCode::kUsage;
+  }
+  const bool hasResult = line.command != Command::modify;
+  if ((status.ok() && hasResult) || writer.any()) writer.finish();
   if (!status.ok()) {
     error << "cimhost: " << displayText(status.toString()) << '\n';
     return ExitCode::kOperation + static_cast<int>(status.code);
@@ -116,6 +204,24 @@ int runCommand(const CommandLine& line, const Host& host, std::ostream& out, std
     return ExitCode::kOutput;
   }
   return ExitCode::kOk;
+}
+
+int runDump(const CommandLine& line, std::ostream& error) {
+  const Home home(line.home);
+  std::vector<Diagnostic> problems;
+  if (line.files.empty()) {
+    home.enterRun();
+    problems = dumpDefinitions(findDefinitionFiles("."), "run/");
+  } else {
+    problems = dumpDefinitions(line.files, "");
+  }
+  const bool written = std::fflush(stdout) == 0 && std::ferror(stdout) == 0;
+  for (const Diagnostic& problem : problems) error << problem.toString() << '\n';
+  if (!written) {
+    error << "cimhost: the dumps could not be written\n";
+    return ExitCode::kOutput;
+  }
+  return problems.empty() ? ExitCode::kOk : ExitCode::kProblems;
 }
 
 int runCheck(const Host& host, std::ostream& out) {

@@ -17,4 +17,9 @@ int runCommand(const CommandLine& line, const Host& host, std::ostream& out, std
 /// All that is wrong in the home directory's files, and a line that counts it; kOk without errors.
 int runCheck(const Host& host, std::ostream& out);
 
+/// Dumps the files that are named, or all of the home directory's run/, on standard output, which
+/// must still be the program's own; problems go to `error`. Throws HostError for an unusable home
+/// directory.
+int runDump(const CommandLine& line, std::ostream& error);
+
 }  // namespace cimhost

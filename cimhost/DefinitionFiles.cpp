@@ -71,4 +71,13 @@ std::vector<Diagnostic> readDefinitions(const std::string& folder, ServedClasses
   return diagnostics;
 }
 
+std::vector<Diagnostic> dumpDefinitions(const std::vector<std::string>& files,
+                                        const std::string& folder) {
+  std::vector<Diagnostic> diagnostics;
+  for (const definition::Problem& problem : definition::dumpDefinitionFiles(files)) {
+    diagnostics.push_back(toDiagnostic(problem, folder));
+  }
+  return diagnostics;
+}
+
 }  // namespace cimhost

@@ -20,4 +20,9 @@ std::vector<std::string> findDefinitionFiles(const std::string& directory);
 /// library, and leaves them empty. Not for several threads.
 std::vector<Diagnostic> readDefinitions(const std::string& folder, ServedClasses& served);
 
+/// Dumps on standard output what definition files define, and returns what is wrong with them. As
+/// for readDefinitions().
+std::vector<Diagnostic> dumpDefinitions(const std::vector<std::string>& files,
+                                        const std::string& folder);
+
 }  // namespace cimhost

@@ -32,6 +32,7 @@ class Host {
   /// Terminates the provider; throws HostError when that fails. Not while operations run.
   void unloadProvider() { provider_.unload(); }
 
+  const ClassRepository& repository() const { return repository_; }
   const Operations& operations() const { return operations_; }
   const ServedClasses& served() const { return served_; }
   const std::vector<Diagnostic>& diagnostics() const { return diagnostics_; }

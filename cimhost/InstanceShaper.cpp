@@ -17,28 +17,34 @@ bool isInherited(const CIMConstProperty& property) {
 
 }  // namespace
 
+bool completePath(CIMObjectPath& path, const CIMNamespaceName& nameSpace, const String& hostName) {
+  const bool withoutNamespace = path.getNameSpace().isNull();
+  const bool withoutHost = path.getHost().size() == 0 && hostName.size() > 0;
+  if (withoutNamespace) path.setNameSpace(nameSpace);
+  if (withoutHost) path.setHost(hostName);
+  return withoutNamespace || withoutHost;
+}
+
 InstanceShaper::InstanceShaper(const ClassRepository& repository, CIMNamespaceName nameSpace,
-                               CIMName requestedClass, InstanceSelection selection)
+                               CIMName requestedClass, InstanceSelection selection, String hostName)
     : repository_(repository),
       nameSpace_(std::move(nameSpace)),
       requestedClass_(std::move(requestedClass)),
-      selection_(std::move(selection)) {}
+      selection_(std::move(selection)),
+      hostName_(std::move(hostName)) {}
 
 CIMInstance InstanceShaper::shape(const CIMInstance& delivered) {
   const CIMPropertyList& properties = propertiesOf(delivered.getClassName());
   const bool filtered = isFiltered(delivered, properties);
-  const bool placed = !delivered.getPath().getNameSpace().isNull();
-  if (!filtered && placed) return delivered;
+  CIMObjectPath path = delivered.getPath();
+  const bool placed = completePath(path, nameSpace_, hostName_);
+  if (!filtered && !placed) return delivered;
 
   CIMInstance shaped = delivered.clone();
   if (filtered) {
     shaped.instanceFilter(selection_.includeQualifiers, selection_.includeClassOrigin, properties);
   }
-  if (!placed) {
-    CIMObjectPath path = shaped.getPath();
-    path.setNameSpace(nameSpace_);
-    shaped.setPath(path);
-  }
+  if (placed) shaped.setPath(path);
   return shaped;
 }
 

@@ -18,16 +18,23 @@ struct InstanceSelection {
   Pegasus::CIMPropertyList propertyList;  ///< Null: all. Names of no property are ignored.
 };
 
+/// Fills in the namespace and, unless `hostName` is empty, the host where the path has none. True
+/// when the path changed.
+bool completePath(Pegasus::CIMObjectPath& path, const Pegasus::CIMNamespaceName& nameSpace,
+                  const Pegasus::String& hostName);
+
 /// Makes of an instance that a provider delivered the one that a client gets.
 ///
 /// Providers may ignore the selection, so it is applied to what they deliver, and a path without a
-/// namespace gets the request's. The delivered object is never changed: it is handed on when
-/// nothing is to be done, and cloned otherwise. For one request, on one thread.
+/// namespace gets the request's, one without a host the given one, if any. The delivered object is
+/// never changed: it is handed on when nothing is to be done, and cloned otherwise. For one
+/// request, on one thread.
 class InstanceShaper {
  public:
   /// `repository` must outlive the shaper.
   InstanceShaper(const ClassRepository& repository, Pegasus::CIMNamespaceName nameSpace,
-                 Pegasus::CIMName requestedClass, InstanceSelection selection);
+                 Pegasus::CIMName requestedClass, InstanceSelection selection,
+                 Pegasus::String hostName = Pegasus::String());
 
   Pegasus::CIMInstance shape(const Pegasus::CIMInstance& delivered);
 
@@ -41,6 +48,7 @@ class InstanceShaper {
   Pegasus::CIMNamespaceName nameSpace_;
   Pegasus::CIMName requestedClass_;
   InstanceSelection selection_;
+  Pegasus::String hostName_;
   std::vector<std::pair<Pegasus::CIMName, Pegasus::CIMPropertyList>> lists_;
 };
 

@@ -1,5 +1,6 @@
 #include "cimhost/Operations.h"
 
+#include "cimhost/ProviderCall.h"
 #include "cimhost/ResponseHandlers.h"
 #include "cimhost/Text.h"
 
@@ -56,7 +57,7 @@ OperationStatus Operations::enumerateInstanceNames(const OperationContext& conte
     requireClass(request.nameSpace, request.className);
     DeliveryBuffer<CIMObjectPath> buffer([&](const CIMObjectPath& delivered) {
       CIMObjectPath path = delivered;
-      if (path.getNameSpace().isNull()) path.setNameSpace(request.nameSpace);
+      completePath(path, request.nameSpace, String());
       return sink.deliverPath(path);
     });
     callForEachTarget(request.nameSpace, request.className, buffer, [&](const CIMObjectPath& path) {
@@ -76,9 +77,8 @@ OperationStatus Operations::getInstance(const OperationContext& context,
     if (!served_.serves(request.nameSpace, className)) {
       throw CIMException(CIM_ERR_NOT_FOUND, request.instanceName.toString());
     }
-    const CIMObjectPath path(hostName_, request.nameSpace, className,
-                             request.instanceName.getKeyBindings());
-    SingleInstanceHandler handler;
+    SingleInstance handler;
+    const CIMObjectPath path = providerPath(request.nameSpace, request.instanceName);
     instanceProvider().getInstance(context, path, request.selection.includeQualifiers,
                                    request.selection.includeClassOrigin,
                                    request.selection.propertyList, handler);
@@ -150,31 +150,43 @@ std::vector<CIMName> Operations::subclasses(const CIMNamespaceName& nameSpace,
   return repository_.subclassNames(nameSpace, className, deep);
 }
 
-CIMInstanceProvider& Operations::instanceProvider() const {
-  if (!provider_.isLoaded()) throw CIMException(CIM_ERR_FAILED, "No provider is loaded.");
-  if (provider_.instances() == nullptr) {
-    throw CIMException(CIM_ERR_NOT_SUPPORTED, "The provider serves no instances.");
-  }
-  return *provider_.instances();
+// Providers see the host's own name and the request's namespace, whatever the client wrote.
+CIMObjectPath Operations::providerPath(const CIMNamespaceName& nameSpace,
+                                       const CIMObjectPath& objectName) const {
+  return CIMObjectPath(hostName_, nameSpace, objectName.getClassName(),
+                       objectName.getKeyBindings());
 }
 
-// One class that fails fails the request. Not-supported alone counts as an empty answer: the
-// server's own empty answer stands beside each provider's.
+// Without the interface a server would not have registered the provider for these requests.
+template <class Interface>
+Interface& Operations::provider(Interface* (ProviderLibrary::*interface)() const) const {
+  if (!provider_.isLoaded()) throw CIMException(CIM_ERR_FAILED, "No provider is loaded.");
+  Interface* found = (provider_.*interface)();
+  if (found == nullptr) {
+    throw CIMException(CIM_ERR_NOT_SUPPORTED, "The provider does not support the operation.");
+  }
+  return *found;
+}
+
+CIMInstanceProvider& Operations::instanceProvider() const {
+  return provider(&ProviderLibrary::instances);
+}
+
+CIMAssociationProvider& Operations::associationProvider() const {
+  return provider(&ProviderLibrary::associations);
+}
+
+CIMMethodProvider& Operations::methodProvider() const {
+  return provider(&ProviderLibrary::methods);
+}
+
+// One class that fails fails the request.
 template <class Object>
 void Operations::callForEachTarget(const CIMNamespaceName& nameSpace, const CIMName& className,
-                                   DeliveryBuffer<Object>& buffer, const ProviderCall& call) const {
+                                   DeliveryBuffer<Object>& buffer, const TargetCall& call) const {
   for (const CIMName& target : servedTargets(nameSpace, className)) {
     const CIMObjectPath path(hostName_, nameSpace, target);
-    const OperationStatus status = runOperation([&] { call(path); });
-    if (status.code == CIM_ERR_NOT_SUPPORTED) {
-      buffer.abandonCall();
-      continue;
-    }
-    if (!status.ok()) {
-      buffer.discard();
-      throw CIMException(status.code, fromUtf8(status.message));
-    }
-    buffer.endCall();
+    callProvider(buffer, [&] { call(path); });
   }
 }
 

@@ -1,9 +1,9 @@
 #pragma once
 
 #include "cimhost/DeliveryBuffer.h"
-#include "cimhost/InstanceShaper.h"
 #include "cimhost/OperationStatus.h"
 #include "cimhost/ProviderLibrary.h"
+#include "cimhost/Requests.h"
 #include "cimhost/ServedClasses.h"
 #include "cimhost/Sinks.h"
 #include "cimhost/repository/ClassRepository.h"
@@ -15,47 +15,6 @@
 #include <vector>
 
 namespace cimhost {
-
-struct EnumerateInstancesRequest {
-  Pegasus::CIMNamespaceName nameSpace;
-  Pegasus::CIMName className;
-  InstanceSelection selection;
-};
-
-struct EnumerateInstanceNamesRequest {
-  Pegasus::CIMNamespaceName nameSpace;
-  Pegasus::CIMName className;
-};
-
-struct GetInstanceRequest {
-  Pegasus::CIMNamespaceName nameSpace;
-  Pegasus::CIMObjectPath instanceName;  ///< Its host and namespace are replaced.
-  InstanceSelection selection;          ///< deepInheritance is not used.
-};
-
-struct GetClassRequest {
-  Pegasus::CIMNamespaceName nameSpace;
-  Pegasus::CIMName className;
-  bool localOnly = true;
-  bool includeQualifiers = true;
-  bool includeClassOrigin = false;
-  Pegasus::CIMPropertyList propertyList;
-};
-
-struct EnumerateClassesRequest {
-  Pegasus::CIMNamespaceName nameSpace;
-  Pegasus::CIMName className;  ///< Null: from the top of the namespace.
-  bool deepInheritance = false;
-  bool localOnly = true;
-  bool includeQualifiers = true;
-  bool includeClassOrigin = false;
-};
-
-struct EnumerateClassNamesRequest {
-  Pegasus::CIMNamespaceName nameSpace;
-  Pegasus::CIMName className;  ///< Null: from the top of the namespace.
-  bool deepInheritance = false;
-};
 
 /// The CIM operations of DSP0200 over the declared classes and one provider.
 ///
@@ -77,13 +36,42 @@ class Operations {
                                          ObjectPathSink& sink) const;
   OperationStatus getInstance(const Pegasus::OperationContext& context,
                               const GetInstanceRequest& request, InstanceSink& sink) const;
+
+  /// Properties and their values are not checked: a provider gets the instance as it was sent.
+  OperationStatus modifyInstance(const Pegasus::OperationContext& context,
+                                 const ModifyInstanceRequest& request) const;
+  OperationStatus createInstance(const Pegasus::OperationContext& context,
+                                 const CreateInstanceRequest& request, ObjectPathSink& sink) const;
+  OperationStatus deleteInstance(const Pegasus::OperationContext& context,
+                                 const DeleteInstanceRequest& request) const;
+  /// The method's name and parameters are not checked. CIM_ERR_NOT_FOUND for a class that is not
+  /// declared. For a class whose methods no definition serves: CIM_ERR_METHOD_NOT_AVAILABLE when it
+  /// declares the method, else CIM_ERR_METHOD_NOT_FOUND (DSP0200, InvokeMethod).
+  OperationStatus invokeMethod(const Pegasus::OperationContext& context,
+                               const InvokeMethodRequest& request, MethodResultSink& sink) const;
+
+  // Each association class in which the object's class takes part is a provider call of its own.
+  // Paths that are delivered without host or namespace get this host's and the request's.
+  OperationStatus associators(const Pegasus::OperationContext& context,
+                              const AssociatorsRequest& request, InstanceSink& sink) const;
+  OperationStatus associatorNames(const Pegasus::OperationContext& context,
+                                  const AssociatorNamesRequest& request,
+                                  ObjectPathSink& sink) const;
+  OperationStatus references(const Pegasus::OperationContext& context,
+                             const ReferencesRequest& request, InstanceSink& sink) const;
+  OperationStatus referenceNames(const Pegasus::OperationContext& context,
+                                 const ReferenceNamesRequest& request, ObjectPathSink& sink) const;
+
   OperationStatus getClass(const GetClassRequest& request, ClassSink& sink) const;
   OperationStatus enumerateClasses(const EnumerateClassesRequest& request, ClassSink& sink) const;
   OperationStatus enumerateClassNames(const EnumerateClassNamesRequest& request,
                                       ClassNameSink& sink) const;
 
+  /// The host that providers see in the paths of requests.
+  const Pegasus::String& hostName() const { return hostName_; }
+
  private:
-  using ProviderCall = std::function<void(const Pegasus::CIMObjectPath& classPath)>;
+  using TargetCall = std::function<void(const Pegasus::CIMObjectPath& classPath)>;
 
   void requireClass(const Pegasus::CIMNamespaceName& nameSpace,
                     const Pegasus::CIMName& className) const;
@@ -91,16 +79,32 @@ class Operations {
                                               const Pegasus::CIMName& className) const;
   std::vector<Pegasus::CIMName> subclasses(const Pegasus::CIMNamespaceName& nameSpace,
                                            const Pegasus::CIMName& className, bool deep) const;
+  void requireServed(const Pegasus::CIMNamespaceName& nameSpace,
+                     const Pegasus::CIMName& className) const;
+  void requireMethod(const InvokeMethodRequest& request) const;
+  AssociationPlan planFor(const Pegasus::CIMNamespaceName& nameSpace,
+                          const Pegasus::CIMObjectPath& objectName,
+                          const AssociationFilter& filter) const;
+  DeliveryBuffer<Pegasus::CIMObjectPath> placedPaths(const Pegasus::CIMNamespaceName& nameSpace,
+                                                     ObjectPathSink& sink) const;
+  InstanceShaper associatedShaper(const Pegasus::CIMNamespaceName& nameSpace,
+                                  const InstanceSelection& selection) const;
+  Pegasus::CIMObjectPath providerPath(const Pegasus::CIMNamespaceName& nameSpace,
+                                      const Pegasus::CIMObjectPath& objectName) const;
+  template <class Interface>
+  Interface& provider(Interface* (ProviderLibrary::*interface)() const) const;
   Pegasus::CIMInstanceProvider& instanceProvider() const;
+  Pegasus::CIMAssociationProvider& associationProvider() const;
+  Pegasus::CIMMethodProvider& methodProvider() const;
   template <class Object>
   void callForEachTarget(const Pegasus::CIMNamespaceName& nameSpace,
                          const Pegasus::CIMName& className, DeliveryBuffer<Object>& buffer,
-                         const ProviderCall& call) const;
+                         const TargetCall& call) const;
 
   const ClassRepository& repository_;
   const ServedClasses& served_;
   const ProviderLibrary& provider_;
-  Pegasus::String hostName_;  // What providers see in the paths of requests.
+  Pegasus::String hostName_;
 };
 
 /// A context as a server gives it to providers: the identity of the user who asks.

@@ -101,6 +101,10 @@ CIMObjectPath parseInstancePath(const std::string& text) {
   return path;
 }
 
+CIMObjectPath parseObjectPath(const std::string& text) {
+  return parsePath(text);
+}
+
 CIMObjectPath parseNamespaceOrClass(const std::string& text) {
   if (text.find(':') != std::string::npos) return parseClassPath(text);
   const std::string probe = malformedReason(text + ":A");

@@ -27,6 +27,9 @@ Pegasus::CIMObjectPath parseClassPath(const std::string& text);
 /// NS:CLASS.KEY=VALUE,...; "NS:CLASS." names the instance of a class without keys.
 Pegasus::CIMObjectPath parseInstancePath(const std::string& text);
 
+/// Either of the two.
+Pegasus::CIMObjectPath parseObjectPath(const std::string& text);
+
 /// NS or NS:CLASS; the class is null for a bare namespace.
 Pegasus::CIMObjectPath parseNamespaceOrClass(const std::string& text);
 

@@ -2,33 +2,20 @@
 
 namespace cimhost {
 
-using Pegasus::CIM_ERR_FAILED;
-using Pegasus::CIMException;
+using namespace Pegasus;
 
-void SingleInstanceHandler::complete() {
-  if (instance_.isUninitialized()) {
-    throw CIMException(CIM_ERR_FAILED, "Too few objects delivered.");
-  }
-  completed_ = true;
+void MethodResultHandler::complete() {
+  completed_ = pending_;
+  pending_ = Result();
 }
 
-void SingleInstanceHandler::deliver(const Pegasus::CIMInstance& instance) {
-  if (!instance_.isUninitialized()) {
-    throw CIMException(CIM_ERR_FAILED, "Too many objects delivered.");
-  }
-  if (instance.isUninitialized()) throw Pegasus::UninitializedObjectException();
-  instance_ = instance;
+void MethodResultHandler::deliverParamValue(const CIMParamValue& value) {
+  requireInitialized(value);
+  pending_.parameters.append(value);
 }
 
-void SingleInstanceHandler::deliver(const Pegasus::Array<Pegasus::CIMInstance>& instances) {
-  for (Pegasus::Uint32 i = 0; i < instances.size(); ++i) deliver(instances[i]);
-}
-
-const Pegasus::CIMInstance& SingleInstanceHandler::result() const {
-  if (!completed_) {
-    throw CIMException(CIM_ERR_FAILED, "The provider did not complete the operation.");
-  }
-  return instance_;
+void MethodResultHandler::deliverParamValue(const Array<CIMParamValue>& values) {
+  for (Uint32 i = 0; i < values.size(); ++i) deliverParamValue(values[i]);
 }
 
 }  // namespace cimhost

@@ -25,6 +25,11 @@ class ServedClasses {
  public:
   void add(ServedClass served);
   bool serves(const Pegasus::CIMNamespaceName& nameSpace, const Pegasus::CIMName& className) const;
+  /// True when a definition of the class has methods.
+  bool servesMethods(const Pegasus::CIMNamespaceName& nameSpace,
+                     const Pegasus::CIMName& className) const;
+  /// The association classes that are served in a namespace, each once, in order.
+  std::vector<Pegasus::CIMName> associations(const Pegasus::CIMNamespaceName& nameSpace) const;
   const std::vector<ServedClass>& all() const { return classes_; }
 
  private:

@@ -4,6 +4,7 @@
 #include <Pegasus/Common/CIMInstance.h>
 #include <Pegasus/Common/CIMName.h>
 #include <Pegasus/Common/CIMObjectPath.h>
+#include <Pegasus/Common/CIMParamValue.h>
 
 namespace cimhost {
 
@@ -35,6 +36,15 @@ class ClassNameSink {
  public:
   virtual ~ClassNameSink() = default;
   virtual bool deliverClassName(const Pegasus::CIMName& name) = 0;
+};
+
+class MethodResultSink {
+ public:
+  virtual ~MethodResultSink() = default;
+  /// Called once; `returnValue` is null when the provider delivered none. There is no more to ask
+  /// for: what it returns makes no difference.
+  virtual bool deliverMethodResult(const Pegasus::CIMValue& returnValue,
+                                   const Pegasus::Array<Pegasus::CIMParamValue>& parameters) = 0;
 };
 
 }  // namespace cimhost

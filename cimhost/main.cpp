@@ -13,6 +13,7 @@ using namespace cimhost;
 namespace {
 
 int run(const CommandLine& line) {
+  if (line.command == CommandLine::Command::dump) return runDump(line, std::cerr);
   const std::string library = findProviderLibrary(line.providerFile);
   ResultStream results(line.trace);
   Host host(line.home);

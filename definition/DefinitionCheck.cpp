@@ -86,16 +86,34 @@ void checkFile(const std::string& file, CheckResult& result) {
   }
 }
 
-}  // namespace
-
-CheckResult checkDefinitionFiles(const std::vector<std::string>& files) {
+CheckResult readFiles(const std::vector<std::string>& files) {
   configRead.store(1);
   LOG_LEVEL.store(0);
   CheckResult result;
   for (const std::string& file : files) checkFile(file, result);
+  return result;
+}
+
+void releaseAll() {
   releaseFunctions();
   releaseModules();
+}
+
+}  // namespace
+
+CheckResult checkDefinitionFiles(const std::vector<std::string>& files) {
+  CheckResult result = readFiles(files);
+  releaseAll();
   return result;
+}
+
+std::vector<Problem> dumpDefinitionFiles(const std::vector<std::string>& files) {
+  std::vector<Problem> problems = readFiles(files).problems;
+  for (const auto& module : registeredModules()) module->dump();
+  for (const ProviderDefClass& definition : registeredClasses()) definition.dump();
+  for (const ProviderDefAssociation& definition : registeredAssociations()) definition.dump();
+  releaseAll();
+  return problems;
 }
 
 }  // namespace definition

@@ -37,4 +37,8 @@ struct CheckResult {
 /// empty; switches this process's diagnostic log off. Not for use by several threads at once.
 CheckResult checkDefinitionFiles(const std::vector<std::string>& files);
 
+/// Reads definition files in the same way and dumps on standard output what they register: modules,
+/// classes, associations. Returns the same problems.
+std::vector<Problem> dumpDefinitionFiles(const std::vector<std::string>& files);
+
 }  // namespace definition

@@ -7,6 +7,7 @@
 #include <cstddef>
 #include <memory>
 #include <string>
+#include <vector>
 
 // The process-wide registries of modules and functions.
 //
@@ -19,6 +20,9 @@ ProviderDefModule* getModule(const std::string& name);
 
 /// The same for functions.
 ProviderDefFunction* getFunction(const std::string& name);
+
+/// The registered modules in order of registration.
+const std::vector<std::unique_ptr<ProviderDefModule>>& registeredModules();
 
 ProviderDefModule* registerModule(std::unique_ptr<ProviderDefModule> module);
 ProviderDefFunction* registerFunction(std::unique_ptr<ProviderDefFunction> function);

@@ -163,6 +163,16 @@ class JsonWriter final : public ResultWriter {
     return write(classJson(declaration, 0));
   }
   bool deliverClassName(const CIMName& name) override { return write(text(name)); }
+  bool deliverMethodResult(const CIMValue& returnValue,
+                           const Array<CIMParamValue>& parameters) override {
+    Json values = Json::object();
+    for (Uint32 i = 0; i < parameters.size(); ++i) {
+      const CIMParamValue& each = parameters[i];
+      values[toUtf8(each.getParameterName())] = valueJson(each.getValue(), 0);
+    }
+    return write(
+        Json{{"returnValue", valueJson(returnValue, 0)}, {"parameters", std::move(values)}});
+  }
 
   void finish() override {
     if (list_) out_ << (first_ ? "[]" : "\n]");

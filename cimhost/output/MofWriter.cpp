@@ -1,4 +1,5 @@
 #include "cimhost/Text.h"
+#include "cimhost/output/DisplayText.h"
 #include "cimhost/output/MofText.h"
 #include "cimhost/output/ResultWriter.h"
 
@@ -22,6 +23,16 @@ class MofWriter final : public ResultWriter {
   }
   bool deliverClassName(const Pegasus::CIMName& name) override {
     return static_cast<bool>(out_ << toUtf8(name.getString()) << '\n');
+  }
+  // Nor has the result of a method: it stands as the properties of an instance would.
+  bool deliverMethodResult(const Pegasus::CIMValue& returnValue,
+                           const Pegasus::Array<Pegasus::CIMParamValue>& parameters) override {
+    out_ << "ReturnValue = " << mofValue(returnValue) << ";\n";
+    for (Pegasus::Uint32 i = 0; i < parameters.size(); ++i) {
+      out_ << displayText(toUtf8(parameters[i].getParameterName())) << " = "
+           << mofValue(parameters[i].getValue()) << ";\n";
+    }
+    return static_cast<bool>(out_);
   }
   void finish() override { out_.flush(); }
 

@@ -14,15 +14,16 @@ enum class OutputFormat { table, mof, json };
 class ResultWriter : public InstanceSink,
                      public ObjectPathSink,
                      public ClassSink,
-                     public ClassNameSink {
+                     public ClassNameSink,
+                     public MethodResultSink {
  public:
   /// Ends the output; call it once. Not called when an operation failed before it delivered.
   virtual void finish() = 0;
 };
 
 /// `list` is several objects (a table with a row for each, a JSON array); `single` is one (a table
-/// of its properties, a JSON object). The stream must outlive the writer; when it fails, the writer
-/// asks for no more.
+/// of its properties, a JSON object). A method's result is `single`. The stream must outlive the
+/// writer; when it fails, the writer asks for no more.
 enum class ResultForm { list, single };
 
 std::unique_ptr<ResultWriter> makeTableWriter(std::ostream& out, ResultForm form);

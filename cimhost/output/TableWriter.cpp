@@ -139,6 +139,16 @@ class TableWriter final : public ResultWriter {
   }
   bool deliverClassName(const CIMName& name) override { return printLine(nameText(name)); }
   bool deliverClass(const CIMClass& declaration) override;
+  bool deliverMethodResult(const CIMValue& returnValue,
+                           const Array<CIMParamValue>& parameters) override {
+    std::vector<Row> rows = {{"(return value)", cellText(returnValue)}};
+    for (Uint32 i = 0; i < parameters.size(); ++i) {
+      rows.push_back({displayText(toUtf8(parameters[i].getParameterName())),
+                      cellText(parameters[i].getValue())});
+    }
+    printTable(out_, {"Parameter", "Value"}, rows);
+    return static_cast<bool>(out_);
+  }
 
   void finish() override {
     if (!table_.isEmpty()) printInstances();
