@@ -21,7 +21,7 @@ class TestHost : public Pegasus::CIMOMHandleRep {
   /// "getClass root/t T_Item 0 1 1 null": the flags in the order of the arguments, then the list.
   std::vector<std::string> calls;
 
-  /// From this many calls on, no class is found.
+  /// After this many calls no class is found any more.
   size_t callLimit = SIZE_MAX;
 
   Pegasus::CIMClass getClass(const Pegasus::OperationContext&,
@@ -30,10 +30,10 @@ class TestHost : public Pegasus::CIMOMHandleRep {
                              Pegasus::Boolean includeQualifiers,
                              Pegasus::Boolean includeClassOrigin,
                              const Pegasus::CIMPropertyList& propertyList) override {
-    note("getClass", nameSpace, textOf(className.getString()),
-         {localOnly, includeQualifiers, includeClassOrigin}, propertyList);
+    const size_t made = note("getClass", nameSpace, textOf(className.getString()),
+                             {localOnly, includeQualifiers, includeClassOrigin}, propertyList);
     for (const Pegasus::CIMClass& cimClass : classes_) {
-      if (calls.size() > callLimit) break;
+      if (made > callLimit) break;
       if (cimClass.getClassName() == className) return cimClass.clone();
     }
     throw Pegasus::CIMException(Pegasus::CIM_ERR_NOT_FOUND, className.getString());
@@ -68,13 +68,15 @@ class TestHost : public Pegasus::CIMOMHandleRep {
   }
 
  private:
-  void note(const char* operation, const Pegasus::CIMNamespaceName& nameSpace,
-            const std::string& object, std::initializer_list<Pegasus::Boolean> flags,
-            const Pegasus::CIMPropertyList& propertyList) {
+  /// Gives how many calls there are now.
+  size_t note(const char* operation, const Pegasus::CIMNamespaceName& nameSpace,
+              const std::string& object, std::initializer_list<Pegasus::Boolean> flags,
+              const Pegasus::CIMPropertyList& propertyList) {
     std::string call = std::string(operation) + " " + textOf(nameSpace.getString()) + " " + object;
     for (const Pegasus::Boolean flag : flags) call += flag ? " 1" : " 0";
     const std::lock_guard<std::mutex> lock(mutex_);
     calls.push_back(call + (propertyList.isNull() ? " null" : " list"));
+    return calls.size();
   }
 
   std::mutex mutex_;
