@@ -70,6 +70,39 @@ TEST(CommandLine, EachCommand) {
       parse({"--home", "h", "class", "root:A", "--no-qualifiers"}).line->includeQualifiers);
 }
 
+TEST(CommandLine, Associations) {
+  const Parsed all =
+      parse({"--home", "h", "associators", "root:A.k=1", "--assoc-class", "L", "--result-class",
+             "R", "--role", "a", "--result-role", "b", "--property", "P", "--qualifiers"});
+  ASSERT_TRUE(all.line) << all.error;
+  EXPECT_EQ(all.line->command, Command::associators);
+  EXPECT_EQ(toUtf8(all.line->filter.associationClass.getString()), "L");
+  EXPECT_EQ(toUtf8(all.line->filter.resultClass.getString()), "R");
+  EXPECT_EQ(toUtf8(all.line->filter.role), "a");
+  EXPECT_EQ(toUtf8(all.line->filter.resultRole), "b");
+  EXPECT_TRUE(all.line->includeQualifiers);
+  const Parsed references =
+      parse({"--home", "h", "reference-names", "root:A.k=1", "--result-class", "L"});
+  ASSERT_TRUE(references.line) << references.error;
+  EXPECT_EQ(references.line->command, Command::referenceNames);
+  EXPECT_EQ(toUtf8(references.line->filter.associationClass.getString()), "L");
+  EXPECT_TRUE(references.line->filter.resultClass.isNull());
+}
+
+TEST(CommandLine, ValuesStayAsTheyAreGiven) {
+  const Parsed modify = parse({"--home", "h", "modify", "root:A.k=1", "N=[]", "M", "S=-5 ",
+                               "--format", "json", "T=a,b", "U="});
+  ASSERT_TRUE(modify.line) << modify.error;
+  EXPECT_EQ(modify.line->values, (std::vector<std::string>{"N=[]", "M", "S=-5 ", "T=a,b", "U="}));
+  const Parsed invoke = parse({"--home", "h", "invoke", "root:A", "Do"});
+  ASSERT_TRUE(invoke.line) << invoke.error;
+  EXPECT_EQ(invoke.line->method, "Do");
+  EXPECT_TRUE(invoke.line->values.empty());
+  const Parsed dump = parse({"--home", "h", "dump", "a.xml", "b.xml"});
+  ASSERT_TRUE(dump.line) << dump.error;
+  EXPECT_EQ(dump.line->files, (std::vector<std::string>{"a.xml", "b.xml"}));
+}
+
 TEST(CommandLine, HelpNamesTheExitCodes) {
   const Parsed parsed = parse({"--help"});
   EXPECT_FALSE(parsed.line);
@@ -96,6 +129,11 @@ TEST(CommandLine, UsageErrors) {
       {"path", {"--home", "h", "get", "root:A.k="}, "column 8"},
       {"property", {"--home", "h", "enumerate", "root:A", "--property", "1x"}, "1x"},
       {"empty property", {"--home", "h", "enumerate", "root:A", "--property", ""}, "not valid"},
+      {"nothing to modify", {"--home", "h", "modify", "root:A.k=1"}, "NAME=VALUE"},
+      {"modify a class", {"--home", "h", "modify", "root:A", "S=1"}, "no keys"},
+      {"no method", {"--home", "h", "invoke", "root:A.k=1"}, "METHOD"},
+      {"filter class", {"--home", "h", "associators", "root:A.k=1", "--assoc-class", "1x"}, "1x"},
+      {"role of names", {"--home", "h", "names", "root:A", "--role", "x"}, "--role"},
       {"option of another command", {"--home", "h", "names", "root:A", "--deep"}, "--deep"},
   };
   for (const UsageCase& row : cases) {

@@ -20,6 +20,10 @@ namespace fs = std::filesystem;
 
 constexpr const char* kClasses =
     "class Test_Base { [Key] string Name; uint64 Size; };\n"
+    "class Test_Port { [Key] string Name; uint32 Any([In] uint8 Level, [In(false)] string Text); "
+    "};\n"
+    "class Test_FastPort : Test_Port { };\n"
+    "[Association] class Link_Port { [Key] Test_Base REF Disk; [Key] Test_Port REF Port; };\n"
     "class Test_Disk : Test_Base { };\n"
     "class Test_BigDisk : Test_Disk { };\n"
     "class Test_ThrowsCim : Test_Base { };\n"
@@ -31,6 +35,18 @@ std::string definitionOf(const std::string& name) {
          "\" namespace=\"root/test\"><instances><constant type=\"int\">1</constant></instances>"
          "</class>\n";
 }
+
+constexpr const char* kPortAndLink = R"(
+<class name="Test_Port" namespace="root/test">
+ <instances><constant type="int">1</constant></instances>
+ <method name="Any"><functioncall><function name="f" type="getI"/></functioncall></method>
+</class>
+<association name="Link_Port" namespace="root/test" propertyname1="Disk" propertyname2="Port">
+ <classname name="Test_Disk"/>
+ <classname name="Test_Port"/>
+ <condition><true/></condition>
+</association>
+)";
 
 // A home directory of its own; the process gets back its working directory.
 class HostTest : public testing::Test {
@@ -59,6 +75,12 @@ class HostTest : public testing::Test {
       text += definitionOf(name);
     }
     write("run/test.xml", text + "</plugin>\n");
+  }
+
+  void writeLinkedFiles() {
+    writeGoodFiles();
+    write("run/linked.xml", std::string("<plugin><module name=\"m\" path=\"short\"></module>") +
+                                kPortAndLink + "</plugin>");
   }
 
   std::vector<std::string> diagnostics() {
@@ -227,6 +249,60 @@ TEST_F(HostTest, WhatAProviderPrintsStaysOutOfTheResults) {
   EXPECT_EQ(status_, ExitCode::kOutput);
   shell("--provider /no/such.so enumerate root/test:Test_Disk 2>/dev/null");
   EXPECT_EQ(status_, ExitCode::kUsage);  // --provider twice
+}
+
+TEST_F(HostTest, ValuesAreCheckedBeforeAnythingIsSent) {
+  writeLinkedFiles();
+  EXPECT_EQ(run({"modify", "root/test:Test_Disk.Name=\"a\"", "Size=5"}), 0) << error_.str();
+  EXPECT_EQ(out_.str(), "");
+  EXPECT_EQ(run({"modify", "root/test:Test_Disk.Name=\"a\"", "Size=5", "--format", "json"}), 0);
+  EXPECT_EQ(out_.str(), "");
+  EXPECT_EQ(run({"modify", "root/test:Test_ThrowsCim.Name=\"a\"", "Size=-5"}), ExitCode::kUsage);
+  EXPECT_EQ(error_.str(),
+            "cimhost: property Size (uint64): \"-5\" is out of range, 0 to 18446744073709551615\n");
+  EXPECT_EQ(run({"modify", "root/test:Test_ThrowsCim.Name=\"a\"", "Size=5"}), 12);
+  EXPECT_EQ(run({"modify", "root/test:Nope.Name=\"a\"", "Size=5"}), 15);
+  EXPECT_EQ(run({"invoke", "root/test:Nope", "Any"}), 16);
+  EXPECT_EQ(run({"invoke", "root/test:Test_Port", "Any", "Level=300"}), ExitCode::kUsage);
+  EXPECT_EQ(run({"invoke", "root/test:Test_Port.Name=\"p\"", "any", "level=3"}), 0);
+  EXPECT_THAT(out_.str(), HasSubstr("\n(return value)  7\nLevel           3\nTarget          //"));
+}
+
+TEST_F(HostTest, AssociationsAreFollowed) {
+  writeLinkedFiles();
+  const char* const disk = "root/test:Test_Disk.Name=\"a\"";
+  EXPECT_EQ(run({"associator-names", disk}), 0) << error_.str();
+  EXPECT_EQ(out_.str(),
+            "root/test:Test_Port.Name=\"Link_Port 1\"\n"
+            "root/test:Test_FastPort.Name=\"Link_Port 2\"\n");
+  EXPECT_EQ(run({"associators", disk, "--result-class", "Test_FastPort", "--property", "Name"}), 0);
+  EXPECT_EQ(out_.str(), "Name\n-----------\nLink_Port 2\n");
+  EXPECT_EQ(run({"associators", disk, "--role", "Disk", "--format", "json"}), 0);
+  EXPECT_EQ(nlohmann::json::parse(out_.str())[0]["path"],
+            "root/test:Test_Port.Name=\"Link_Port 1\"");
+  EXPECT_EQ(run({"reference-names", disk, "--result-class", "Link_Port"}), 0);
+  EXPECT_EQ(out_.str(), "root/test:Link_Port.Name=\"link\"\n");
+  EXPECT_EQ(run({"associators", disk, "--assoc-class", "Nope"}), 14);
+}
+
+TEST_F(HostTest, DumpsShowWhatIsRegistered) {
+  writeLinkedFiles();
+  write("bad.xml", "<plugin><module name=\"x\"/><class/>");
+  const std::string all = shell("dump");
+  EXPECT_EQ(status_, ExitCode::kOk);
+  EXPECT_THAT(all,
+              testing::StartsWith("*** Start of ProviderDefModule Dump ***\nModule Name: m\n"));
+  EXPECT_THAT(all, HasSubstr("Class Name: Test_Prints\n"));
+  EXPECT_THAT(all, testing::EndsWith("*** End   of ProviderDefAssociation Dump ***\n"));
+  const std::string named = shell("dump " + (home_ / "run/linked.xml").string());
+  EXPECT_EQ(status_, ExitCode::kOk);
+  EXPECT_THAT(named, testing::Not(HasSubstr("Test_Prints")));
+  EXPECT_THAT(named, HasSubstr("Class Name: Link_Port\n"));
+  const std::string bad = shell("dump " + (home_ / "bad.xml").string() + " 2>&1 >/dev/null");
+  EXPECT_EQ(status_, ExitCode::kProblems);
+  EXPECT_THAT(bad, HasSubstr("bad.xml:1:"));
+  shell("dump >/dev/full 2>&1");
+  EXPECT_EQ(status_, ExitCode::kOutput);
 }
 
 }  // namespace

@@ -280,4 +280,34 @@ TEST(Output, AFailingStreamAsksForNoMore) {
   }
 }
 
+TEST(MethodResult, EachFormat) {
+  Array<CIMParamValue> parameters;
+  parameters.append(CIMParamValue("Flags", uint32Array({1, 2})));
+  parameters.append(CIMParamValue("Odd\x1b", CIMValue(String("a\nb"))));
+  parameters.append(CIMParamValue("None", CIMValue(CIMTYPE_STRING, false)));
+  const auto printed = [&](OutputFormat format, const CIMValue& returned,
+                           const Array<CIMParamValue>& values) {
+    std::ostringstream out;
+    const auto writer = makeResultWriter(format, out, ResultForm::single);
+    EXPECT_TRUE(writer->deliverMethodResult(returned, values));
+    writer->finish();
+    return out.str();
+  };
+  EXPECT_EQ(printed(OutputFormat::table, CIMValue(Sint32(-1)), parameters),
+            "Parameter       Value\n"
+            "--------------  ------\n"
+            "(return value)  -1\n"
+            "Flags           {1, 2}\n"
+            "Odd\\x1b         a\\nb\n"
+            "None\n");
+  EXPECT_EQ(printed(OutputFormat::mof, CIMValue(Sint32(-1)), parameters),
+            "ReturnValue = -1;\nFlags = {1, 2};\nOdd\\x1b = \"a\\nb\";\nNone = NULL;\n");
+  EXPECT_EQ(Json::parse(printed(OutputFormat::json, CIMValue(Sint32(-1)), parameters)),
+            Json::parse(R"({"returnValue": -1,
+                            "parameters": {"Flags": [1, 2], "Odd\u001b": "a\nb", "None": null}})"));
+  EXPECT_EQ(Json::parse(printed(OutputFormat::json, CIMValue(), {})),
+            Json::parse(R"({"returnValue": null, "parameters": {}})"));
+  EXPECT_THAT(printed(OutputFormat::table, CIMValue(), {}), testing::EndsWith("(return value)\n"));
+}
+
 }  // namespace

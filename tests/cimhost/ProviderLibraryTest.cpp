@@ -49,10 +49,12 @@ TEST_F(ProviderLibraryTest, LoadsUsesAndUnloadsAgainAndAgain) {
     library_.load(TEST_PROVIDER_FILE, "CommonProvider", handle_);
     EXPECT_TRUE(library_.isLoaded());
     EXPECT_NE(library_.instances(), nullptr);
-    EXPECT_EQ(library_.associations(), nullptr);
-    EXPECT_EQ(library_.methods(), nullptr);
+    EXPECT_NE(library_.associations(), nullptr);
+    EXPECT_NE(library_.methods(), nullptr);
     library_.unload();
     EXPECT_EQ(library_.instances(), nullptr);
+    EXPECT_EQ(library_.associations(), nullptr);
+    EXPECT_EQ(library_.methods(), nullptr);
     EXPECT_FALSE(isMapped(TEST_PROVIDER_FILE));
   }
   EXPECT_EQ(events(), "create;initialize;terminate;create;initialize;terminate;");

@@ -1,5 +1,7 @@
 #include "tests/cimhost/TestModel.h"
 
+#include <Pegasus/Common/CIMMethod.h>
+
 namespace cimhost::test {
 
 using namespace Pegasus;
@@ -28,6 +30,16 @@ bool RecordingSink::deliverClassName(const CIMName& name) {
   return true;
 }
 
+bool RecordingSink::deliverMethodResult(const CIMValue& returned,
+                                        const Array<CIMParamValue>& parameters) {
+  returnValue = returned.isNull() ? "null" : toUtf8(returned.toString());
+  for (Uint32 i = 0; i < parameters.size(); ++i) {
+    names.push_back(toUtf8(parameters[i].getParameterName()) + "=" +
+                    toUtf8(parameters[i].getValue().toString()));
+  }
+  return true;
+}
+
 CIMClass makeClass(const std::string& name, const std::string& superclass,
                    const std::vector<std::string>& properties) {
   CIMClass declaration(CIMName(name.c_str()),
@@ -41,9 +53,51 @@ CIMClass makeClass(const std::string& name, const std::string& superclass,
   return declaration;
 }
 
+CIMClass makeAssociation(const std::string& name, const std::string& superclass,
+                         const std::vector<std::pair<const char*, const char*>>& ends) {
+  CIMClass declaration = makeClass(name, superclass, {});
+  if (superclass.empty()) {
+    declaration.addQualifier(CIMQualifier(CIMName("Association"), CIMValue(true)));
+  }
+  for (const auto& [role, className] : ends) {
+    CIMProperty reference(CIMName(role), CIMValue(CIMTYPE_REFERENCE, false), 0, CIMName(className));
+    reference.addQualifier(CIMQualifier(CIMName("Key"), CIMValue(true)));
+    declaration.addProperty(reference);
+  }
+  return declaration;
+}
+
+// Disks have well-behaved links, Test_Odd the others.
+void TestHost::addAssociations() {
+  repository.addClass(kNamespace, makeClass("Test_Port", "", {"Name"}));
+  repository.addClass(kNamespace, makeClass("Test_FastPort", "Test_Port", {}));
+  repository.addClass(kNamespace, makeClass("Test_Odd", "", {"Name"}));
+  repository.addClass(
+      kNamespace, makeAssociation("Link_Port", "", {{"Disk", "Test_Disk"}, {"Port", "Test_Port"}}));
+  repository.addClass(kNamespace, makeAssociation("Link_FastPort", "Link_Port", {}));
+  repository.addClass(
+      kNamespace,
+      makeAssociation("Link_Copy", "", {{"Original", "Test_Base"}, {"Copy", "Test_Base"}}));
+  repository.addClass(
+      kNamespace, makeAssociation("Link_Unserved", "", {{"A", "Test_Disk"}, {"B", "Test_Port"}}));
+  std::vector<std::string> links = {"Link_Port", "Link_FastPort", "Link_Copy"};
+  for (const char* name :
+       {"Link_Echo", "Link_Nothing", "Link_NoComplete", "Link_ThrowsNotSupported", "Link_ThrowsCim",
+        "Link_ThrowsInt", "Link_Uninitialized", "Link_Class"}) {
+    repository.addClass(kNamespace,
+                        makeAssociation(name, "", {{"Odd", "Test_Odd"}, {"Port", "Test_Port"}}));
+    links.push_back(name);
+  }
+  for (const std::string& name : links) {
+    served.add({kNamespace, CIMName(name.c_str()), true, false, "test.xml", {}});
+  }
+}
+
 TestHost::TestHost(const std::string& providerName) {
   repository.addNamespace(kNamespace);
-  repository.addClass(kNamespace, makeClass("Test_Base", "", {"Name"}));
+  CIMClass base = makeClass("Test_Base", "", {"Name"});
+  base.addMethod(CIMMethod(CIMName("Format"), CIMTYPE_UINT32));
+  repository.addClass(kNamespace, base);
   repository.addClass(kNamespace, makeClass("Test_Unserved", "Test_Base", {"Size"}));
   repository.addClass(kNamespace, makeClass("Test_Disk", "Test_Base", {"Text"}));
   repository.addClass(kNamespace, makeClass("Test_BigDisk", "Test_Disk", {"Size"}));
@@ -57,8 +111,9 @@ TestHost::TestHost(const std::string& providerName) {
     repository.addClass(kNamespace, makeClass(name, "", {"Name", "Size"}));
     served.add({kNamespace, CIMName(name), false, false, "test.xml", {}});
   }
-  served.add({kNamespace, CIMName("Test_Disk"), false, false, "test.xml", {}});
+  served.add({kNamespace, CIMName("Test_Disk"), false, true, "test.xml", {}});
   served.add({CIMNamespaceName(), CIMName("Test_BigDisk"), false, false, "test.xml", {}});
+  addAssociations();
   setEmbeddedHost(&cimom);
   handle_ = new CIMOMHandle;
   provider.load(TEST_PROVIDER_FILE, providerName, *handle_);

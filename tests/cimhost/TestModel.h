@@ -5,29 +5,39 @@
 #include "cimhost/Text.h"
 
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace cimhost::test {
 
-/// Collects the names of what is delivered: the property Name of instances, the text of paths.
+/// Collects the names of what is delivered: the property Name of instances, the text of paths, the
+/// out-parameters of a method.
 class RecordingSink : public InstanceSink,
                       public ObjectPathSink,
                       public ClassSink,
-                      public ClassNameSink {
+                      public ClassNameSink,
+                      public MethodResultSink {
  public:
   bool deliverInstance(const Pegasus::CIMInstance& instance) override;
   bool deliverPath(const Pegasus::CIMObjectPath& path) override;
   bool deliverClass(const Pegasus::CIMClass& declaration) override;
   bool deliverClassName(const Pegasus::CIMName& name) override;
+  bool deliverMethodResult(const Pegasus::CIMValue& returned,
+                           const Pegasus::Array<Pegasus::CIMParamValue>& parameters) override;
 
   std::vector<std::string> names;
   std::vector<Pegasus::CIMInstance> instances;
   std::vector<Pegasus::CIMClass> classes;
+  std::string returnValue = "not delivered";
 };
 
 /// A class with the given properties, all strings but `Size` (uint64); Name is the key.
 Pegasus::CIMClass makeClass(const std::string& name, const std::string& superclass,
                             const std::vector<std::string>& properties);
+
+/// An association class with references, each a role and a class; the references are its keys.
+Pegasus::CIMClass makeAssociation(const std::string& name, const std::string& superclass,
+                                  const std::vector<std::pair<const char*, const char*>>& ends);
 
 /// A repository with the classes of the test provider in root/test, that provider loaded, and the
 /// operations over both.
@@ -45,6 +55,8 @@ class TestHost {
   EmbeddedCimom cimom{repository, operations};
 
  private:
+  void addAssociations();
+
   Pegasus::CIMOMHandle* handle_;
 };
 

@@ -1,6 +1,8 @@
 // A provider that behaves as its provider name and the class asked for tell, mostly badly.
 
+#include <Pegasus/Provider/CIMAssociationProvider.h>
 #include <Pegasus/Provider/CIMInstanceProvider.h>
+#include <Pegasus/Provider/CIMMethodProvider.h>
 
 #include <cstdio>
 #include <cstdlib>
@@ -145,7 +147,38 @@ const std::map<std::string, Behaviour> kBehaviours = {
     {"Test_EchoPath", [](const Request& r) { r.deliver(utf8(r.path.toString())), r.complete(); }},
 };
 
-class TestProvider final : public CIMInstanceProvider {
+// What `name` says in its end.
+void throwAs(const std::string& name) {
+  const auto endsWith = [&name](const std::string& end) {
+    return name.size() >= end.size() &&
+           name.compare(name.size() - end.size(), end.size(), end) == 0;
+  };
+  if (endsWith("ThrowsCim")) throw CIMException(CIM_ERR_ACCESS_DENIED, "not for you");
+  if (endsWith("ThrowsNotSupported")) throw CIMException(CIM_ERR_NOT_SUPPORTED, "no");
+  if (endsWith("ThrowsInt")) throw 42;
+}
+
+CIMObject makeObject(const CIMName& className, const String& name) {
+  return CIMObject(makeDisk(className, CIMNamespaceName(), name));
+}
+
+// The ends of a link, or what its association class stands for.
+template <class Handler, class Make>
+void follow(const std::string& association, const std::string& echo, Handler& handler, Make make) {
+  if (association == "Link_Nothing") return;
+  if (association == "Link_Echo") {
+    handler.deliver(make(CIMName("Test_Port"), echo.c_str()));
+  } else {
+    handler.deliver(make(CIMName("Test_Port"), (association + " 1").c_str()));
+    handler.deliver(make(CIMName("Test_FastPort"), (association + " 2").c_str()));
+  }
+  throwAs(association);
+  if (association != "Link_NoComplete") handler.complete();
+}
+
+class TestProvider final : public CIMInstanceProvider,
+                           public CIMAssociationProvider,
+                           public CIMMethodProvider {
  public:
   explicit TestProvider(const std::string& name) : name_(name) {}
 
@@ -182,13 +215,92 @@ class TestProvider final : public CIMInstanceProvider {
     handler.deliver(more);
     if (path.getClassName() != CIMName("Test_NoComplete")) handler.complete();
   }
-  void modifyInstance(const OperationContext&, const CIMObjectPath&, const CIMInstance&,
-                      const Boolean, const CIMPropertyList&, ResponseHandler&) override {}
-  void createInstance(const OperationContext&, const CIMObjectPath&, const CIMInstance&,
-                      ObjectPathResponseHandler&) override {}
-  void deleteInstance(const OperationContext&, const CIMObjectPath&, ResponseHandler&) override {}
+  void modifyInstance(const OperationContext&, const CIMObjectPath& path,
+                      const CIMInstance& instance, const Boolean includeQualifiers,
+                      const CIMPropertyList& list, ResponseHandler& handler) override {
+    throwAs(utf8(path.getClassName().getString()));
+    if (path.getClassName() == CIMName("Test_Nothing")) return;
+    if (path.getClassName() == CIMName("Test_EchoPath")) {
+      record(utf8(path.toString()) + " " + utf8(instance.getPath().toString()) + " " +
+             std::to_string(instance.getPropertyCount()) + (includeQualifiers ? " q " : " ") +
+             utf8(list.toString()));
+    }
+    handler.processing();
+    handler.complete();
+  }
+  void createInstance(const OperationContext&, const CIMObjectPath& path, const CIMInstance&,
+                      ObjectPathResponseHandler& handler) override {
+    throwAs(utf8(path.getClassName().getString()));
+    if (path.getClassName() != CIMName("Test_OnlyCompletes")) {
+      handler.deliver(makeDisk(path.getClassName(), CIMNamespaceName(), "new").getPath());
+    }
+    handler.complete();
+  }
+  void deleteInstance(const OperationContext&, const CIMObjectPath& path,
+                      ResponseHandler& handler) override {
+    throwAs(utf8(path.getClassName().getString()));
+    handler.complete();
+  }
+
+  void associators(const OperationContext&, const CIMObjectPath& path, const CIMName& association,
+                   const CIMName& result, const String& role, const String& resultRole,
+                   const Boolean, const Boolean, const CIMPropertyList&,
+                   ObjectResponseHandler& handler) override {
+    const std::string name = utf8(association.getString());
+    if (name == "Link_Uninitialized") handler.deliver(CIMObject());
+    if (name == "Link_Class") handler.deliver(CIMObject(CIMClass(CIMName("Test_Port"))));
+    follow(name, echoOf(path, association, result, role, resultRole), handler, makeObject);
+  }
+  void associatorNames(const OperationContext&, const CIMObjectPath& path,
+                       const CIMName& association, const CIMName& result, const String& role,
+                       const String& resultRole, ObjectPathResponseHandler& handler) override {
+    follow(utf8(association.getString()), echoOf(path, association, result, role, resultRole),
+           handler, makePath);
+  }
+  void references(const OperationContext&, const CIMObjectPath& path, const CIMName& result,
+                  const String& role, const Boolean, const Boolean, const CIMPropertyList&,
+                  ObjectResponseHandler& handler) override {
+    throwAs(utf8(result.getString()));
+    handler.deliver(makeObject(result, echoOf(path, result, CIMName(), role, String()).c_str()));
+    handler.complete();
+  }
+  void referenceNames(const OperationContext&, const CIMObjectPath&, const CIMName& result,
+                      const String&, ObjectPathResponseHandler& handler) override {
+    throwAs(utf8(result.getString()));
+    handler.deliver(makePath(result, "link"));
+    handler.deliver(makePath(CIMName("Test_Port"), "odd"));
+    handler.complete();
+  }
+
+  void invokeMethod(const OperationContext&, const CIMObjectPath& path, const CIMName& methodName,
+                    const Array<CIMParamValue>& parameters,
+                    MethodResultResponseHandler& handler) override {
+    const std::string name = utf8(methodName.getString());
+    if (name == "Nothing") return;
+    if (name == "Uninitialized") handler.deliverParamValue(CIMParamValue());
+    if (name != "OnlyCompletes") {
+      handler.deliverParamValue(parameters);
+      handler.deliverParamValue(CIMParamValue("Target", CIMValue(path)));
+      handler.deliver(CIMValue(Sint32(name == "Twice" ? 1 : 7)));
+    }
+    throwAs(name);
+    if (name == "NoComplete") return;
+    handler.complete();
+    if (name != "Twice") return;
+    handler.deliver(CIMValue(Sint32(2)));
+    handler.complete();
+  }
 
  private:
+  static CIMObjectPath makePath(const CIMName& className, const String& name) {
+    return makeDisk(className, CIMNamespaceName(), name).getPath();
+  }
+  static std::string echoOf(const CIMObjectPath& path, const CIMName& association,
+                            const CIMName& result, const String& role, const String& resultRole) {
+    return utf8(path.getClassName().getString()) + "|" + utf8(association.getString()) + "|" +
+           utf8(result.getString()) + "|" + utf8(role) + "|" + utf8(resultRole);
+  }
+
   void run(const OperationContext& context, const CIMObjectPath& path,
            InstanceResponseHandler& handler) {
     kBehaviours.at(utf8(path.getClassName().getString()))({context, path, handler, *server_});
