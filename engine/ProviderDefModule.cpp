@@ -63,7 +63,9 @@ std::string ProviderDefModule::libraryFile() const {
 
 void ProviderDefModule::open() {
   DEBUG_FORMAT(7, "Loading %s\n", name_.c_str());
-  void* handle = dlopen(libraryFile().c_str(), RTLD_NOW);
+  const std::string file = libraryFile();
+  // The loader takes an empty name for the program itself.
+  void* handle = file.empty() ? nullptr : dlopen(file.c_str(), RTLD_NOW);
   if (handle == nullptr) {
     DEBUG_FORMAT(7, "Loading %s\n", name_.c_str());
     throw ProviderDefError("Couldn't load module " + name_);

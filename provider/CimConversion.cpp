@@ -58,11 +58,11 @@ std::string textFrom(const T& value) {
 }
 
 template <class T>
-CIMValue scalarTo(const ProviderDefValue& value, WideSource wide) {
+CIMValue scalarTo(const ProviderDefValue& value) {
   if constexpr (kIsText<T>) {
     return CIMValue(textTo<T>(value.getStringValue()));
   } else {
-    const bool takesLong = sizeof(T) == 8 && std::is_integral_v<T> && wide == WideSource::kLong;
+    constexpr bool takesLong = sizeof(T) == 8 && std::is_integral_v<T>;
     return CIMValue(numberTo<T>(takesLong ? value.getLongValue() : value.getIntValue()));
   }
 }
@@ -106,10 +106,10 @@ ProviderDefValue arrayFrom(const CIMValue& value) {
 
 }  // namespace
 
-CIMValue toCimValue(const ProviderDefValue& value, CIMType type, bool isArray, WideSource wide) {
+CIMValue toCimValue(const ProviderDefValue& value, CIMType type, bool isArray) {
   return visitCimType<CIMValue>(type, [&](auto tag) {
     using T = typename decltype(tag)::Type;
-    return isArray ? arrayTo<T>(value) : scalarTo<T>(value, wide);
+    return isArray ? arrayTo<T>(value) : scalarTo<T>(value);
   });
 }
 

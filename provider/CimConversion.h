@@ -13,17 +13,13 @@
 
 namespace Vaneth {
 
-/// Where a 64-bit integer comes from: a property takes the long field of a value, an out-parameter
-/// its integer field.
-enum class WideSource { kLong, kInteger };
-
 /// Turns a definition value into a CIM value of the declared type.
 ///
-/// Numbers come from the integer field (integer arrays from the integer array), cut to the type's
-/// width; reals are whole numbers. Texts come from the string field, datetimes and references are
-/// parsed from them: Pegasus::Exception for a text that is none, or is not UTF-8.
-Pegasus::CIMValue toCimValue(const ProviderDefValue& value, Pegasus::CIMType type, bool isArray,
-                             WideSource wide);
+/// Numbers come from the integer field (64-bit integers from the long field of a long, arrays from
+/// the integer array), cut to the type's width; reals are whole numbers. Texts come from the string
+/// field, datetimes and references are parsed from them: Pegasus::Exception for a text that is
+/// none, or is not UTF-8.
+Pegasus::CIMValue toCimValue(const ProviderDefValue& value, Pegasus::CIMType type, bool isArray);
 
 /// Turns a CIM value into a definition value, read as the type given.
 ///

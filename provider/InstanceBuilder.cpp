@@ -49,7 +49,7 @@ void setValue(CIMProperty& property, CIMClass& cimClass, const ProviderDefProper
     DEBUG_FORMAT(9, "DATE TIME: %s\n", value.getStringValue().c_str());
     value = definition.getValue(index);
   }
-  property.setValue(toCimValue(value, property.getType(), property.isArray(), WideSource::kLong));
+  property.setValue(toCimValue(value, property.getType(), property.isArray()));
 }
 
 // Read through a constant handle: asking for a changeable qualifier would copy the shared ones.

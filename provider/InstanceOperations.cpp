@@ -15,6 +15,17 @@ using namespace Pegasus;
 namespace Vaneth {
 namespace {
 
+// A count that fails ends the request: the server has nothing but "unknown error" to tell, so the
+// log says what it was.
+int countInstances(const ProviderDefClass& definition) {
+  try {
+    return boundedNumberOfInstances(definition);
+  } catch (const ProviderDefError& error) {
+    debugFormat(1, "%s\n", error.getMessage().c_str());
+    throw;
+  }
+}
+
 void logDelivery(const CIMInstance& instance) {
   DEBUG_FORMAT(9, "delever instances: %s\n", make_string(instance.getPath().toString()).c_str());
 }
@@ -45,7 +56,7 @@ void CommonProvider::enumerateDefined(const OperationContext& context,
                                       const ProviderDefClass& definition,
                                       InstanceResponseHandler& handler) {
   handler.processing();
-  const int count = boundedNumberOfInstances(definition);
+  const int count = countInstances(definition);
   for (int i = 0; i < count; ++i) {
     DEBUG_FORMAT(9, "CommonProvider: for each instance %d\n", i);
     // An instance that cannot be built is left out; the others are still delivered.

@@ -64,9 +64,9 @@ Array<CIMParamValue> makeOutputs(CIMMethod& method, const std::vector<ProviderDe
     if (declared.getType() == CIMTYPE_DATETIME && !declared.isArray()) {
       DEBUG_FORMAT(9, "DATE TIME: %s\n", output.getStringValue().c_str());
     }
-    delivered.append(CIMParamValue(
-        declared.getName().getString(),
-        toCimValue(output, declared.getType(), declared.isArray(), WideSource::kInteger), true));
+    delivered.append(CIMParamValue(declared.getName().getString(),
+                                   toCimValue(output, declared.getType(), declared.isArray()),
+                                   true));
   }
   return delivered;
 }

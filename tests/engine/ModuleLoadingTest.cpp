@@ -50,6 +50,9 @@ TEST_F(ModuleLoading, FailsWithTheNameOfTheModule) {
   }
   ProviderDefModule fullPath("twice", false);
   EXPECT_EQ(errorOf([&] { fullPath.getFunction("f"); }), "Couldn't load module twice");
+  // Not the program itself, which the loader would give for an empty path.
+  ProviderDefModule empty("", false);
+  EXPECT_EQ(errorOf([&] { empty.getFunction("getpid"); }), "Couldn't load module ");
 }
 
 TEST_F(ModuleLoading, AFailedLoadIsTriedAgain) {

@@ -3,6 +3,7 @@
 #include <climits>
 
 #include "ProviderTest.h"
+#include "engine/ProviderDefError.h"
 
 using namespace Pegasus;
 
@@ -49,6 +50,14 @@ TEST_F(Enumerate, CountsThatGiveNoInstance) {
     EXPECT_THAT(enumerate("root/t:T_Item").events, ElementsAre("processing", "complete")) << count;
   }
   EXPECT_THAT(host.calls, ElementsAre());
+}
+
+TEST_F(Enumerate, CountThatFailsLeavesAndIsLogged) {
+  host.add(makeClass("T_Item", {declared("Name", CIMTYPE_STRING, Key::kYes)}));
+  start(definedClass("T_Item", call("nowhere", "getI", ""), ""));
+  const LogLevel errors(1);
+  EXPECT_THROW(enumerate("root/t:T_Item"), ProviderDefError);
+  EXPECT_EQ(tree.log(), "Couldn't load function nowhere\n");
 }
 
 TEST_F(Enumerate, ClassWithoutProperties) {
