@@ -122,6 +122,7 @@ bool isEscape(const std::string& text, std::size_t position) {
 
 void appendElements(const std::string& text, std::vector<std::string>& elements) {
   if (text == "[]") return;
+  if (text[0] == '[') fail(text, "not a list: write a,b without brackets, or \\[ for a bracket");
   elements.emplace_back();
   for (std::size_t i = 0; i < text.size(); ++i) {
     if (text[i] == ',') {

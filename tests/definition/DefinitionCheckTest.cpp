@@ -101,4 +101,18 @@ TEST_F(DefinitionCheck, ListsWhatTheFilesServeAndLeavesNothingBehind) {
   EXPECT_EQ(functionCount(), 0u);
 }
 
+TEST_F(DefinitionCheck, DumpsModulesThenClassesThenAssociationsAndLeavesNothingBehind) {
+  testing::internal::CaptureStdout();
+  const auto problems =
+      definition::dumpDefinitionFiles({DATA_FOLDER "/every_element.xml", "no.xml"});
+  const std::string dumped = testing::internal::GetCapturedStdout();
+  EXPECT_EQ(problems.size(), 1u);
+  EXPECT_THAT(dumped, testing::StartsWith("*** Start of ProviderDefModule Dump ***\n"));
+  EXPECT_THAT(dumped, testing::EndsWith("*** End   of ProviderDefAssociation Dump ***\n"));
+  EXPECT_LT(dumped.find("Module Name: linker"), dumped.find("Class Name: Sample_Disk"));
+  EXPECT_LT(dumped.find("Class Name: Sample_Part"), dumped.find("Class Name: Sample_DiskPart"));
+  EXPECT_EQ(getModule("sample"), nullptr);
+  EXPECT_EQ(functionCount(), 0u);
+}
+
 }  // namespace
