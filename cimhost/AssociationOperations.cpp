@@ -9,15 +9,27 @@ namespace cimhost {
 
 using namespace Pegasus;
 
-using Step = AssociationPlan::Step;
-
 namespace {
 
-// What a provider may deliver as a class, which no request for an instance's links wants, throws.
+using Step = AssociationPlan::Step;
+using Wants = bool (AssociationPlan::*)(const Step&, const CIMName&) const;
+
+// A class, which a provider may deliver as well as an instance, fails the request.
 DeliveryBuffer<CIMObject> instanceBuffer(InstanceShaper& shaper, InstanceSink& sink) {
   return DeliveryBuffer<CIMObject>([&](const CIMObject& object) {
     return sink.deliverInstance(shaper.shape(CIMInstance(object)));
   });
+}
+
+// Calls call(association class, handler) for each step of the plan.
+template <class Handler, class Object, class Call>
+void follow(const AssociationPlan& plan, Wants wants, DeliveryBuffer<Object>& buffer, Call call) {
+  for (const Step& step : plan.steps()) {
+    Handler handler(
+        buffer, [&](const Object& object) { return (plan.*wants)(step, object.getClassName()); });
+    callProvider(buffer, [&] { call(step.associationClass, handler); });
+  }
+  buffer.finish();
 }
 
 }  // namespace
@@ -31,18 +43,13 @@ OperationStatus Operations::associators(const OperationContext& context,
     const InstanceSelection& selection = request.selection;
     InstanceShaper shaper = associatedShaper(request.nameSpace, selection);
     DeliveryBuffer<CIMObject> buffer = instanceBuffer(shaper, sink);
-    for (const Step& step : plan.steps()) {
-      AssociatedObjects handler(buffer, [&](const CIMObject& object) {
-        return plan.wantsResult(step, object.getClassName());
-      });
-      callProvider(buffer, [&] {
-        associationProvider().associators(
-            context, path, step.associationClass, request.filter.resultClass, request.filter.role,
-            request.filter.resultRole, selection.includeQualifiers, selection.includeClassOrigin,
-            selection.propertyList, handler);
-      });
-    }
-    buffer.finish();
+    const auto call = [&](const CIMName& association, ObjectResponseHandler& handler) {
+      associationProvider().associators(context, path, association, request.filter.resultClass,
+                                        request.filter.role, request.filter.resultRole,
+                                        selection.includeQualifiers, selection.includeClassOrigin,
+                                        selection.propertyList, handler);
+    };
+    follow<AssociatedObjects>(plan, &AssociationPlan::wantsResult, buffer, call);
   });
 }
 
@@ -53,17 +60,12 @@ OperationStatus Operations::associatorNames(const OperationContext& context,
     const AssociationPlan plan = planFor(request.nameSpace, request.objectName, request.filter);
     const CIMObjectPath path = providerPath(request.nameSpace, request.objectName);
     DeliveryBuffer<CIMObjectPath> buffer = placedPaths(request.nameSpace, sink);
-    for (const Step& step : plan.steps()) {
-      EnumeratedPaths handler(buffer, [&](const CIMObjectPath& result) {
-        return plan.wantsResult(step, result.getClassName());
-      });
-      callProvider(buffer, [&] {
-        associationProvider().associatorNames(context, path, step.associationClass,
-                                              request.filter.resultClass, request.filter.role,
-                                              request.filter.resultRole, handler);
-      });
-    }
-    buffer.finish();
+    const auto call = [&](const CIMName& association, ObjectPathResponseHandler& handler) {
+      associationProvider().associatorNames(context, path, association, request.filter.resultClass,
+                                            request.filter.role, request.filter.resultRole,
+                                            handler);
+    };
+    follow<EnumeratedPaths>(plan, &AssociationPlan::wantsResult, buffer, call);
   });
 }
 
@@ -77,17 +79,12 @@ OperationStatus Operations::references(const OperationContext& context,
     const InstanceSelection& selection = request.selection;
     InstanceShaper shaper = associatedShaper(request.nameSpace, selection);
     DeliveryBuffer<CIMObject> buffer = instanceBuffer(shaper, sink);
-    for (const Step& step : plan.steps()) {
-      AssociatedObjects handler(buffer, [&](const CIMObject& object) {
-        return plan.wantsReference(object.getClassName());
-      });
-      callProvider(buffer, [&] {
-        associationProvider().references(context, path, step.associationClass, request.filter.role,
-                                         selection.includeQualifiers, selection.includeClassOrigin,
-                                         selection.propertyList, handler);
-      });
-    }
-    buffer.finish();
+    const auto call = [&](const CIMName& association, ObjectResponseHandler& handler) {
+      associationProvider().references(context, path, association, request.filter.role,
+                                       selection.includeQualifiers, selection.includeClassOrigin,
+                                       selection.propertyList, handler);
+    };
+    follow<AssociatedObjects>(plan, &AssociationPlan::wantsReference, buffer, call);
   });
 }
 
@@ -98,16 +95,11 @@ OperationStatus Operations::referenceNames(const OperationContext& context,
     const AssociationPlan plan = planFor(request.nameSpace, request.objectName, request.filter);
     const CIMObjectPath path = providerPath(request.nameSpace, request.objectName);
     DeliveryBuffer<CIMObjectPath> buffer = placedPaths(request.nameSpace, sink);
-    for (const Step& step : plan.steps()) {
-      EnumeratedPaths handler(buffer, [&](const CIMObjectPath& result) {
-        return plan.wantsReference(result.getClassName());
-      });
-      callProvider(buffer, [&] {
-        associationProvider().referenceNames(context, path, step.associationClass,
-                                             request.filter.role, handler);
-      });
-    }
-    buffer.finish();
+    const auto call = [&](const CIMName& association, ObjectPathResponseHandler& handler) {
+      associationProvider().referenceNames(context, path, association, request.filter.role,
+                                           handler);
+    };
+    follow<EnumeratedPaths>(plan, &AssociationPlan::wantsReference, buffer, call);
   });
 }
 

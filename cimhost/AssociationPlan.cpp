@@ -71,7 +71,7 @@ bool AssociationPlan::wantsResult(const Step& step, const CIMName& name) const {
                      [&](const CIMName& declared) { return isWithin(name, declared); });
 }
 
-bool AssociationPlan::wantsReference(const CIMName& name) const {
+bool AssociationPlan::wantsReference(const Step&, const CIMName& name) const {
   return isWithin(name, filter_.associationClass);
 }
 

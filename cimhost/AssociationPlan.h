@@ -41,8 +41,8 @@ class AssociationPlan {
 
   /// True when the client wants an object of class `name` as a result of `step`.
   bool wantsResult(const Step& step, const Pegasus::CIMName& name) const;
-  /// The same for an object of an association class (References).
-  bool wantsReference(const Pegasus::CIMName& name) const;
+  /// True when it wants an object of the association class `name` as a reference (References).
+  bool wantsReference(const Step& step, const Pegasus::CIMName& name) const;
 
  private:
   void requireDeclared(const Pegasus::CIMName& name) const;

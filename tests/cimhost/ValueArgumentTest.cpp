@@ -173,6 +173,7 @@ TEST(RequestArguments, OnlyWhatIsGivenIsSent) {
             "};\n");
   EXPECT_EQ(invoked("format", {"Disks=Test_Disk", "label="}),
             "Format Label=\"\" Disks={\"Test_Disk\"}");
+  EXPECT_THAT(modified({"Flags"}), testing::HasSubstr("  Flags = NULL;\n"));
   EXPECT_EQ(invoked("FORMAT", {}), "Format");
 }
 
