@@ -7,18 +7,18 @@
 
 #include "hostfiles.h"
 #include "hostinfo.h"
-#include "packing.h"
+#include "notes.h"
 #include "snapshot.h"
 #include "text.h"
 
 enum { kMountLine = 65536 };
 
 struct FileSystem {
-  char mountPoint[kBufferSize];  // as the kernel knows it
-  char name[kBufferSize];        // as a CIM client is told
-  char device[kBufferSize];
+  char mountPoint[CP_BUFFER_SIZE];  // as the kernel knows it
+  char name[CP_BUFFER_SIZE];        // as a CIM client is told
+  char device[CP_BUFFER_SIZE];
   char type[64];
-  struct TextArray options;
+  char options[CP_BUFFER_SIZE];  // the string array as it is told
   uint64_t sizeKiB;
   uint64_t freeKiB;
   int percentUsed;
@@ -41,14 +41,14 @@ static char* takeField(char** rest, char separator) {
   return field;
 }
 
-static void addOption(struct FileSystem* row, char* option) {
-  char clean[kBufferSize];
+static void addOption(struct FileSystem* row, char* option, cp_writer* told) {
+  char clean[CP_BUFFER_SIZE];
   if (strcmp(option, "ro") == 0) {
     row->readOnly = 1;
   }
   textUnescape(option);
   if (*option != '\0' && textClean(clean, sizeof clean, option)) {
-    textArrayAdd(&row->options, clean, strlen(clean));
+    cp_add_string(told, clean);
   }
 }
 
@@ -66,8 +66,9 @@ static int parseMount(char* line, struct FileSystem* row) {
   textUnescape(device);
   textClean(row->device, sizeof row->device, device);
   textClean(row->type, sizeof row->type, type);
+  cp_writer told = cp_write_strings(row->options);
   for (char* option = takeField(&options, ','); option; option = takeField(&options, ',')) {
-    addOption(row, option);
+    addOption(row, option, &told);
   }
   textUnescape(mountPoint);
   if (strlen(mountPoint) >= sizeof row->mountPoint) {
@@ -156,21 +157,21 @@ int hostFileSystemCount(void) {
 int hostFileSystemName(void* out, int index) {
   struct FileSystem row;
   snapshotCopy(&table, index, &row);
-  packText(out, row.name);
+  cp_return_string(out, row.name);
   return 0;
 }
 
 int hostFileSystemDevice(void* out, int index) {
   struct FileSystem row;
   snapshotCopy(&table, index, &row);
-  packText(out, row.device);
+  cp_return_string(out, row.device);
   return 0;
 }
 
 int hostFileSystemType(void* out, int index) {
   struct FileSystem row;
   snapshotCopy(&table, index, &row);
-  packText(out, row.type);
+  cp_return_string(out, row.type);
   return 0;
 }
 
@@ -205,8 +206,91 @@ int hostFileSystemReadOnly(int index) {
 int hostFileSystemMountOptions(void* out, int index) {
   struct FileSystem row;
   snapshotCopy(&table, index, &row);
-  packTextArray(out, &row.options);
+  if (row.name[0] == '\0') {
+    return cp_return_strings(out, NULL, 0);
+  }
+  memcpy(out, row.options, sizeof row.options);
   return 0;
+}
+
+int hostFileSystemOwner(void* out, int index) {
+  struct FileSystem row;
+  char note[kNoteSize] = "";
+  snapshotCopy(&table, index, &row);
+  if (row.name[0] != '\0') {
+    noteRead(row.mountPoint, note);
+  }
+  return cp_return_string(out, note);
+}
+
+int hostFileSystemSetOwner(const char* value, int index) {
+  struct FileSystem row;
+  snapshotCopy(&table, index, &row);
+  return row.name[0] != '\0' && noteWrite(row.mountPoint, value) ? 0 : 1;
+}
+
+static int isOfType(int index, const char* type, struct FileSystem* row) {
+  snapshotCopy(&table, index, row);
+  return row->name[0] != '\0' && (*type == '\0' || strcmp(row->type, type) == 0);
+}
+
+// Adds the names of up to `limit` file systems among the first `count`; returns how many it added.
+static unsigned addNames(int count, const char* type, unsigned limit, cp_writer* names) {
+  struct FileSystem row;
+  unsigned added = 0;
+  for (int i = 0; i < count && added < limit; ++i) {
+    if (isOfType(i, type, &row) && cp_add_string(names, row.name) == CP_OK) {
+      ++added;
+    }
+  }
+  return added;
+}
+
+int hostFileSystemFindByType(void* in, void* out) {
+  cp_reader inputs = cp_read(in);
+  cp_writer outputs = cp_write_list(out);
+  struct FileSystem row;
+  cp_item more;
+  const char* type = "";
+  int limit = 0;
+  unsigned found = 0;
+  // A parameter that the client leaves out leaves no gap: take what is there.
+  cp_next_string(&inputs, &type);
+  cp_next_int(&inputs, &limit);
+  if (cp_next(&inputs, &more) != CP_END) {
+    return kMethodBadInput;
+  }
+  // No instance is looked up for this method: nobody has counted.
+  const int count = hostFileSystemCount();
+  for (int i = 0; i < count; ++i) {
+    found += (unsigned)isOfType(i, type, &row);
+  }
+  cp_put_int(&outputs, (int)found);
+  cp_begin_strings(&outputs);
+  const unsigned told = addNames(count, type, limit == 0 ? UINT_MAX : (unsigned)limit, &outputs);
+  cp_finish(&outputs);
+  return told == found ? kMethodYes : kMethodNo;
+}
+
+int hostFileSystemCheckSpace(void* in, void* out, int index) {
+  cp_reader inputs = cp_read(in);
+  cp_writer outputs = cp_write_list(out);
+  struct FileSystem row;
+  int needed = 0;
+  if (cp_next_int(&inputs, &needed) != CP_OK) {
+    return kMethodBadInput;
+  }
+  snapshotCopy(&table, index, &row);
+  if (row.name[0] == '\0') {
+    return kMethodNoInstance;
+  }
+  const uint64_t freeMiB = row.freeKiB / 1024;
+  const int fits = freeMiB >= (uint32_t)needed;
+  cp_put_int(&outputs, fits);
+  cp_put_int(&outputs, saturateToInt(freeMiB));
+  cp_put_string(&outputs, row.name);
+  cp_finish(&outputs);
+  return fits ? kMethodYes : kMethodNo;
 }
 
 __attribute__((destructor)) static void releaseFileSystems(void) {

@@ -6,53 +6,64 @@
 // not cover gives 0, an empty text or an empty array. Functions that fill `out` return 0; nobody
 // reads it. Any of them may be called from several threads at once.
 
-#ifdef __cplusplus
-extern "C" {
-#endif
-
-#define HOSTINFO_API __attribute__((visibility("default")))
+#include <commonprovider/plugin.h>
 
 /// Takes the first snapshot of every class. Returns 0.
-HOSTINFO_API int hostInit(void);
+CP_FUNCTION(getI, hostInit);
 
 // Host_FileSystem. The count looks at the host anew; the others read what it saw.
-HOSTINFO_API int hostFileSystemCount(void);
-HOSTINFO_API int hostFileSystemName(void* out, int index);
-HOSTINFO_API int hostFileSystemDevice(void* out, int index);
-HOSTINFO_API int hostFileSystemType(void* out, int index);
+CP_FUNCTION(getI, hostFileSystemCount);
+CP_FUNCTION(getSi, hostFileSystemName);
+CP_FUNCTION(getSi, hostFileSystemDevice);
+CP_FUNCTION(getSi, hostFileSystemType);
 /// KiB. Where long has 32 bits the largest answer is 2147483647, just under 2 TiB.
-HOSTINFO_API long hostFileSystemSizeKiB(int index);
+CP_FUNCTION(getLi, hostFileSystemSizeKiB);
 /// KiB that users other than root can still fill; the same limit.
-HOSTINFO_API long hostFileSystemFreeKiB(int index);
+CP_FUNCTION(getLi, hostFileSystemFreeKiB);
 /// 0 to 100, rounded up, without the blocks that are reserved for root: what df prints.
-HOSTINFO_API int hostFileSystemPercentUsed(int index);
-HOSTINFO_API int hostFileSystemReadOnly(int index);
+CP_FUNCTION(getIi, hostFileSystemPercentUsed);
+CP_FUNCTION(getIi, hostFileSystemReadOnly);
 /// String array. Options that do not fit the buffer any more are left out.
-HOSTINFO_API int hostFileSystemMountOptions(void* out, int index);
+CP_FUNCTION(getASi, hostFileSystemMountOptions);
+/// A note that clients set, at most 1023 bytes; it is kept in a file (notes.h).
+CP_FUNCTION(getSi, hostFileSystemOwner);
+/// An empty text removes the note. 1, and the old note stays, when it could not be stored.
+CP_FUNCTION(setSi, hostFileSystemSetOwner);
+
+/// What the methods return.
+enum {
+  kMethodYes = 0,
+  kMethodNo = 1,
+  kMethodBadInput = 2,   ///< Without outputs.
+  kMethodNoInstance = 3  ///< Without outputs.
+};
+
+/// In: a type ("" or left out: any) and a limit (0 or left out: none). Out: the number of file
+/// systems of that type, then the names of the first of them, as an array: as many as the limit and
+/// the buffer allow. kMethodNo when that is not all. Looks at the host anew.
+CP_FUNCTION(execC, hostFileSystemFindByType);
+/// In: MiB. Out: whether that much is free for users other than root, the free MiB, the name.
+CP_FUNCTION(execCi, hostFileSystemCheckSpace);
 
 // Host_NetworkPort.
-HOSTINFO_API int hostNetworkPortCount(void);
-HOSTINFO_API int hostNetworkPortName(void* out, int index);
+CP_FUNCTION(getI, hostNetworkPortCount);
+CP_FUNCTION(getSi, hostNetworkPortName);
 /// Empty when the address is not the device's own but was set by software.
-HOSTINFO_API int hostNetworkPortPermanentAddress(void* out, int index);
-HOSTINFO_API int hostNetworkPortCurrentAddress(void* out, int index);
-HOSTINFO_API int hostNetworkPortMTU(int index);
-HOSTINFO_API int hostNetworkPortUp(int index);
+CP_FUNCTION(getSi, hostNetworkPortPermanentAddress);
+CP_FUNCTION(getSi, hostNetworkPortCurrentAddress);
+CP_FUNCTION(getIi, hostNetworkPortMTU);
+CP_FUNCTION(getIi, hostNetworkPortUp);
 /// Mbit/s; 0 when the port does not tell.
-HOSTINFO_API int hostNetworkPortSpeedMbps(int index);
+CP_FUNCTION(getIi, hostNetworkPortSpeedMbps);
 /// Int array: KiB received, KiB sent, packets received, packets sent; each at most 2147483647.
-HOSTINFO_API int hostNetworkPortTraffic(void* out, int index);
+CP_FUNCTION(getAIi, hostNetworkPortTraffic);
 
 // Host_IPEndpoint.
-HOSTINFO_API int hostIPEndpointCount(void);
+CP_FUNCTION(getI, hostIPEndpointCount);
 /// Port, ":" and address; "/" and the prefix length too when that alone tells two apart.
-HOSTINFO_API int hostIPEndpointName(void* out, int index);
-HOSTINFO_API int hostIPEndpointAddress(void* out, int index);
-HOSTINFO_API int hostIPEndpointPrefixLength(int index);
+CP_FUNCTION(getSi, hostIPEndpointName);
+CP_FUNCTION(getSi, hostIPEndpointAddress);
+CP_FUNCTION(getIi, hostIPEndpointPrefixLength);
 /// 4 or 6.
-HOSTINFO_API int hostIPEndpointProtocolIFType(int index);
-HOSTINFO_API int hostIPEndpointPortName(void* out, int index);
-
-#ifdef __cplusplus
-}
-#endif
+CP_FUNCTION(getIi, hostIPEndpointProtocolIFType);
+CP_FUNCTION(getSi, hostIPEndpointPortName);

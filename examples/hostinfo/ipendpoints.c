@@ -8,7 +8,6 @@
 #include <string.h>
 
 #include "hostinfo.h"
-#include "packing.h"
 #include "snapshot.h"
 #include "text.h"
 
@@ -114,14 +113,14 @@ int hostIPEndpointCount(void) {
 int hostIPEndpointName(void* out, int index) {
   struct IPEndpoint row;
   snapshotCopy(&table, index, &row);
-  packText(out, row.name);
+  cp_return_string(out, row.name);
   return 0;
 }
 
 int hostIPEndpointAddress(void* out, int index) {
   struct IPEndpoint row;
   snapshotCopy(&table, index, &row);
-  packText(out, row.address);
+  cp_return_string(out, row.address);
   return 0;
 }
 
@@ -140,7 +139,7 @@ int hostIPEndpointProtocolIFType(int index) {
 int hostIPEndpointPortName(void* out, int index) {
   struct IPEndpoint row;
   snapshotCopy(&table, index, &row);
-  packText(out, row.portName);
+  cp_return_string(out, row.portName);
   return 0;
 }
 

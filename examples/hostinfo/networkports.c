@@ -7,7 +7,6 @@
 
 #include "hostfiles.h"
 #include "hostinfo.h"
-#include "packing.h"
 #include "snapshot.h"
 #include "text.h"
 
@@ -116,21 +115,21 @@ int hostNetworkPortCount(void) {
 int hostNetworkPortName(void* out, int index) {
   struct NetworkPort row;
   snapshotCopy(&table, index, &row);
-  packText(out, row.name);
+  cp_return_string(out, row.name);
   return 0;
 }
 
 int hostNetworkPortPermanentAddress(void* out, int index) {
   struct NetworkPort row;
   snapshotCopy(&table, index, &row);
-  packText(out, row.addressIsPermanent ? row.currentAddress : "");
+  cp_return_string(out, row.addressIsPermanent ? row.currentAddress : "");
   return 0;
 }
 
 int hostNetworkPortCurrentAddress(void* out, int index) {
   struct NetworkPort row;
   snapshotCopy(&table, index, &row);
-  packText(out, row.currentAddress);
+  cp_return_string(out, row.currentAddress);
   return 0;
 }
 
@@ -155,7 +154,7 @@ int hostNetworkPortSpeedMbps(int index) {
 int hostNetworkPortTraffic(void* out, int index) {
   struct NetworkPort row;
   snapshotCopy(&table, index, &row);
-  packIntArray(out, row.traffic, row.name[0] != '\0' ? kCounters : 0);
+  cp_return_ints(out, row.traffic, row.name[0] != '\0' ? kCounters : 0);
   return 0;
 }
 

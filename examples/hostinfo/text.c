@@ -7,16 +7,6 @@ static int isContinuation(char byte) {
   return ((unsigned char)byte & 0xC0) == 0x80;
 }
 
-size_t textFit(const char* text, size_t length, size_t limit) {
-  if (length <= limit) {
-    return length;
-  }
-  while (limit > 0 && isContinuation(text[limit])) {
-    --limit;
-  }
-  return limit;
-}
-
 // The byte that \ooo stands for, or 0 when `at` starts no such escape.
 static char escapedByte(const char* at) {
   unsigned value = 0;

@@ -2,10 +2,6 @@
 
 #include <stddef.h>
 
-/// Length of the longest beginning of `text` that has at most `limit` bytes and does not end inside
-/// a UTF-8 character. `length` is the length of the whole text, which is valid UTF-8.
-size_t textFit(const char* text, size_t length, size_t limit);
-
 /// Undoes the octal escapes of /proc/self/mounts (\040 for a blank; see proc(5)) in place. A
 /// backslash that no three octal digits follow stays; \000 stays too, as no name holds a NUL.
 void textUnescape(char* text);

@@ -34,6 +34,7 @@ INSTANTIATE_TEST_SUITE_P(
         PropertyCase{"Number", "Host_FileSystem", "PercentUsed", ProviderDefValue::kInteger},
         PropertyCase{"YesNo", "Host_FileSystem", "ReadOnly", ProviderDefValue::kInteger},
         PropertyCase{"Texts", "Host_FileSystem", "MountOptions", ProviderDefValue::kStringArray},
+        PropertyCase{"Note", "Host_FileSystem", "Owner", ProviderDefValue::kString},
         PropertyCase{"Constant", "Host_FileSystem", "CreationClassName", ProviderDefValue::kString},
         PropertyCase{"IndexString", "Host_NetworkPort", "Label", ProviderDefValue::kIndexString},
         PropertyCase{"Numbers", "Host_NetworkPort", "Traffic", ProviderDefValue::kIntArray},
@@ -50,6 +51,35 @@ TEST(HostinfoDefinition, ArraysArriveWhole) {
   for (const ProviderDefValue& traffic : ExampleHome::values("Host_NetworkPort", "Traffic")) {
     EXPECT_THAT(traffic.getIntArray(), testing::SizeIs(4));
   }
+}
+
+TEST(HostinfoDefinition, MethodsReachTheirFunctions) {
+  const ExampleHome home("hostinfo");
+  const ProviderDefClass* definition = getProviderDefClass("Host_FileSystem");
+  const auto names = ExampleHome::values("Host_FileSystem", "Name");
+  std::vector<ProviderDefValue> outputs;
+  ASSERT_NE(definition->getMethod("FindByType"), nullptr);
+  definition->getMethod("FindByType")->exec({"", 1}, outputs, 0);
+  ASSERT_EQ(outputs.size(), 2u);
+  EXPECT_EQ(outputs[0].getIntValue(), static_cast<int>(names.size()));
+  EXPECT_THAT(outputs[1].getStringArray(), testing::ElementsAre(names[0].getStringValue()));
+
+  const int last = static_cast<int>(names.size()) - 1;
+  outputs.clear();
+  ASSERT_NE(definition->getMethod("CheckSpace"), nullptr);
+  EXPECT_EQ(definition->getMethod("CheckSpace")->exec({0}, outputs, last), 0);
+  ASSERT_EQ(outputs.size(), 3u);
+  EXPECT_EQ(outputs[2].getStringValue(), names.back().getStringValue());
+}
+
+TEST(HostinfoDefinition, TheNoteThatIsSetIsRead) {
+  const ExampleHome home("hostinfo");
+  ASSERT_GT(getProviderDefClass("Host_FileSystem")->getNumberOfInstances(), 0);
+  const auto* owner = getProviderDefClass("Host_FileSystem")->getProperty("Owner");
+  const std::string before = owner->getValue(0).getStringValue();
+  EXPECT_EQ(owner->setValue("Ann B.", 0), 0);
+  EXPECT_EQ(owner->getValue(0).getStringValue(), "Ann B.");
+  EXPECT_EQ(owner->setValue(ProviderDefValue(before), 0), 0);
 }
 
 std::vector<std::vector<ProviderDefValue>> rows(const char* className, const char* property) {

@@ -56,6 +56,23 @@ TEST(Definition, NamesOnlyFunctionsThatTheLibraryExports) {
   }
 }
 
+// Without Static a method fails; In and Out of every parameter must be written out.
+TEST(Definition, MethodsAreDeclaredAsTheProviderNeedsThem) {
+  const std::string mof = fileText("hostinfo.mof");
+  std::set<std::string> defined, declared;
+  for (const auto& match : matches(fileText("hostinfo.xml"), "<method name=\"([^\"]*)\"")) {
+    defined.insert(match[1]);
+  }
+  for (const auto& match : matches(mof, "\\[Static\\b[^\\]]*\\]\\s*\\w+ (\\w+)\\([\\s\\S]*?\\);")) {
+    declared.insert(match[1]);
+    const std::string parameters = match[0].str();
+    EXPECT_EQ(matches(parameters, "\\]\\s*\\w+ \\w+(\\[\\])?(,|\\);)").size(),
+              matches(parameters, "\\[In(\\(false\\))?, Out(\\(false\\))?,").size());
+  }
+  EXPECT_EQ(defined.size(), 2u);
+  EXPECT_EQ(declared, defined);
+}
+
 TEST(Definition, FillsEveryDeclaredPropertyAndNoOther) {
   const Features defined = definedProperties(fileText("hostinfo.xml"));
   EXPECT_EQ(defined.size(), 3u);

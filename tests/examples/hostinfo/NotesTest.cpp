@@ -1,0 +1,147 @@
+// Host_FileSystem.Owner: the property that clients set, and the file that keeps it.
+
+#include <gmock/gmock.h>
+
+#include <thread>
+
+#include "tests/examples/hostinfo/FakeHost.h"
+#include "tests/examples/hostinfo/HostinfoLibrary.h"
+
+using namespace std::string_literals;
+namespace fs = std::filesystem;
+
+namespace {
+
+class Notes : public testing::Test {
+ protected:
+  Notes() { setenv("HOSTINFO_STATE", state_.c_str(), 1); }
+  ~Notes() override { unsetenv("HOSTINFO_STATE"); }
+
+  /// Mounts these directories (as /proc/self/mounts writes them) and takes a snapshot.
+  void mount(const std::vector<std::string>& directories) {
+    std::string lines;
+    for (const std::string& directory : directories) {
+      lines += "x " + host_.makeDirectory("") + directory + " ext4 rw 0 0\n";
+    }
+    host_.writeMounts(lines);
+    ASSERT_EQ(library_.count("hostFileSystemCount"), static_cast<int>(directories.size()));
+  }
+  int set(const std::string& text, int index) const {
+    return library_.function<int(const char*, int)>("hostFileSystemSetOwner")(text.c_str(), index);
+  }
+  std::string get(int index) const { return library_.text("hostFileSystemOwner", index); }
+
+  std::string file() const {
+    std::ifstream stream(state_ + "/hostinfo.notes", std::ios::binary);
+    return {std::istreambuf_iterator<char>(stream), {}};
+  }
+  void writeFile(const std::string& text) const {
+    std::ofstream(state_ + "/hostinfo.notes", std::ios::binary) << text;
+  }
+
+  FakeHost host_;
+  const std::string state_ = host_.makeDirectory("state");
+  const std::string root_ = host_.makeDirectory("");
+  HostinfoLibrary library_;
+};
+
+TEST_F(Notes, AreOneEscapedLineEach) {
+  host_.makeDirectory("my disk");
+  mount({"state", "my\\040disk"});
+  EXPECT_EQ(get(0), "");
+  EXPECT_EQ(set("Ann\\B\tC\nD \x7f\xC3\xA9", 1), 0);
+  EXPECT_EQ(set("Bob", 0), 0);
+  EXPECT_EQ(file(), root_ + "my\\040disk Ann\\134B\\011C\\012D\\040\\177\xC3\xA9\n" + root_ +
+                        "state Bob\n");
+  EXPECT_EQ(get(1), "Ann\\B\tC\nD \xEF\xBF\xBD\xC3\xA9"s.replace(10, 3, "\x7f"));
+  EXPECT_EQ(get(0), "Bob");
+  EXPECT_EQ(set("", 1), 0);
+  EXPECT_EQ(file(), root_ + "state Bob\n");
+}
+
+// What XML cannot carry is one and the same in the names that clients see, but not here.
+TEST_F(Notes, BelongToTheNameOnTheHost) {
+  const std::vector<std::string> names = {"caf\xE9", "caf\xE8", "caf", "new\nline", "\\100"};
+  for (const std::string& name : names) host_.makeDirectory(name);
+  mount({"caf\xE9", "caf\xE8", "caf", "new\\012line", "\\134100"});
+  for (int i = 0; i < 5; ++i) EXPECT_EQ(set("note %s" + std::to_string(i), i), 0);
+  for (int i = 0; i < 5; ++i) EXPECT_EQ(get(i), "note %s" + std::to_string(i));
+}
+
+TEST_F(Notes, HaveAtMost1023Bytes) {
+  mount({"state"});
+  const std::string longest(1023, ' ');
+  EXPECT_EQ(set(longest, 0), 0);
+  EXPECT_EQ(set(longest + "x", 0), 1);
+  EXPECT_EQ(set(std::string(1000000, 'x'), 0), 1);
+  EXPECT_EQ(get(0), longest);
+}
+
+TEST_F(Notes, KeepTheLinesThatTheyDoNotUnderstand) {
+  mount({"state"});
+  const std::string others = "no blank\n\n x\n" + root_ + "state2 y\n" + root_ + "stat z\n";
+  writeFile(others + root_ + "state bad \xFF\\777\\001\n" + others);
+  EXPECT_EQ(get(0), "bad \xEF\xBF\xBD\\777\xEF\xBF\xBD");
+  EXPECT_EQ(set("good", 0), 0);
+  EXPECT_EQ(file(), others + others + root_ + "state good\n");
+}
+
+TEST_F(Notes, AreBoundedInNumber) {
+  mount({"state"});
+  std::string others;
+  for (int i = 0; i < 4095; ++i) others += "other" + std::to_string(i) + " x\n";
+  writeFile(others + root_ + "state old\n");
+  EXPECT_EQ(set("new", 0), 0);
+  EXPECT_EQ(file(), others + root_ + "state new\n");
+  writeFile(others + "one more\n");
+  EXPECT_EQ(set("new", 0), 1);
+  EXPECT_EQ(file(), others + "one more\n");
+  EXPECT_EQ(set("", 0), 0);
+}
+
+TEST_F(Notes, AreNotTouchedWhenTheyCannotBeReplaced) {
+  mount({"state"});
+  EXPECT_EQ(set("kept", 0), 0);
+  EXPECT_EQ(set("new", 1), 1) << "no such instance";
+  EXPECT_EQ(set("new", -1), 1);
+  setenv("HOSTINFO_STATE", (state_ + "/none").c_str(), 1);
+  EXPECT_EQ(set("new", 0), 1);
+  EXPECT_EQ(get(0), "");
+  setenv("HOSTINFO_STATE", state_.c_str(), 1);
+  fs::create_directories(state_ + "/hostinfo.notes.new/busy");
+  EXPECT_EQ(set("new", 0), 1);
+  EXPECT_EQ(get(0), "kept");
+  fs::remove(state_ + "/hostinfo.notes");
+  fs::create_directory(state_ + "/hostinfo.notes");
+  fs::remove_all(state_ + "/hostinfo.notes.new");
+  EXPECT_EQ(set("new", 0), 1) << "what cannot be read is not overwritten";
+}
+
+TEST_F(Notes, ALeftOverFileIsNotFollowed) {
+  mount({"state"});
+  std::ofstream(state_ + "/victim") << "precious";
+  fs::create_symlink(state_ + "/victim", state_ + "/hostinfo.notes.new");
+  EXPECT_EQ(set("new", 0), 0);
+  EXPECT_EQ(get(0), "new");
+  EXPECT_EQ(fs::file_size(state_ + "/victim"), 8u);
+}
+
+TEST_F(Notes, NoneIsLostWhenManyAreSetAtOnce) {
+  const std::vector<std::string> names = {"a", "b", "c", "d"};
+  for (const std::string& name : names) host_.makeDirectory(name);
+  mount(names);
+  std::vector<std::thread> threads;
+  for (int index = 0; index < 4; ++index) {
+    threads.emplace_back([this, index] {
+      library_.count("hostFileSystemCount");
+      for (int i = 0; i < 50; ++i) {
+        EXPECT_EQ(set(std::to_string(i), index), 0);
+        EXPECT_EQ(get(index), std::to_string(i));
+      }
+    });
+  }
+  for (std::thread& thread : threads) thread.join();
+  for (int index = 0; index < 4; ++index) EXPECT_EQ(get(index), "49");
+}
+
+}  // namespace
