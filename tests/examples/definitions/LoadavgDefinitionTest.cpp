@@ -47,6 +47,38 @@ TEST(LoadavgDefinition, TellsTheKernelsAverages) {
   for (std::size_t i = 0; i < 3; ++i) EXPECT_NEAR(told[i], before[i], 1);
 }
 
+TEST(LoadavgDefinition, TheMethodNamesTheSpansAboveANumber) {
+  const ExampleHome home("loadavg");
+  const ProviderDefMethod* above = getProviderDefClass("Load_Average")->getMethod("Above");
+  ASSERT_NE(above, nullptr);
+  std::vector<int> before;
+  std::vector<std::string> expected;
+  std::vector<ProviderDefValue> outputs;
+  do {  // until the numbers stood still meanwhile
+    before = kernelHundredths();
+    const auto averages = ExampleHome::values("Load_Average", "Hundredths");
+    const int middle = averages.at(1).getIntValue();
+    expected.clear();
+    for (int i = 0; i < 3; ++i) {
+      if (averages[static_cast<std::size_t>(i)].getIntValue() > middle) {
+        expected.push_back(ExampleHome::value("Load_Average", "Name", i).getStringValue());
+      }
+    }
+    outputs.clear();
+    EXPECT_EQ(above->exec({middle}, outputs, 0), 0);
+  } while (before != kernelHundredths());
+  ASSERT_EQ(outputs.size(), 1u);
+  EXPECT_EQ(outputs[0].getStringArray(), expected);
+
+  outputs.clear();
+  above->exec({-1}, outputs, 0);
+  EXPECT_EQ(outputs.at(0).getStringArray(),
+            (std::vector<std::string>{"last 1 min", "last 5 min", "last 15 min"}));
+  outputs.clear();
+  EXPECT_EQ(above->exec({"text"}, outputs, 0), 1);
+  EXPECT_TRUE(outputs.empty());
+}
+
 TEST(LoadavgDefinition, APositionBeyondTheLastIsZero) {
   const ExampleHome home("loadavg");
   for (const int index : {-1, 3, 1000000}) {
