@@ -1,77 +1,75 @@
 /* A plug-in whose answers the test sets and which notes what it is given. */
 #include "provider_test_plugin.h"
 
+#include <commonprovider/plugin.h>
 #include <stdio.h>
 #include <string.h>
 
-#define EXPORTED __attribute__((visibility("default")))
+CP_FUNCTION(getI, leftCount);
+CP_FUNCTION(getI, rightCount);
+CP_FUNCTION(getSi, leftText);
+CP_FUNCTION(getSi, rightText);
+CP_FUNCTION(getIi, number);
+CP_FUNCTION(getLi, wide);
+CP_FUNCTION(getAIi, numbers);
+CP_FUNCTION(getASi, texts);
+CP_FUNCTION(setIi, setNumber);
+CP_FUNCTION(setSi, setText);
+CP_FUNCTION(setAIi, setNumbers);
+CP_FUNCTION(setASi, setTexts);
+CP_FUNCTION(execCi, run);
 
-EXPORTED struct TestPluginState test_plugin_state;
+__attribute__((visibility("default"))) struct TestPluginState test_plugin_state;
 #define state test_plugin_state
 
-static void countCall(void) { __atomic_fetch_add(&state.calls, 1, __ATOMIC_RELAXED); }
-
-static void putWord(char* at, int word) { memcpy(at, &word, sizeof word); }
-
-static int getWord(const char* at) {
-  int word;
-  memcpy(&word, at, sizeof word);
-  return word;
+static void countCall(void) {
+  __atomic_fetch_add(&state.calls, 1, __ATOMIC_RELAXED);
 }
 
-static void tableText(const struct TestTable* table, void* out, int index) {
+static int tableText(const struct TestTable* table, void* out, int index) {
   countCall();
   if (table->texts[index] == NULL) {
     memset(out, 'x', TEST_BUFFER);
-  } else {
-    strcpy((char*)out, table->texts[index]);
+    return 0;
   }
+  return cp_return_string(out, table->texts[index]);
 }
 
-EXPORTED int leftCount(void) { return state.left.count; }
-EXPORTED int rightCount(void) { return state.right.count; }
-EXPORTED void leftText(void* out, int index) { tableText(&state.left, out, index); }
-EXPORTED void rightText(void* out, int index) { tableText(&state.right, out, index); }
+int leftCount(void) {
+  return state.left.count;
+}
+int rightCount(void) {
+  return state.right.count;
+}
+int leftText(void* out, int index) {
+  return tableText(&state.left, out, index);
+}
+int rightText(void* out, int index) {
+  return tableText(&state.right, out, index);
+}
 
-EXPORTED int number(int index) {
+int number(int index) {
   countCall();
   return state.numbers[index];
 }
 
-EXPORTED long wide(int index) {
+long wide(int index) {
   (void)index;
   countCall();
   return state.wide;
 }
 
-EXPORTED void numbers(void* out, int index) {
-  char* at = (char*)out;
-  int i;
+int numbers(void* out, int index) {
   (void)index;
   countCall();
-  putWord(at, 2);
-  putWord(at + 4, state.numbersCount);
-  for (i = 0; i < state.numbersCount; ++i) {
-    putWord(at + 8 + 8 * i, 0);
-    putWord(at + 12 + 8 * i, state.numbers[i]);
-  }
+  return cp_return_ints(out, state.numbers, (size_t)state.numbersCount);
 }
 
-/* All texts of the left table. Behind each string's NUL lie 24 bytes. */
-EXPORTED void texts(void* out, int index) {
-  char* at = (char*)out + 8;
-  int i;
+/* All texts of the left table. */
+int texts(void* out, int index) {
   (void)index;
   countCall();
-  putWord((char*)out, 3);
-  putWord((char*)out + 4, state.left.count);
-  for (i = 0; i < state.left.count; ++i) {
-    const size_t length = strlen(state.left.texts[i]);
-    putWord(at, 1);
-    putWord(at + 4, (int)length);
-    strcpy(at + 8, state.left.texts[i]);
-    at += 33 + length;
-  }
+  return cp_return_strings(out, state.left.texts, (size_t)state.left.count);
 }
 
 static void note(const char* text) {
@@ -84,30 +82,37 @@ static void noteNumber(int value) {
   note(text);
 }
 
-/* Writes an item as a text and gives the position of the next one. */
-static const char* noteItem(const char* item) {
-  const int tag = getWord(item);
-  const int word = getWord(item + 4);
-  int i;
-  const char* at = item + 8;
-  switch (tag) {
-    case 0:
-      noteNumber(word);
-      return at;
-    case 1:
-      note("'");
-      note(at);
-      note("'");
-      return at + word + 1;
-    default:
-      note("[");
-      for (i = 0; i < word; ++i) {
-        if (i != 0) note(" ");
-        at = noteItem(at);
-      }
-      note("]");
-      return at;
+static void noteItem(const cp_item* item);
+
+/* Each item as a text, with blanks between. */
+static void noteItems(cp_reader reader, const char* before) {
+  cp_item item;
+  while (cp_next(&reader, &item) == CP_OK) {
+    note(before);
+    noteItem(&item);
+    before = " ";
   }
+}
+
+static void noteItem(const cp_item* item) {
+  if (item->kind == CP_INT) {
+    noteNumber(item->number);
+  } else if (item->kind == CP_STRING) {
+    note("'");
+    note(item->text);
+    note("'");
+  } else {
+    note("[");
+    noteItems(item->elements, "");
+    note("]");
+  }
+}
+
+/* The one item of a set function's buffer, behind which there is no end mark. */
+static void noteFirst(const void* in) {
+  cp_reader reader = cp_read(in);
+  cp_item item;
+  if (cp_next(&reader, &item) == CP_OK) noteItem(&item);
 }
 
 static int endLine(int index) {
@@ -117,38 +122,34 @@ static int endLine(int index) {
   return 0;
 }
 
-EXPORTED int setNumber(int value, int index) {
+int setNumber(int value, int index) {
   note("number ");
   noteNumber(value);
   return endLine(index);
 }
 
-EXPORTED int setText(const char* value, int index) {
+int setText(const char* value, int index) {
   note("text '");
   note(value);
   note("'");
   return endLine(index);
 }
 
-EXPORTED int setNumbers(void* in, int index) {
+int setNumbers(void* in, int index) {
   note("numbers ");
-  noteItem((const char*)in);
+  noteFirst(in);
   return endLine(index);
 }
 
-EXPORTED int setTexts(void* in, int index) {
+int setTexts(void* in, int index) {
   note("texts ");
-  noteItem((const char*)in);
+  noteFirst(in);
   return endLine(index);
 }
 
-EXPORTED int run(void* in, void* out, int index) {
-  const char* at = (const char*)in;
+int run(void* in, void* out, int index) {
   note("run");
-  while (getWord(at) != 99) {
-    note(" ");
-    at = noteItem(at);
-  }
+  noteItems(cp_read(in), " ");
   memcpy(out, state.output, TEST_BUFFER);
   endLine(index);
   return state.result;
