@@ -37,10 +37,10 @@ static void escape(char to[kEscapedSize], const char* text) {
   *to = '\0';
 }
 
-// The text of a line that is about the escaped `name`, else NULL.
-static char* textOf(char* line, const char* name) {
-  const size_t length = strlen(name);
-  return strncmp(line, name, length) == 0 && line[length] == ' ' ? line + length + 1 : NULL;
+// The text of a line that is about this name, else NULL.
+static char* textOf(char* line, const char* escapedName) {
+  const size_t length = strlen(escapedName);
+  return strncmp(line, escapedName, length) == 0 && line[length] == ' ' ? line + length + 1 : NULL;
 }
 
 void noteRead(const char* name, char to[kNoteSize]) {
@@ -52,42 +52,53 @@ void noteRead(const char* name, char to[kNoteSize]) {
     return;
   }
   FILE* file = fopen(path, "re");
+  int begins = 1;
   escape(escaped, name);
-  while (file != NULL && hostReadLine(file, line, sizeof line)) {
-    char* text = textOf(line, escaped);
+  while (file != NULL && fgets(line, sizeof line, file) != NULL) {
+    char* text = begins ? textOf(line, escaped) : NULL;
     if (text != NULL) {
+      text[strcspn(text, "\n")] = '\0';
       textUnescape(text);
       textClean(to, kNoteSize, text);
       break;
     }
+    begins = strchr(line, '\n') != NULL;
   }
   if (file != NULL) {
     fclose(file);
   }
 }
 
-// Copies the lines about others; returns how many, -1 when they cannot all be read.
-static int copyOthers(FILE* from, FILE* to, const char* name) {
-  char line[kNoteLine];
+// Copies the lines about others as they are, in pieces where they are longer than any of ours.
+// Returns how many, -1 when they cannot all be read.
+static int copyOthers(FILE* from, FILE* to, const char* escapedName) {
+  char piece[kNoteLine];
   int copied = 0;
-  while (hostReadLine(from, line, sizeof line)) {
-    if (textOf(line, name) == NULL) {
-      fprintf(to, "%s\n", line);
-      ++copied;
+  int begins = 1;
+  int own = 0;
+  while (fgets(piece, sizeof piece, from) != NULL) {
+    own = begins ? textOf(piece, escapedName) != NULL : own;
+    if (!own) {
+      fputs(piece, to);
+      copied += begins;
     }
+    begins = strchr(piece, '\n') != NULL;
+  }
+  if (!begins && !own) {
+    fputc('\n', to);
   }
   return ferror(from) ? -1 : copied;
 }
 
 // Everything but the file's place: true when the notes are complete and on the disk.
-static int writeNotes(FILE* from, FILE* to, const char* name, const char* text) {
+static int writeNotes(FILE* from, FILE* to, const char* escapedName, const char* text) {
   char escaped[kEscapedSize];
-  const int others = from != NULL ? copyOthers(from, to, name) : 0;
+  const int others = from != NULL ? copyOthers(from, to, escapedName) : 0;
   int done = others >= 0;
   if (*text != '\0') {
     done = done && others < kMaxNotes;
     escape(escaped, text);
-    fprintf(to, "%s %s\n", name, escaped);
+    fprintf(to, "%s %s\n", escapedName, escaped);
   }
   done = done && fflush(to) == 0 && !ferror(to) && fsync(fileno(to)) == 0;
   return fclose(to) == 0 && done;
@@ -106,8 +117,8 @@ static int replaceNotes(const char* name, const char* text) {
   }
   escape(escaped, name);
   unlink(newPath);  // left behind by a crash
-  FILE* new = fopen(newPath, "wxe");
-  int done = new != NULL&& writeNotes(old, new, escaped, text);
+  FILE* replacement = fopen(newPath, "wxe");
+  int done = replacement != NULL && writeNotes(old, replacement, escaped, text);
   if (old != NULL) {
     fclose(old);
   }

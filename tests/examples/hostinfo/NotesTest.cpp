@@ -84,6 +84,15 @@ TEST_F(Notes, KeepTheLinesThatTheyDoNotUnderstand) {
   EXPECT_EQ(get(0), "bad \xEF\xBF\xBD\\777\xEF\xBF\xBD");
   EXPECT_EQ(set("good", 0), 0);
   EXPECT_EQ(file(), others + others + root_ + "state good\n");
+  const std::string longLine = std::string(20000, 'x') + root_ + "state y\n" + root_ + "state2 ";
+  writeFile(longLine + std::string(8191, 'z'));
+  EXPECT_EQ(get(0), "");
+  EXPECT_EQ(set("good", 0), 0);
+  EXPECT_EQ(file(), longLine + std::string(8191, 'z') + "\n" + root_ + "state good\n");
+  writeFile(root_ + "state " + std::string(20000, 'x'));
+  EXPECT_EQ(get(0), std::string(1023, 'x'));
+  EXPECT_EQ(set("good", 0), 0);
+  EXPECT_EQ(file(), root_ + "state good\n");
 }
 
 TEST_F(Notes, AreBoundedInNumber) {
