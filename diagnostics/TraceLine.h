@@ -12,7 +12,7 @@
 /// cheap.
 class TraceLine {
  public:
-  TraceLine() = default;
+  TraceLine() { buffer_[0] = '\0'; }
   TraceLine(const TraceLine&) = delete;
   TraceLine& operator=(const TraceLine&) = delete;
   ~TraceLine() { flush(); }

@@ -251,7 +251,7 @@ TEST(Output, EmbeddedInstancesAreBoundedInDepth) {
   for (int i = 0; i < 40; ++i) inner = disk("x", {property("V", CIMValue(inner))});
   const std::string text = print(OutputFormat::json, ResultForm::single, {inner});
   EXPECT_THAT(text, testing::Not(HasSubstr("leaf")));
-  EXPECT_NO_THROW(static_cast<void>(Json::parse(text)));
+  EXPECT_TRUE(Json::accept(text));
 }
 
 TEST(Output, PathsAndNames) {
