@@ -1,5 +1,5 @@
-// Reading definition files and looking classes up. The yardstick for reading is expat's pass over the
-// same text with empty handlers: it builds nothing.
+// Reading definition files and looking classes up. The yardstick for reading is expat's pass over
+// the same text with empty handlers: it builds nothing.
 
 #include "definition/DefinitionFile.h"
 #include "engine/ProviderDefClass.h"
@@ -15,24 +15,28 @@ namespace {
 
 std::string call(const std::string& function, const std::string& type) {
   return "        <functioncall>\n"
-         "          <function name=\"" + function + "\" type=\"" + type + "\"/>\n"
+         "          <function name=\"" +
+         function + "\" type=\"" + type +
+         "\"/>\n"
          "          <argument type=\"index\"/>\n"
          "        </functioncall>\n";
 }
 
 std::string classText(int number) {
   const std::string n = std::to_string(number);
-  std::string text = "  <class name=\"Bench_Class" + n + "\" namespace=\"root/bench\">\n"
-                     "    <instances>\n      <functioncall>\n        <function name=\"count" + n +
-                     "\" type=\"getI\"/>\n      </functioncall>\n    </instances>\n";
+  std::string text = "  <class name=\"Bench_Class" + n +
+                     "\" namespace=\"root/bench\">\n"
+                     "    <instances>\n      <functioncall>\n        <function name=\"count" +
+                     n + "\" type=\"getI\"/>\n      </functioncall>\n    </instances>\n";
   const char* const types[] = {"getSi", "getIi", "getLi"};
   for (int p = 0; p < 3; ++p) {
     const std::string name = "Property" + std::to_string(p);
     text += "    <property name=\"" + name + "\">\n      <get>\n" +
             call("get" + name + "OfClass" + n, types[p]) + "      </get>\n    </property>\n";
   }
-  text += "    <property name=\"CreationClassName\">\n      <get>\n"
-          "        <constant type=\"string\">Bench_Class</constant>\n      </get>\n    </property>\n";
+  text +=
+      "    <property name=\"CreationClassName\">\n      <get>\n"
+      "        <constant type=\"string\">Bench_Class</constant>\n      </get>\n    </property>\n";
   return text + "  </class>\n";
 }
 

@@ -78,8 +78,8 @@ class BenchHost : public CIMOMHandleRep {
   CIMClass class_ = benchClass();
 };
 
-// What somebody would write for this one class: the property names, types and calls in the code, and
-// each value set on the class's own property, as in the library.
+// What somebody would write for this one class: the property names, types and calls in the code,
+// and each value set on the class's own property, as in the library.
 class HandWritten {
  public:
   HandWritten() : library_(dlopen(BENCH_PLUGIN, RTLD_NOW)) {
@@ -174,9 +174,9 @@ std::string definitionText() {
                      "<functioncall><function name=\"benchCount\" type=\"getI\"/></functioncall>"
                      "</instances>";
   for (const PropertyRow& row : kProperties) {
-    text += std::string("<property name=\"") + row.name + "\"><get><functioncall><function name=\"" +
-            row.function + "\" type=\"" + row.functionType +
-            "\"/><argument type=\"index\"/></functioncall></get></property>";
+    text += std::string("<property name=\"") + row.name +
+            "\"><get><functioncall><function name=\"" + row.function + "\" type=\"" +
+            row.functionType + "\"/><argument type=\"index\"/></functioncall></get></property>";
   }
   return text + "</class></plugin>";
 }
@@ -242,8 +242,8 @@ void enumerateLibrary(benchmark::State& state) {
   CIMOMHandle cimom;
   void* library = dlopen(COMMONPROVIDER_LIBRARY, RTLD_NOW);
   if (library == nullptr) throw std::runtime_error(dlerror());
-  const auto create = reinterpret_cast<CIMProvider* (*)(const String&)>(
-      dlsym(library, "PegasusCreateProvider"));
+  const auto create =
+      reinterpret_cast<CIMProvider* (*)(const String&)>(dlsym(library, "PegasusCreateProvider"));
   CIMProvider* provider = create(String("CommonProvider"));
   provider->initialize(cimom);
   auto* instances = dynamic_cast<CIMInstanceProvider*>(provider);

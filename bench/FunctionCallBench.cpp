@@ -18,11 +18,11 @@ void directCall(benchmark::State& state) {
 BENCHMARK(directCall);
 
 void callThroughEngine(benchmark::State& state, const char* name, const char* type) {
-  ProviderDefModule* module = registerModule(std::make_unique<ProviderDefModule>(BENCH_PLUGIN, false));
-  ProviderDefFunction* function = registerFunction(
-      std::make_unique<ProviderDefFunction>(name, functionTypeCode(type), module));
-  const ProviderDefFunctionCall call(function,
-                                     {ProviderDefArgument(ProviderDefArgument::kIndex)});
+  ProviderDefModule* module =
+      registerModule(std::make_unique<ProviderDefModule>(BENCH_PLUGIN, false));
+  ProviderDefFunction* function =
+      registerFunction(std::make_unique<ProviderDefFunction>(name, functionTypeCode(type), module));
+  const ProviderDefFunctionCall call(function, {ProviderDefArgument(ProviderDefArgument::kIndex)});
   int index = 0;
   for (auto _ : state) benchmark::DoNotOptimize(call.getValue(index++ & 1023));
   releaseFunctions();

@@ -9,9 +9,13 @@ int benchTexts(void* out, int index);
 int benchNumbers(void* out, int index);
 int benchCount(void);
 
-int benchNumber(int index) { return index + 1; }
+int benchNumber(int index) {
+  return index + 1;
+}
 
-long benchLong(int index) { return index + 1000000L; }
+long benchLong(int index) {
+  return index + 1000000L;
+}
 
 int benchText(void* out, int index) {
   char* text = out;
@@ -46,4 +50,6 @@ int benchNumbers(void* out, int index) {
   return 0;
 }
 
-int benchCount(void) { return 1000; }
+int benchCount(void) {
+  return 1000;
+}
