@@ -41,7 +41,7 @@ std::string Diagnostic::toString() const {
   if (line > 0 && column > 0) text += ":" + std::to_string(column);
   text += severity == Severity::error ? ": error: " : ": warning: ";
   text += displayLines(message);
-  if (!source.empty() && column > 0) text += caretLines(source, column);
+  if (!source.empty() && column > 0) text += caretLines(source, caret > 0 ? caret : column);
   return text;
 }
 

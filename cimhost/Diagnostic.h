@@ -14,7 +14,8 @@ struct Diagnostic {
   int line = 0;         ///< From 1; 0: the file as a whole.
   int column = 0;       ///< From 1, in bytes; 0: the line as a whole.
   std::string message;  ///< Without the place; may have several lines.
-  std::string source;   ///< The text of the line; empty: no caret line.
+  std::string source;   ///< The text of the line, or a part of it; empty: no caret line.
+  int caret = 0;        ///< The place in `source`, from 1, in bytes; 0: that of the column.
 
   /// "file:line:column: error: message", and the source line with a caret line under the column
   /// where both are known. Safe for a terminal; no line end after the last line.

@@ -4,6 +4,7 @@
 #include "cimhost/DefinitionFiles.h"
 #include "cimhost/HostError.h"
 #include "cimhost/ServedClassCheck.h"
+#include "cimhost/Text.h"
 #include "cimhost/mof/MofReader.h"
 
 namespace cimhost {
@@ -12,6 +13,23 @@ namespace {
 
 constexpr const char* kProviderName = "CommonProvider";
 constexpr const char* kDefaultNamespace = "root/cimv2";
+
+// The place of a character (from 1), in bytes.
+int bytePlace(const std::string& text, int character) {
+  std::size_t position = 0;
+  for (int i = 1; i < character && position < text.size(); ++i) nextCodePoint(text, position);
+  return static_cast<int>(position) + 1;
+}
+
+Diagnostic toDiagnostic(const MofDiagnostic& problem, const Home& home) {
+  return {Diagnostic::Severity::error,
+          home.relative(problem.file),
+          problem.line,
+          problem.column,
+          problem.message,
+          problem.source,
+          bytePlace(problem.source, problem.caret)};
+}
 
 }  // namespace
 
@@ -47,8 +65,7 @@ void Host::readDeclarations() {
   MofReader reader(repository_);
   reader.readDirectory(home_.mof(), Pegasus::CIMNamespaceName(kDefaultNamespace));
   for (const MofDiagnostic& problem : reader.diagnostics()) {
-    diagnostics_.push_back({Diagnostic::Severity::error, home_.relative(problem.file), problem.line,
-                            problem.column, problem.message, problem.source});
+    diagnostics_.push_back(toDiagnostic(problem, home_));
   }
 }
 

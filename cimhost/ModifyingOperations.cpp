@@ -60,7 +60,8 @@ OperationStatus Operations::invokeMethod(const OperationContext& context,
 void Operations::requireServed(const CIMNamespaceName& nameSpace, const CIMName& className) const {
   requireClass(nameSpace, className);
   if (served_.serves(nameSpace, className)) return;
-  throw CIMException(CIM_ERR_NOT_SUPPORTED, className.getString());
+  throw CIMException(CIM_ERR_NOT_SUPPORTED,
+                     String("No provider serves class ") + className.getString());
 }
 
 void Operations::requireMethod(const InvokeMethodRequest& request) const {

@@ -8,8 +8,7 @@ using Pegasus::CIM_ERR_FAILED;
 using Pegasus::CIM_ERR_SUCCESS;
 
 std::string OperationStatus::name() const {
-  const std::string text = Pegasus::cimStatusCodeToString(code);
-  return text.empty() ? std::to_string(static_cast<int>(code)) : text;
+  return Pegasus::cimStatusCodeToString(code);
 }
 
 std::string OperationStatus::toString() const {
@@ -18,13 +17,22 @@ std::string OperationStatus::toString() const {
   return text;
 }
 
+namespace {
+
+// A provider may throw any number; what a client gets, and an exit code, needs one of the standard.
+Pegasus::CIMStatusCode failureCode(Pegasus::CIMStatusCode thrown) {
+  const bool known = thrown != CIM_ERR_SUCCESS && *Pegasus::cimStatusCodeToString(thrown) != '\0';
+  return known ? thrown : CIM_ERR_FAILED;
+}
+
+}  // namespace
+
 OperationStatus currentExceptionStatus() noexcept {
   try {
     try {
       throw;
     } catch (const Pegasus::CIMException& error) {
-      const bool noCode = error.getCode() == CIM_ERR_SUCCESS;
-      return {noCode ? CIM_ERR_FAILED : error.getCode(), toUtf8(error.getMessage())};
+      return {failureCode(error.getCode()), toUtf8(error.getMessage())};
     } catch (const Pegasus::Exception& error) {
       return {CIM_ERR_FAILED, toUtf8(error.getMessage())};
     } catch (const std::exception& error) {

@@ -2,6 +2,7 @@
 
 #include "cimhost/Diagnostic.h"
 #include "cimhost/Text.h"
+#include "cimhost/output/DisplayText.h"
 
 namespace cimhost {
 
@@ -82,7 +83,8 @@ std::size_t keysPosition(const std::string& text) {
 
 PathArgumentError::PathArgumentError(const std::string& argument, std::size_t position,
                                      const std::string& reason)
-    : std::runtime_error("object path, column " + std::to_string(position + 1) + ": " + reason +
+    : std::runtime_error("object path, column " + std::to_string(position + 1) + ": " +
+                         displayText(reason) +
                          caretLines(argument, static_cast<int>(position) + 1)),
       column_(static_cast<int>(position) + 1) {}
 

@@ -33,6 +33,7 @@ struct Case {
 };
 
 TEST(ModifyingOperations, EndAsOnAServer) {
+  constexpr const char* kUnserved = "7 No provider serves class Test_Unserved";
   const Case cases[] = {
       {"Test_Disk", "0 ", "0 ", "0 "},
       {"Test_Nothing", "0 ", "0 ", "0 "},
@@ -40,7 +41,7 @@ TEST(ModifyingOperations, EndAsOnAServer) {
       {"Test_ThrowsCim", "2 not for you", "2 not for you", "2 not for you"},
       {"Test_ThrowsNotSupported", "7 no", "7 no", "7 no"},  // not swallowed here
       {"Test_ThrowsInt", "1 Unknown error.", "1 Unknown error.", "1 Unknown error."},
-      {"Test_Unserved", "7 Test_Unserved", "7 Test_Unserved", "7 Test_Unserved"},
+      {"Test_Unserved", kUnserved, kUnserved, kUnserved},
       {"Test_Missing", "5 Test_Missing", "5 Test_Missing", "5 Test_Missing"},
   };
   TestHost host;

@@ -49,6 +49,7 @@ INSTANTIATE_TEST_SUITE_P(
                     EnumerationCase{"Test_TwoBatches", 0, "", {"b"}},
                     EnumerationCase{"Test_ThrowsCim", 2, "not for you", {}},
                     EnumerationCase{"Test_ThrowsSuccess", 1, "odd", {}},
+                    EnumerationCase{"Test_ThrowsOddCode", 1, "odd", {}},
                     EnumerationCase{"Test_ThrowsNotSupported", 0, "", {}},
                     EnumerationCase{"Test_ThrowsPegasus", 1, "The CIM name is not valid: 1x", {}},
                     EnumerationCase{"Test_ThrowsStd", 1, "std \xEF\xBF\xBD", {}},

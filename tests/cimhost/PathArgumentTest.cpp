@@ -58,6 +58,7 @@ INSTANTIATE_TEST_SUITE_P(
         MalformedCase{"ColonInValue", parseInstancePath, "A.k=\"x:y\"", 1, "no namespace"},
         MalformedCase{"NoClass", parseClassPath, "root:", 6, "class name"},
         MalformedCase{"EmptyNamespace", parseNamespaceOrClass, "", 1, "namespace"},
+        MalformedCase{"ControlCharacter", parseClassPath, "root:\x1b[2J", 6, "class name \\x1b[2J"},
         MalformedCase{"NotUtf8", parseClassPath, "root:\xff", 6, "UTF-8"}),
     [](const auto& row) { return std::string(row.param.name); });
 

@@ -101,13 +101,17 @@ TestHost::TestHost(const std::string& providerName) {
   repository.addClass(kNamespace, makeClass("Test_Unserved", "Test_Base", {"Size"}));
   repository.addClass(kNamespace, makeClass("Test_Disk", "Test_Base", {"Text"}));
   repository.addClass(kNamespace, makeClass("Test_BigDisk", "Test_Disk", {"Size"}));
-  for (const char* name : {"Test_Array",         "Test_Nothing",       "Test_OnlyCompletes",
-                           "Test_NoComplete",    "Test_LateDelivery",  "Test_TwoBatches",
-                           "Test_ThrowsCim",     "Test_ThrowsSuccess", "Test_ThrowsNotSupported",
-                           "Test_ThrowsPegasus", "Test_ThrowsStd",     "Test_ThrowsInt",
-                           "Test_Uninitialized", "Test_Many",          "Test_ManyNoComplete",
-                           "Test_ManyThrows",    "Test_Swallows",      "Test_ServerDisks",
-                           "Test_Nested",        "Test_NoNamespace",   "Test_EchoPath"}) {
+  for (const char* name : {"Test_Array",         "Test_Nothing",
+                           "Test_OnlyCompletes", "Test_NoComplete",
+                           "Test_LateDelivery",  "Test_TwoBatches",
+                           "Test_ThrowsCim",     "Test_ThrowsSuccess",
+                           "Test_ThrowsOddCode", "Test_ThrowsNotSupported",
+                           "Test_ThrowsPegasus", "Test_ThrowsStd",
+                           "Test_ThrowsInt",     "Test_Uninitialized",
+                           "Test_Many",          "Test_ManyNoComplete",
+                           "Test_ManyThrows",    "Test_Swallows",
+                           "Test_ServerDisks",   "Test_Nested",
+                           "Test_NoNamespace",   "Test_EchoPath"}) {
     repository.addClass(kNamespace, makeClass(name, "", {"Name", "Size"}));
     served.add({kNamespace, CIMName(name), false, false, "test.xml", {}});
   }

@@ -124,6 +124,7 @@ const std::map<std::string, Behaviour> kBehaviours = {
        throw CIMException(CIM_ERR_ACCESS_DENIED, "not for you");
      }},
     {"Test_ThrowsSuccess", [](const Request&) { throw CIMException(CIM_ERR_SUCCESS, "odd"); }},
+    {"Test_ThrowsOddCode", [](const Request&) { throw CIMException(CIMStatusCode(246), "odd"); }},
     {"Test_ThrowsNotSupported",
      [](const Request& r) {
        r.deliver("lost"), r.complete();
