@@ -15,6 +15,11 @@ need() {
   [ ${#missing[@]} -eq 0 ] && return
   local as_root=()
   [ "$(id -u)" -eq 0 ] || as_root=(sudo)
+  if [ -n "${as_root[*]}" ] && ! command -v sudo >/dev/null; then
+    echo "Debian packages are missing, and there is no sudo to install them. As root:" >&2
+    echo "  apt-get install --no-install-recommends ${missing[*]}" >&2
+    exit 1
+  fi
   echo "Installing Debian packages: ${missing[*]}"
   "${as_root[@]}" apt-get update -qq
   "${as_root[@]}" env DEBIAN_FRONTEND=noninteractive \
@@ -24,6 +29,8 @@ need() {
 build_packages=(cmake ninja-build g++ libcli11-dev nlohmann-json3-dev)
 test_packages=(libgtest-dev libgmock-dev googletest)
 i386_packages=(g++-multilib)
+clang_packages=(clang)
+benchmark_packages=(libbenchmark-dev libexpat1-dev)
 
 # configure PRESET [ARGUMENT...]: quiet unless it fails.
 configure() {
@@ -41,5 +48,6 @@ configure() {
 build() {
   local preset=$1
   shift
+  [ -e "build/$preset/.ninja_log" ] || echo "Building in build/$preset; this takes some minutes"
   cmake --build --preset "$preset" -j "$jobs" ${1:+--target "$@"} -- --quiet
 }
