@@ -1,5 +1,6 @@
 #include "cimhost/DefinitionFiles.h"
 
+#include "cimhost/LibraryCheck.h"
 #include "cimhost/OperationStatus.h"
 #include "cimhost/Text.h"
 
@@ -38,6 +39,28 @@ Diagnostic toDiagnostic(const definition::Problem& problem, const std::string& f
   return diagnostic;
 }
 
+Diagnostic warning(const std::string& file, const std::string& message) {
+  Diagnostic diagnostic;
+  diagnostic.severity = Diagnostic::Severity::warning;
+  diagnostic.file = file;
+  diagnostic.message = message;
+  return diagnostic;
+}
+
+// What keeps the plug-ins from being called, as far as it shows without loading them.
+void warnOfPlugins(const definition::CheckResult& result, const std::string& folder,
+                   std::vector<Diagnostic>& diagnostics) {
+  for (const definition::UsedModule& module : result.modules) {
+    const std::string problem = libraryProblem(module.library);
+    if (problem.empty()) continue;
+    diagnostics.push_back(
+        warning(folder + module.file, "module " + module.name + " cannot be loaded: " + problem));
+  }
+  for (const definition::Problem& function : result.uncallable) {
+    diagnostics.push_back(warning(folder + function.file, function.message));
+  }
+}
+
 }  // namespace
 
 std::vector<std::string> findDefinitionFiles(const std::string& directory) {
@@ -68,6 +91,7 @@ std::vector<Diagnostic> readDefinitions(const std::string& folder, ServedClasses
                            "class " + entry.className + " is not served: " + status.message,
                            {}});
   }
+  warnOfPlugins(result, folder, diagnostics);
   return diagnostics;
 }
 

@@ -14,7 +14,8 @@ std::vector<std::string> findDefinitionFiles(const std::string& directory);
 
 /// Reads the definition files of the working directory and adds what they define to `served`;
 /// returns what is wrong with them, each file named below `folder`. A definition whose namespace or
-/// class name is not valid CIM is an error and serves nothing.
+/// class name is not valid CIM is an error and serves nothing. Functions and libraries that cannot
+/// be called or loaded are warnings.
 ///
 /// Uses the definition registries that are linked into this program, not those of a loaded provider
 /// library, and leaves them empty. Not for several threads.

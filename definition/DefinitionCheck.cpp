@@ -7,6 +7,7 @@
 #include "engine/Registry.h"
 
 #include <algorithm>
+#include <unordered_set>
 #include <utility>
 
 namespace definition {
@@ -55,6 +56,21 @@ void checkEnd(const std::string& file, const std::string& text, int stopped,
   }
 }
 
+std::string whyUncallable(const ProviderDefFunction& function) {
+  if (functionTypeSlot(function.getType()) < 0) return "its type is none of the function types";
+  return function.getModule() == nullptr ? "no module element stands before it" : std::string();
+}
+
+void checkFunctions(const std::string& file, size_t first, CheckResult& result) {
+  for (size_t i = first; i < registeredFunctions().size(); ++i) {
+    const std::string reason = whyUncallable(*registeredFunctions()[i]);
+    if (reason.empty()) continue;
+    const std::string& name = registeredFunctions()[i]->getName();
+    result.uncallable.push_back(
+        {file, 0, 0, "function " + name + " is never called: " + reason, std::string()});
+  }
+}
+
 void checkFile(const std::string& file, CheckResult& result) {
   std::string error;
   const std::string text = loadFile(file, error);
@@ -64,6 +80,8 @@ void checkFile(const std::string& file, CheckResult& result) {
   }
   const size_t firstClass = registeredClasses().size();
   const size_t firstAssociation = registeredAssociations().size();
+  const size_t firstFunction = functionCount();
+  const size_t before = result.problems.size();
   try {
     checkEnd(file, text, readText(text), result.problems);
   } catch (const ProviderDefXMLError& syntax) {
@@ -84,13 +102,34 @@ void checkFile(const std::string& file, CheckResult& result) {
     const ProviderDefAssociation& read = registeredAssociations()[i];
     result.served.push_back({read.getNamespace(), read.getName(), true, false, file, {}});
   }
+  if (result.problems.size() == before) checkFunctions(file, firstFunction, result);
+}
+
+// Before the registries are released.
+void keepUsedModules(std::vector<UsedModule>& modules) {
+  std::unordered_set<std::string> used;
+  for (const auto& function : registeredFunctions()) {
+    if (function->getModule() != nullptr) used.insert(function->getModule()->getName());
+  }
+  modules.erase(
+      std::remove_if(modules.begin(), modules.end(),
+                     [&](const UsedModule& module) { return used.count(module.name) == 0; }),
+      modules.end());
 }
 
 CheckResult readFiles(const std::vector<std::string>& files) {
   configRead.store(1);
   LOG_LEVEL.store(0);
   CheckResult result;
-  for (const std::string& file : files) checkFile(file, result);
+  for (const std::string& file : files) {
+    const size_t firstModule = registeredModules().size();
+    checkFile(file, result);
+    for (size_t i = firstModule; i < registeredModules().size(); ++i) {
+      const ProviderDefModule& read = *registeredModules()[i];
+      result.modules.push_back({file, read.getName(), read.libraryFile()});
+    }
+  }
+  keepUsedModules(result.modules);
   return result;
 }
 

@@ -25,9 +25,18 @@ struct Served {
   std::vector<std::string> properties;  ///< Of a class: those that have a definition.
 };
 
+/// A module with at least one function.
+struct UsedModule {
+  std::string file;  ///< The definition file that declares it first.
+  std::string name;
+  std::string library;  ///< As the loader gets it: a path is relative to the working directory.
+};
+
 struct CheckResult {
   std::vector<Problem> problems;
+  std::vector<Problem> uncallable;  ///< Functions that no call can reach, without a place.
   std::vector<Served> served;
+  std::vector<UsedModule> modules;
 };
 
 /// Reads definition files as the provider does, for a program that wants to know what they declare.

@@ -67,7 +67,8 @@ void ProviderDefModule::open() {
   // The loader takes an empty name for the program itself.
   void* handle = file.empty() ? nullptr : dlopen(file.c_str(), RTLD_NOW);
   if (handle == nullptr) {
-    DEBUG_FORMAT(7, "Loading %s\n", name_.c_str());
+    const char* reason = file.empty() ? nullptr : dlerror();
+    DEBUG_FORMAT(7, "Loading %s: %s\n", name_.c_str(), reason == nullptr ? "no name" : reason);
     throw ProviderDefError("Couldn't load module " + name_);
   }
   handle_.reset(handle, [](void* opened) { dlclose(opened); });

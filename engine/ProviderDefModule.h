@@ -36,6 +36,8 @@ class ProviderDefModule {
   const std::string& getName() const { return name_; }
   /// 1: the name is short for "../lib/lib" + name + ".so"; 0: it is the path itself.
   int getPath() const { return path_; }
+  /// What the loader is asked to open; a path is relative to the working directory.
+  std::string libraryFile() const;
   bool getNeedInit() const { return needInit_; }
   /// The call that runs once after the library is opened; not owned, nullptr without one.
   ProviderDefFunctionCall* getInit() const { return init_; }
@@ -60,7 +62,6 @@ class ProviderDefModule {
   void read(ElementReader& reader);
   void readOrDetach(ElementReader& reader);
   void open();
-  std::string libraryFile() const;
   void detachFunctions();
 
   std::string name_;

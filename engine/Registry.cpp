@@ -118,6 +118,10 @@ ProviderDefFunctionCall* keepInitCall(std::unique_ptr<ProviderDefFunctionCall> c
   return registries().initCalls.back().get();
 }
 
+const std::vector<std::unique_ptr<ProviderDefFunction>>& registeredFunctions() {
+  return functions().objects();
+}
+
 size_t functionCount() {
   return functions().objects().size();
 }

@@ -35,6 +35,9 @@ ProviderDefFunction* registerNewFunction(std::unique_ptr<ProviderDefFunction> fu
 /// object that was read with it, since a registered module of the same name can take it over.
 ProviderDefFunctionCall* keepInitCall(std::unique_ptr<ProviderDefFunctionCall> call);
 
+/// The registered functions in order of registration.
+const std::vector<std::unique_ptr<ProviderDefFunction>>& registeredFunctions();
+
 /// How many functions are registered.
 size_t functionCount();
 

@@ -81,6 +81,7 @@ class HostTest : public testing::Test {
     writeGoodFiles();
     write("run/linked.xml", std::string("<plugin><module name=\"m\" path=\"short\"></module>") +
                                 kPortAndLink + "</plugin>");
+    fs::create_symlink(TEST_PROVIDER_FILE, home_ / "lib/libm.so");
   }
 
   std::vector<std::string> diagnostics() {
@@ -183,6 +184,52 @@ TEST_F(HostTest, DefinitionsAndDeclarationsThatDoNotFitAreToldApart) {
                   "declared; it is left out",
                   "run/a.xml: warning: property 1x of class A is defined, but not declared; "
                   "it is left out"));
+}
+
+TEST_F(HostTest, PluginsThatCannotBeCalledAreToldWithoutLoadingThem) {
+  const auto call = [](const std::string& function, const std::string& type) {
+    return "<property name=\"" + function + "\"><get><functioncall><function name=\"" + function +
+           "\" type=\"" + type + "\"/></functioncall></get></property>";
+  };
+  const auto define = [&](const std::string& name, const std::string& module,
+                          const std::string& type) {
+    write("run/" + name + ".xml",
+          "<plugin>" + module + "<class name=\"A\"><instances><constant type=\"int\">1</constant>" +
+              "</instances>" + call("f_" + name, type) + "</class></plugin>");
+  };
+  write("mof/root/test/classes.mof",
+        "class A { [Key] string f_absent; [Key] string f_text; [Key] string f_pipe; [Key] string "
+        "f_words; [Key] string f_type; [Key] string f_none; [Key] string f_searched; };");
+  for (const char* name : {"absent", "text", "pipe", "words"}) {
+    const std::string module =
+        std::string("<module name=\"") + name + "\" path=\"short\"></module>";
+    define(name, module, "getS");
+  }
+  define("type", "<module name=\"good\" path=\"short\"></module>", "getText");
+  define("none", "", "getS");
+  define("searched", "<module name=\"libnowhere.so\" path=\"full\"></module>", "getS");
+  write("run/unused.xml", "<plugin><module name=\"unused\" path=\"short\"></module></plugin>");
+  fs::create_symlink(TEST_PROVIDER_FILE, home_ / "lib/libgood.so");
+  write("lib/libtext.so", "int f;\n");
+  ASSERT_EQ(mkfifo((home_ / "lib/libpipe.so").c_str(), 0600), 0);
+  const bool wide = sizeof(void*) == 8;
+  write("lib/libwords.so", std::string("\x7f") + "ELF" + (wide ? '\1' : '\2') + "\1\1");
+  const std::string cannot = ".xml: warning: module ";
+  EXPECT_THAT(
+      diagnostics(),
+      testing::UnorderedElementsAre(
+          "run/absent" + cannot +
+              "absent cannot be loaded: lib/libabsent.so: No such file or "
+              "directory",
+          "run/text" + cannot + "text cannot be loaded: lib/libtext.so is not a shared library",
+          "run/pipe" + cannot + "pipe cannot be loaded: lib/libpipe.so: not a regular file",
+          "run/words" + cannot + "words cannot be loaded: lib/libwords.so is a " +
+              (wide ? "32-bit library, cimhost a 64-bit" : "64-bit library, cimhost a 32-bit") +
+              " program",
+          "run/type.xml: warning: function f_type is never called: its type is none of the "
+          "function types",
+          "run/none.xml: warning: function f_none is never called: no module element stands before "
+          "it"));
 }
 
 TEST_F(HostTest, AGoodHomeChecksWell) {
