@@ -1,8 +1,5 @@
 #include <gmock/gmock.h>
 
-#include <algorithm>
-
-#include "association/ProviderDefAssociation.h"
 #include "tests/examples/definitions/ExampleHome.h"
 
 namespace {
@@ -50,79 +47,6 @@ TEST(HostinfoDefinition, ArraysArriveWhole) {
   }
   for (const ProviderDefValue& traffic : ExampleHome::values("Host_NetworkPort", "Traffic")) {
     EXPECT_THAT(traffic.getIntArray(), testing::SizeIs(4));
-  }
-}
-
-TEST(HostinfoDefinition, MethodsReachTheirFunctions) {
-  const ExampleHome home("hostinfo");
-  const ProviderDefClass* definition = getProviderDefClass("Host_FileSystem");
-  const auto names = ExampleHome::values("Host_FileSystem", "Name");
-  std::vector<ProviderDefValue> outputs;
-  ASSERT_NE(definition->getMethod("FindByType"), nullptr);
-  definition->getMethod("FindByType")->exec({"", 1}, outputs, 0);
-  ASSERT_EQ(outputs.size(), 2u);
-  EXPECT_EQ(outputs[0].getIntValue(), static_cast<int>(names.size()));
-  EXPECT_THAT(outputs[1].getStringArray(), testing::ElementsAre(names[0].getStringValue()));
-
-  const int last = static_cast<int>(names.size()) - 1;
-  outputs.clear();
-  ASSERT_NE(definition->getMethod("CheckSpace"), nullptr);
-  EXPECT_EQ(definition->getMethod("CheckSpace")->exec({0}, outputs, last), 0);
-  ASSERT_EQ(outputs.size(), 3u);
-  EXPECT_EQ(outputs[2].getStringValue(), names.back().getStringValue());
-}
-
-TEST(HostinfoDefinition, TheNoteThatIsSetIsRead) {
-  const ExampleHome home("hostinfo");
-  ASSERT_GT(getProviderDefClass("Host_FileSystem")->getNumberOfInstances(), 0);
-  const auto* owner = getProviderDefClass("Host_FileSystem")->getProperty("Owner");
-  const std::string before = owner->getValue(0).getStringValue();
-  EXPECT_EQ(owner->setValue("Ann B.", 0), 0);
-  EXPECT_EQ(owner->getValue(0).getStringValue(), "Ann B.");
-  EXPECT_EQ(owner->setValue(ProviderDefValue(before), 0), 0);
-}
-
-std::vector<std::vector<ProviderDefValue>> rows(const char* className, const char* property) {
-  std::vector<std::vector<ProviderDefValue>> result;
-  for (const ProviderDefValue& value : ExampleHome::values(className, property)) {
-    result.push_back({value});
-  }
-  return result;
-}
-
-std::vector<int> positionsOf(const ProviderDefValue& wanted,
-                             const std::vector<std::vector<ProviderDefValue>>& among) {
-  std::vector<int> result;
-  for (std::size_t i = 0; i < among.size(); ++i) {
-    if (among[i][0].getStringValue() == wanted.getStringValue()) {
-      result.push_back(static_cast<int>(i));
-    }
-  }
-  return result;
-}
-
-TEST(HostinfoDefinition, LinksEachAddressWithItsPort) {
-  const ExampleHome home("hostinfo");
-  const ProviderDefAssociation* link = getProviderDefAssociation("Host_PortEndpoint");
-  ASSERT_NE(link, nullptr);
-  EXPECT_EQ(link->getPropertyNamePair(),
-            std::make_pair(std::string("Port"), std::string("Endpoint")));
-  const auto ports = rows("Host_NetworkPort", "Name");
-  const auto endpoints = rows("Host_IPEndpoint", "PortName");
-
-  std::size_t linked = 0;
-  for (std::size_t i = 0; i < ports.size(); ++i) {
-    const auto found = link->getAssociation("Host_NetworkPort", static_cast<int>(i), ports[i],
-                                            "Host_IPEndpoint", endpoints);
-    EXPECT_EQ(found, positionsOf(ports[i][0], endpoints));
-    linked += found.size();
-  }
-  EXPECT_EQ(linked, endpoints.size());
-
-  for (std::size_t i = 0; i < endpoints.size(); ++i) {
-    EXPECT_EQ(link->getAssociation("Host_IPEndpoint", static_cast<int>(i), endpoints[i],
-                                   "Host_NetworkPort", ports),
-              positionsOf(endpoints[i][0], ports));
   }
 }
 

@@ -56,6 +56,7 @@ TEST_F(Methods, FindByTypeTakesWhatTheClientSends) {
       {Values{"xfs"}, "0 1; 3 {" + b + "}; -> 0"},
       {Values{2}, "0 3; 3 {" + a + ", " + b + "}; -> 1"},
       {Values{}, "0 3; 3 {" + a + ", " + b + ", " + c + "}; -> 0"},
+      {Values{"", 1}, "0 3; 3 {" + a + "}; -> 1"},
       {Values{"ext", 5}, "0 0; 3 {}; -> 0"},
       {Values{5, "ext4"}, "-> 2"},
       {Values{std::vector<int>{5}}, "-> 2"},
