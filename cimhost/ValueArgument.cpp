@@ -1,7 +1,7 @@
 #include "cimhost/ValueArgument.h"
 
+#include "cimhost/CimTypes.h"
 #include "cimhost/Text.h"
-#include "cimhost/output/CimTypes.h"
 #include "cimhost/output/DisplayText.h"
 
 #include <strings.h>

@@ -1,7 +1,7 @@
 #include "cimhost/mof/MofValue.h"
 
+#include "cimhost/CimTypes.h"
 #include "cimhost/mof/Utf8.h"
-#include "cimhost/output/CimTypes.h"
 
 #include <limits>
 #include <type_traits>

@@ -1,5 +1,5 @@
+#include "cimhost/CimTypes.h"
 #include "cimhost/Text.h"
-#include "cimhost/output/CimTypes.h"
 #include "cimhost/output/ResultWriter.h"
 
 #include <nlohmann/json.hpp>

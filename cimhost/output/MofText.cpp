@@ -1,7 +1,7 @@
 #include "cimhost/output/MofText.h"
 
+#include "cimhost/CimTypes.h"
 #include "cimhost/Text.h"
-#include "cimhost/output/CimTypes.h"
 
 #include <charconv>
 #include <cmath>
