@@ -15,7 +15,7 @@
 namespace definition {
 namespace {
 
-constexpr off_t kMaxFileSize = 64 * 1024 * 1024;
+constexpr off_t kMaxFileSize = off_t{64} * 1024 * 1024;
 
 using RegisterElement = void (*)(ElementReader&, ProviderDefModule*);
 

@@ -11,7 +11,7 @@
 namespace Vaneth {
 namespace {
 
-constexpr off_t kMaxSize = 1024 * 1024;
+constexpr off_t kMaxSize = off_t{1024} * 1024;
 
 class Descriptor {
  public:
