@@ -85,7 +85,7 @@ void CommonProvider::enumerateAssociation(const OperationContext& context,
   handler.processing();
   const CIMNamespaceName& nameSpace = classReference.getNameSpace();
   const auto enumerateSide = [&](const std::string& className) {
-    const Instances instances = enumerateAny(
+    Instances instances = enumerateAny(
         context, nameSpace, className,
         "enumerateInstances in CommonProvider:enumerateInstances " + className + " Entry\n");
     DEBUG_FORMAT(9, "Source Instances %s: %d\n", className.c_str(),
