@@ -4,6 +4,7 @@
 #include "cimhost/RequestArguments.h"
 #include "cimhost/output/DisplayText.h"
 
+#include <pwd.h>
 #include <unistd.h>
 
 #include <algorithm>
@@ -71,9 +72,10 @@ InstanceSelection selectionOf(const CommandLine& line) {
           line.properties};
 }
 
+// Whose rights the program has, as a server would have found out from a client of its own machine.
 std::string userName() {
-  const char* name = getlogin();
-  return name != nullptr ? name : std::to_string(getuid());
+  const passwd* entry = getpwuid(geteuid());
+  return entry != nullptr ? entry->pw_name : std::to_string(geteuid());
 }
 
 // The names of the classes, or with MOF their declarations, from which they can be compiled again.

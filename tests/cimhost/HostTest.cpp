@@ -4,7 +4,9 @@
 #include <gmock/gmock.h>
 #include <nlohmann/json.hpp>
 
+#include <pwd.h>
 #include <sys/stat.h>
+#include <unistd.h>
 
 #include <cstdio>
 #include <filesystem>
@@ -296,6 +298,16 @@ TEST_F(HostTest, WhatAProviderPrintsStaysOutOfTheResults) {
   EXPECT_EQ(status_, ExitCode::kOutput);
   shell("--provider /no/such.so enumerate root/test:Test_Disk 2>/dev/null");
   EXPECT_EQ(status_, ExitCode::kUsage);  // --provider twice
+}
+
+TEST_F(HostTest, ProvidersSeeTheEffectiveUser) {
+  write("mof/root/test/user.mof", "class Test_User { [Key] string Name; uint64 Size; };");
+  write("run/user.xml", "<plugin><module name=\"m\" path=\"short\"></module>" +
+                            definitionOf("Test_User") + "</plugin>");
+  EXPECT_EQ(run({"enumerate", "root/test:Test_User", "--property", "Name"}), 0) << error_.str();
+  const passwd* user = getpwuid(geteuid());
+  const std::string name = user != nullptr ? user->pw_name : std::to_string(geteuid());
+  EXPECT_THAT(out_.str(), testing::EndsWith("\n" + name + "\n"));
 }
 
 TEST_F(HostTest, ValuesAreCheckedBeforeAnythingIsSent) {

@@ -91,6 +91,12 @@ void deliverWithoutNamespace(const Request& request) {
   request.complete();
 }
 
+void deliverUser(const Request& request) {
+  const IdentityContainer identity(request.context.get(IdentityContainer::NAME));
+  request.deliver(utf8(identity.getUserName()));
+  request.complete();
+}
+
 void deliverPrinting(const Request& request) {
   std::puts("noise");
   request.deliver("quiet");
@@ -111,6 +117,7 @@ const std::map<std::string, Behaviour> kBehaviours = {
     {"Test_BigDisk", [](const Request& r) { r.deliver("big"), r.complete(); }},
     {"Test_Array", deliverArray},
     {"Test_Prints", deliverPrinting},
+    {"Test_User", deliverUser},
     {"Test_Nothing", [](const Request&) {}},
     {"Test_OnlyCompletes", [](const Request& r) { r.complete(); }},
     {"Test_NoComplete", [](const Request& r) { r.deliver("lost"); }},
