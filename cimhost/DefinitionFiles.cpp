@@ -33,9 +33,8 @@ Diagnostic toDiagnostic(const definition::Problem& problem, const std::string& f
   diagnostic.line = problem.line;
   diagnostic.column = problem.column;
   diagnostic.message = problem.message;
-  // The source is cut: a place behind what is there gets no caret line.
-  const bool shown = static_cast<std::size_t>(problem.column) <= problem.source.size() + 1;
-  if (shown) diagnostic.source = problem.source;
+  diagnostic.source = problem.source;
+  diagnostic.caret = problem.caret;
   return diagnostic;
 }
 

@@ -14,6 +14,11 @@ namespace definition {
 namespace {
 
 constexpr size_t kMaxSourceLine = 200;
+constexpr size_t kMaxSourceBefore = 100;
+
+bool isContinuation(char byte) {
+  return (static_cast<unsigned char>(byte) & 0xC0) == 0x80;
+}
 
 Problem problemAt(const std::string& file, const std::string& text, size_t position,
                   const std::string& message) {
@@ -25,8 +30,11 @@ Problem problemAt(const std::string& file, const std::string& text, size_t posit
                          text.begin(), text.begin() + static_cast<long>(lineStart), '\n'));
   problem.column = static_cast<int>(position - lineStart) + 1;
   problem.message = message;
-  const size_t lineEnd = std::min(text.find('\n', lineStart), lineStart + kMaxSourceLine);
-  problem.source = text.substr(lineStart, lineEnd - lineStart);
+  size_t start = std::max(lineStart, position - std::min(position, kMaxSourceBefore));
+  while (start < position && isContinuation(text[start])) ++start;
+  const size_t lineEnd = std::min(text.find('\n', lineStart), start + kMaxSourceLine);
+  problem.source = text.substr(start, lineEnd - start);
+  problem.caret = static_cast<int>(position - start) + 1;
   if (!problem.source.empty() && problem.source.back() == '\r') problem.source.pop_back();
   return problem;
 }

@@ -12,7 +12,8 @@ struct Problem {
   int line = 0;
   int column = 0;
   std::string message;
-  std::string source;  ///< The line's text, at most 200 bytes; "" without a place.
+  std::string source;  ///< The line's text, of a long line 200 bytes around the place; or "".
+  int caret = 0;       ///< The place in `source`, from 1, in bytes.
 };
 
 /// A class or association class that a definition file declares.

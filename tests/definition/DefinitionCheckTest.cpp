@@ -2,6 +2,7 @@
 
 #include <gmock/gmock.h>
 
+#include <algorithm>
 #include <string>
 
 #include "definition/DefinitionRegistry.h"
@@ -43,6 +44,7 @@ TEST_P(DefinitionPlace, PointsAtTheUnitThatWasFound) {
   EXPECT_EQ(problem.column, GetParam().column);
   EXPECT_EQ(problem.message.substr(0, problem.message.find('\n')), GetParam().message);
   EXPECT_EQ(problem.source, GetParam().source);
+  EXPECT_EQ(problem.caret, std::min(problem.column, 101));
 }
 
 const std::string kRest =
@@ -76,7 +78,7 @@ INSTANTIATE_TEST_SUITE_P(
                   kModule + "\n<association></association>\n<class name='C'/></plugin>", 3, 1,
                   "unexpected class" + kRest, "<class name='C'/></plugin>"},
         PlaceCase{"LongLine", kModule + std::string(300, ' ') + "x</plugin>", 1, 327,
-                  "unexpected x" + kRest, kModule + std::string(174, ' ')}),
+                  "unexpected x" + kRest, std::string(100, ' ') + "x</plugin>"}),
     kCaseName);
 
 TEST_F(DefinitionCheck, ListsWhatTheFilesServeAndLeavesNothingBehind) {

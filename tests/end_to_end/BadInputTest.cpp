@@ -80,6 +80,9 @@ INSTANTIATE_TEST_SUITE_P(
                  "<plugin>\n  <module name='m'/>\n  <class name='%n%s'>\n    <property/>\n",
                  "bad.xml:4:5: error: instance elememt is missing in class element before: "
                  "property"},
+        TextCase{"LongLine", "run/bad.xml",
+                 "<plugin><module name='m'/>" + repeated(" ", 5000) + "\u00e9<oops/>",
+                 "\n  " + repeated(" ", 60) + "\u00e9<oops/>\n  " + repeated(" ", 60) + "^"},
         TextCase{"NoDefinition", "run/bad.xml", "<?xml version='1.0'?>\n<plugin/>",
                  "bad.xml:1:1: "},
         TextCase{"ClassBehindAssociation", "run/bad.xml",
