@@ -2,8 +2,12 @@
 
 #include <Pegasus/Common/CIMName.h>
 
+#include <cstddef>
 #include <string>
+#include <unordered_map>
 #include <vector>
+
+#include "cimhost/repository/NameHash.h"
 
 namespace cimhost {
 
@@ -20,7 +24,8 @@ struct ServedClass {
 /// Which classes the provider is registered for, as a CIM server knows them from its registration
 /// instances: a class that is not here never reaches the provider.
 ///
-/// Filled while the host starts, read-only afterwards and then safe for several threads.
+/// Look-ups cost no walk of the list. Filled while the host starts, read-only afterwards and then
+/// safe for several threads.
 class ServedClasses {
  public:
   void add(ServedClass served);
@@ -33,7 +38,12 @@ class ServedClasses {
   const std::vector<ServedClass>& all() const { return classes_; }
 
  private:
+  template <class Accept>
+  bool anyOf(const Pegasus::CIMName& className, Accept accept) const;
+
   std::vector<ServedClass> classes_;
+  // The positions in classes_ of each class name.
+  std::unordered_map<Pegasus::CIMName, std::vector<std::size_t>, NameHash, NameEqual> byName_;
 };
 
 }  // namespace cimhost

@@ -83,22 +83,25 @@ int ProviderDefFunctionCall::setValue(const ProviderDefValue& value, int index) 
   }
 }
 
+int ProviderDefFunctionCall::execWithOneArgument(const Values& inputs, Values& outputs,
+                                                 int index) const {
+  switch (arguments_[0].getType()) {
+    case ProviderDefArgument::kIndex:
+      return function().exec(ProviderDefValue(index));
+    case ProviderDefArgument::kInput:
+      return function().exec(inputs);
+    case ProviderDefArgument::kElement:
+      return function().exec(arguments_[0].evaluate(index));
+    case ProviderDefArgument::kOutput:
+      return function().exec(inputs, outputs);
+    default:
+      return 0;
+  }
+}
+
 int ProviderDefFunctionCall::exec(const Values& inputs, Values& outputs, int index) const {
   if (arguments_.empty()) return function().exec();
-  if (arguments_.size() == 1) {
-    switch (arguments_[0].getType()) {
-      case ProviderDefArgument::kIndex:
-        return function().exec(ProviderDefValue(index));
-      case ProviderDefArgument::kInput:
-        return function().exec(inputs);
-      case ProviderDefArgument::kElement:
-        return function().exec(arguments_[0].evaluate(index));
-      case ProviderDefArgument::kOutput:
-        return function().exec(inputs, outputs);
-      default:
-        return 0;
-    }
-  }
+  if (arguments_.size() == 1) return execWithOneArgument(inputs, outputs, index);
   Values extras;
   bool hasInput = false;
   bool hasOutput = false;

@@ -54,6 +54,7 @@ class ProviderDefFunctionCall {
  private:
   void read(ElementReader& reader, ProviderDefModule* module);
   ProviderDefFunction& function() const;
+  int execWithOneArgument(const Values& inputs, Values& outputs, int index) const;
   Values evaluate(int index) const;
 
   std::vector<ProviderDefArgument> arguments_;

@@ -141,32 +141,6 @@ TEST_F(BadInput, PluginThatIsNotThereLeavesItsClassEmptyAndIsLogged) {
   expectServing();
 }
 
-struct CommandCase {
-  const char* name;
-  std::vector<std::string> arguments;
-  int code;
-  const char* message;
-};
-
-class BadCommand : public BadInput, public testing::WithParamInterface<CommandCase> {};
-
-TEST_P(BadCommand, IsRefusedWithItsOwnExitCode) {
-  const ProgramResult result = run(GetParam().arguments);
-  EXPECT_EQ(result.code, GetParam().code) << result.out << result.err;
-  EXPECT_EQ(result.out, "");
-  EXPECT_NE(result.err.find(GetParam().message), std::string::npos) << result.err;
-}
-
-INSTANTIATE_TEST_SUITE_P(
-    Commands, BadCommand,
-    testing::Values(
-        CommandCase{"NoCommand", {}, 2, ""}, CommandCase{"UnknownCommand", {"destroy"}, 2, ""},
-        CommandCase{"BadPath", {"get", "root/load:Load_Average.Name=\"x"}, 2, "missing quote"},
-        CommandCase{"UnknownNamespace", {"enumerate", "root/none:A"}, 13, "root/none"},
-        CommandCase{"UnknownClass", {"enumerate", "root/load:None"}, 15, "None"},
-        CommandCase{"UnknownClassDeclaration", {"class", "root/load:None"}, 16, "None"}),
-    [](const auto& tested) { return tested.param.name; });
-
 TEST(Home, MissingHomeIsSaid) {
   const ProgramResult result =
       runProgram({CIMHOST, "--home", "/nonexistent/home", "classes", "root"});

@@ -4,8 +4,9 @@
 
 PEGASUS_NAMESPACE_BEGIN
 
-/// Status codes of CIM operations (DMTF DSP0200).
-enum CIMStatusCode {
+/// Status codes of CIM operations (DMTF DSP0200). The fixed underlying type makes every code that a
+/// provider may throw a valid value, so that a host can look at it.
+enum CIMStatusCode : int {
   CIM_ERR_SUCCESS = 0,
   CIM_ERR_FAILED = 1,
   CIM_ERR_ACCESS_DENIED = 2,
