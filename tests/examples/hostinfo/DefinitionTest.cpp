@@ -22,6 +22,9 @@ std::vector<std::smatch> matches(const std::string& text, const std::string& pat
   return {std::sregex_iterator(text.begin(), text.end(), regex), {}};
 }
 
+// The matches point into the text.
+std::vector<std::smatch> matches(std::string&& text, const std::string& pattern) = delete;
+
 using Features = std::map<std::string, std::set<std::string>>;  // class -> properties
 
 Features definedProperties(const std::string& xml) {
@@ -58,9 +61,10 @@ TEST(Definition, NamesOnlyFunctionsThatTheLibraryExports) {
 
 // Without Static a method fails; In and Out of every parameter must be written out.
 TEST(Definition, MethodsAreDeclaredAsTheProviderNeedsThem) {
+  const std::string xml = fileText("hostinfo.xml");
   const std::string mof = fileText("hostinfo.mof");
   std::set<std::string> defined, declared;
-  for (const auto& match : matches(fileText("hostinfo.xml"), "<method name=\"([^\"]*)\"")) {
+  for (const auto& match : matches(xml, "<method name=\"([^\"]*)\"")) {
     defined.insert(match[1]);
   }
   for (const auto& match : matches(mof, "\\[Static\\b[^\\]]*\\]\\s*\\w+ (\\w+)\\([\\s\\S]*?\\);")) {
