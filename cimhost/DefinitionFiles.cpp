@@ -50,7 +50,7 @@ Diagnostic warning(const std::string& file, const std::string& message) {
 void warnOfPlugins(const definition::CheckResult& result, const std::string& folder,
                    std::vector<Diagnostic>& diagnostics) {
   for (const definition::UsedModule& module : result.modules) {
-    const std::string problem = libraryProblem(module.library);
+    const std::string problem = libraryProblem(module.path);
     if (problem.empty()) continue;
     diagnostics.push_back(
         warning(folder + module.file, "module " + module.name + " cannot be loaded: " + problem));

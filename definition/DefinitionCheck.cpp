@@ -134,7 +134,7 @@ CheckResult readFiles(const std::vector<std::string>& files) {
     checkFile(file, result);
     for (size_t i = firstModule; i < registeredModules().size(); ++i) {
       const ProviderDefModule& read = *registeredModules()[i];
-      result.modules.push_back({file, read.getName(), read.libraryFile()});
+      result.modules.push_back({file, read.getName(), read.pathToLoad()});
     }
   }
   keepUsedModules(result.modules);

@@ -30,7 +30,7 @@ struct Served {
 struct UsedModule {
   std::string file;  ///< The definition file that declares it first.
   std::string name;
-  std::string library;  ///< As the loader gets it: a path is relative to the working directory.
+  std::string path;  ///< As the loader gets it: a path is relative to the working directory.
 };
 
 struct CheckResult {

@@ -57,13 +57,13 @@ void ProviderDefModule::detachFunctions() {
   replaceModule(this, nullptr, firstFunction_);
 }
 
-std::string ProviderDefModule::libraryFile() const {
+std::string ProviderDefModule::pathToLoad() const {
   return path_ == kShort ? "../lib/lib" + name_ + ".so" : name_;
 }
 
 void ProviderDefModule::open() {
   DEBUG_FORMAT(7, "Loading %s\n", name_.c_str());
-  const std::string file = libraryFile();
+  const std::string file = pathToLoad();
   // The loader takes an empty name for the program itself.
   void* handle = file.empty() ? nullptr : dlopen(file.c_str(), RTLD_NOW);
   if (handle == nullptr) {

@@ -37,7 +37,7 @@ class ProviderDefModule {
   /// 1: the name is short for "../lib/lib" + name + ".so"; 0: it is the path itself.
   int getPath() const { return path_; }
   /// What the loader is asked to open; a path is relative to the working directory.
-  std::string libraryFile() const;
+  std::string pathToLoad() const;
   bool getNeedInit() const { return needInit_; }
   /// The call that runs once after the library is opened; not owned, nullptr without one.
   ProviderDefFunctionCall* getInit() const { return init_; }
