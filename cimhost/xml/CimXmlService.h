@@ -12,11 +12,12 @@
 namespace cimhost {
 
 /// The parts of an HTTP request that DSP0200 gives a meaning to.
-struct CimXmlRequest {
+class CimXmlRequest {
+ public:
+  virtual ~CimXmlRequest() = default;
   /// The value of a header, or nullopt when it is absent. Names are CIMOperation, CIMMethod,
   /// CIMObject, CIMProtocolVersion, CIMBatch, in this spelling: the transport has removed the
   /// number that M-POST puts before them and ignores their case.
-  virtual ~CimXmlRequest() = default;
   virtual std::optional<std::string> header(std::string_view name) const = 0;
   virtual std::string_view body() const = 0;
   /// Who asks, for the provider's context; empty when nobody is known.
