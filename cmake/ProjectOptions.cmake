@@ -2,6 +2,13 @@
 
 option(COMMONPROVIDER_WERROR "Treat compiler warnings as errors" OFF)
 option(COMMONPROVIDER_BENCHMARKS "Build the benchmarks (needs Google Benchmark and expat)" OFF)
+# CIM-XML over HTTP uses Debian's expat and libmicrohttpd, which are there for one word size only.
+if(CMAKE_SIZEOF_VOID_P EQUAL 4)
+  set(server_default OFF)
+else()
+  set(server_default ON)
+endif()
+option(COMMONPROVIDER_SERVER "Build the CIM server (needs expat and libmicrohttpd)" ${server_default})
 set(COMMONPROVIDER_SANITIZE "" CACHE STRING "Value for -fsanitize=, for example address,undefined")
 
 set(CMAKE_CXX_STANDARD 17)

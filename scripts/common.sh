@@ -26,11 +26,11 @@ need() {
     apt-get install -y -qq --no-install-recommends "${missing[@]}" >/dev/null
 }
 
-build_packages=(cmake ninja-build g++ libcli11-dev nlohmann-json3-dev)
+build_packages=(cmake ninja-build g++ libcli11-dev nlohmann-json3-dev libexpat1-dev)
 test_packages=(libgtest-dev libgmock-dev googletest)
 i386_packages=(g++-multilib)
 clang_packages=(clang)
-benchmark_packages=(libbenchmark-dev libexpat1-dev)
+benchmark_packages=(libbenchmark-dev)
 
 # configure PRESET [ARGUMENT...]: quiet unless it fails.
 configure() {
