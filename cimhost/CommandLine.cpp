@@ -7,6 +7,7 @@
 
 #include <CLI/CLI.hpp>
 
+#include <algorithm>
 #include <vector>
 
 namespace cimhost {
@@ -21,9 +22,10 @@ constexpr const char* kFooter =
     "\n"
     "Values are written as NAME=VALUE; NAME alone is null. Arrays: NAME=a,b or NAME=[]\n"
     "\n"
-    "Exit codes: 0 done; 1 check or dump found errors; 2 usage, malformed path, value that does\n"
-    "not fit; 3 home directory or provider library unusable; 4 results could not be written;\n"
-    "10 + CIM status code when the operation failed, for example 16 for CIM_ERR_NOT_FOUND.";
+    "Exit codes: 0 done; 1 check, registration or dump found errors; 2 usage, malformed path,\n"
+    "value that does not fit; 3 home directory or provider library unusable; 4 results could not\n"
+    "be written; 10 + CIM status code when the operation failed, for example 16 for\n"
+    "CIM_ERR_NOT_FOUND.";
 
 struct FormatRow {
   const char* name;
@@ -42,6 +44,10 @@ struct Arguments {
   std::string resultClass;
   std::string role;
   std::string resultRole;
+  std::string moduleName = "CommonProviderModule";
+  std::string vendor = "CommonProvider";
+  std::string moduleVersion = COMMONPROVIDER_VERSION;
+  std::string location = "CommonProvider";
 };
 
 // Groups of options, as bits.
@@ -55,7 +61,8 @@ enum Options : unsigned {
   kFarFilter = 32,  // --assoc-class and --result-role
   kValues = 64,     // NAME=VALUE..., at least one
   kMethod = 128,    // METHOD [NAME=VALUE...]
-  kFiles = 256      // [FILE...]
+  kFiles = 256,     // [FILE...]
+  kModule = 512     // what a registration says of the provider module
 };
 
 struct CommandRow {
@@ -90,6 +97,8 @@ constexpr CommandRow kCommands[] = {
      parseNamespaceOrClass, kClasses},
     {Command::check, "check", "Report every problem in the files of the home directory", nullptr,
      nullptr, kNone},
+    {Command::registration, "registration",
+     "Print the MOF that registers the classes with OpenPegasus", nullptr, nullptr, kModule},
     {Command::dump, "dump", "Print what definition files define; default: all of run/", nullptr,
      nullptr, kFiles}};
 
@@ -126,6 +135,28 @@ void addValueArguments(CLI::App& app, unsigned options, CommandLine& line) {
   if ((options & kValues) != 0) values->required();
 }
 
+// A name that can stand in a file name and, unquoted, in a shell command.
+std::string plainNameProblem(const std::string& name) {
+  const auto isPlain = [](char c) {
+    return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || (c >= '0' && c <= '9') || c == '_' ||
+           c == '.' || c == '-';
+  };
+  const bool good =
+      !name.empty() && name[0] != '-' && std::all_of(name.begin(), name.end(), isPlain);
+  return good ? std::string() : "expected letters, digits, '_', '.' and '-'";
+}
+
+void addModuleOptions(CLI::App& app, Arguments& arguments) {
+  addText(app, "--module-name", arguments.moduleName,
+          "Name of the module; default: CommonProviderModule", "NAME")
+      ->check(plainNameProblem);
+  addText(app, "--location", arguments.location,
+          "The library is lib + NAME + .so; default: CommonProvider", "NAME")
+      ->check(plainNameProblem);
+  addText(app, "--vendor", arguments.vendor, "Default: CommonProvider", "TEXT");
+  addText(app, "--module-version", arguments.moduleVersion, "Default: that of cimhost", "TEXT");
+}
+
 void addCommand(CLI::App& app, const CommandRow& row, CommandLine& line, Arguments& arguments) {
   CLI::App& command = *app.add_subcommand(row.name, row.description);
   command.fallthrough();
@@ -149,6 +180,7 @@ void addCommand(CLI::App& app, const CommandRow& row, CommandLine& line, Argumen
   }
   if ((row.options & (kValues | kMethod)) != 0) addValueArguments(command, row.options, line);
   if ((row.options & kFiles) != 0) command.add_option("FILE", line.files)->type_name("");
+  if ((row.options & kModule) != 0) addModuleOptions(command, arguments);
 }
 
 void addGlobalOptions(CLI::App& app, CommandLine& line, Arguments& arguments) {
@@ -196,6 +228,8 @@ void convertArguments(const Arguments& arguments, CommandLine& line) {
   }
   line.properties = toPropertyList(arguments.properties);
   line.filter = toFilter(arguments, line.command);
+  line.registration = {fromUtf8(arguments.moduleName), fromUtf8(arguments.vendor),
+                       fromUtf8(arguments.moduleVersion), fromUtf8(arguments.location)};
 }
 
 }  // namespace
@@ -206,6 +240,7 @@ std::optional<CommandLine> parseCommandLine(int argc, const char* const* argv, s
   Arguments arguments;
   CLI::App app("Embedded CIM host for provider definitions", "cimhost");
   app.footer(kFooter);
+  app.set_version_flag("--version", "cimhost " COMMONPROVIDER_VERSION, "Print the version");
   app.require_subcommand(1);
   addGlobalOptions(app, line, arguments);
   for (const CommandRow& row : kCommands) addCommand(app, row, line, arguments);

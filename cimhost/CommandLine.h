@@ -1,5 +1,6 @@
 #pragma once
 
+#include "cimhost/Registration.h"
 #include "cimhost/Requests.h"
 #include "cimhost/output/ResultWriter.h"
 
@@ -16,7 +17,7 @@ namespace cimhost {
 /// Exit codes of the program. An operation that fails with CIM status c gives kOperation + c.
 struct ExitCode {
   static constexpr int kOk = 0;
-  static constexpr int kProblems = 1;     ///< check or dump found errors
+  static constexpr int kProblems = 1;     ///< check, registration or dump found errors
   static constexpr int kUsage = 2;        ///< command line, malformed path, value that does not fit
   static constexpr int kCannotStart = 3;  ///< home directory or provider library
   static constexpr int kOutput = 4;       ///< results could not be written
@@ -38,6 +39,7 @@ struct CommandLine {
     declaration,
     classes,
     check,
+    registration,
     dump
   };
 
@@ -47,7 +49,7 @@ struct CommandLine {
   OutputFormat format = OutputFormat::table;
   bool trace = false;
   Pegasus::CIMObjectPath
-      target;  ///< Host empty; class null for `classes NS`. None for `check` and `dump`.
+      target;  ///< Host empty; class null for `classes NS`. None for commands on the home.
   bool deep = true;
   bool localOnly = false;
   bool includeQualifiers = false;
@@ -57,10 +59,11 @@ struct CommandLine {
   std::string method;
   std::vector<std::string> values;  ///< NAME=VALUE of `modify` and `invoke`.
   std::vector<std::string> files;   ///< Of `dump`.
+  RegistrationOptions registration;
 };
 
-/// Reads the command line. No value: help was asked for and went to `out` (exitCode kOk), or the
-/// arguments are wrong and `error` got one message (kUsage).
+/// Reads the command line. No value: help or the version was asked for and went to `out` (exitCode
+/// kOk), or the arguments are wrong and `error` got one message (kUsage).
 std::optional<CommandLine> parseCommandLine(int argc, const char* const* argv, std::ostream& out,
                                             std::ostream& error, int& exitCode);
 

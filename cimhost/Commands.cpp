@@ -153,6 +153,7 @@ OperationStatus runOperationCommand(const CommandLine& line, const Host& host,
     case Command::classes:
       return listClasses(line, operations, writer);
     case Command::check:
+    case Command::registration:
     case Command::dump:
       break;
   }
@@ -163,6 +164,20 @@ ResultForm formOf(Command command) {
   const bool single =
       command == Command::get || command == Command::invoke || command == Command::declaration;
   return single ? ResultForm::single : ResultForm::list;
+}
+
+void print(const std::vector<Diagnostic>& problems, std::ostream& out) {
+  for (const Diagnostic& problem : problems) out << problem.toString() << '\n';
+}
+
+int outputCode(const std::ostream& out, std::ostream& error) {
+  if (out) return ExitCode::kOk;
+  error << "cimhost: the results could not be written\n";
+  return ExitCode::kOutput;
+}
+
+bool isError(const Diagnostic& problem) {
+  return problem.severity == Diagnostic::Severity::error;
 }
 
 std::string counted(std::ptrdiff_t count, const std::string& noun) {
@@ -176,6 +191,7 @@ bool needsProvider(Command command) {
     case Command::declaration:
     case Command::classes:
     case Command::check:
+    case Command::registration:
     case Command::dump:
       return false;
     default:
@@ -185,7 +201,8 @@ bool needsProvider(Command command) {
 
 int runCommand(const CommandLine& line, const Host& host, std::ostream& out, std::ostream& error) {
   if (line.command == Command::check) return runCheck(host, out);
-  for (const Diagnostic& problem : host.diagnostics()) error << problem.toString() << '\n';
+  if (line.command == Command::registration) return runRegistration(line, host, out, error);
+  print(host.diagnostics(), error);
   CommandWriter writer(makeResultWriter(line.format, out, formOf(line.command)),
                        host.operations().hostName());
   OperationStatus status;
@@ -201,11 +218,23 @@ int runCommand(const CommandLine& line, const Host& host, std::ostream& out, std
     error << "cimhost: " << displayText(status.toString()) << '\n';
     return ExitCode::kOperation + static_cast<int>(status.code);
   }
-  if (!out) {
-    error << "cimhost: the results could not be written\n";
-    return ExitCode::kOutput;
+  return outputCode(out, error);
+}
+
+int runRegistration(const CommandLine& line, const Host& host, std::ostream& out,
+                    std::ostream& error) {
+  const std::vector<Diagnostic>& problems = host.diagnostics();
+  print(problems, error);
+  if (std::any_of(problems.begin(), problems.end(), isError)) return ExitCode::kProblems;
+  const Registration registration(host.served(), host.repository());
+  print(registration.warnings(), error);
+  if (registration.capabilities().empty()) {
+    error << "cimhost: nothing to register: no definition serves a class\n";
+    return ExitCode::kProblems;
   }
-  return ExitCode::kOk;
+  registration.write(out, line.registration);
+  out.flush();
+  return outputCode(out, error);
 }
 
 int runDump(const CommandLine& line, std::ostream& error) {
@@ -218,7 +247,7 @@ int runDump(const CommandLine& line, std::ostream& error) {
     problems = dumpDefinitions(line.files, "");
   }
   const bool written = std::fflush(stdout) == 0 && std::ferror(stdout) == 0;
-  for (const Diagnostic& problem : problems) error << problem.toString() << '\n';
+  print(problems, error);
   if (!written) {
     error << "cimhost: the dumps could not be written\n";
     return ExitCode::kOutput;
@@ -228,10 +257,8 @@ int runDump(const CommandLine& line, std::ostream& error) {
 
 int runCheck(const Host& host, std::ostream& out) {
   const std::vector<Diagnostic>& problems = host.diagnostics();
-  for (const Diagnostic& problem : problems) out << problem.toString() << '\n';
-  const auto errors = std::count_if(problems.begin(), problems.end(), [](const Diagnostic& each) {
-    return each.severity == Diagnostic::Severity::error;
-  });
+  print(problems, out);
+  const auto errors = std::count_if(problems.begin(), problems.end(), isError);
   const auto warnings = static_cast<std::ptrdiff_t>(problems.size()) - errors;
   const auto served = static_cast<std::ptrdiff_t>(host.served().all().size());
   out << counted(served, "definition") << ", " << counted(errors, "error") << ", "

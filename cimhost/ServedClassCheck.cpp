@@ -1,6 +1,9 @@
 #include "cimhost/ServedClassCheck.h"
 
 #include "cimhost/Text.h"
+#include "cimhost/repository/NameHash.h"
+
+#include <unordered_map>
 
 namespace cimhost {
 
@@ -14,6 +17,7 @@ class Checker {
       : repository_(repository), warnings_(warnings) {}
 
   void check(const ServedClass& served) {
+    warnRepeated(served);
     const std::vector<CIMNamespaceName> spaces = declaringNamespaces(served);
     if (spaces.empty()) warnUndeclared(served);
     for (const CIMNamespaceName& space : spaces) checkProperties(served, space);
@@ -64,6 +68,21 @@ class Checker {
     return toUtf8(served.className.getString());
   }
 
+  // The provider finds a definition by its name alone, whatever the namespace.
+  void warnRepeated(const ServedClass& served) {
+    auto& [asClass, asAssociation] = seen_[served.className];
+    const ServedClass*& same = served.association ? asAssociation : asClass;
+    const ServedClass* other = served.association ? asClass : asAssociation;
+    if (same != nullptr) {
+      warn(served, "class " + className(served) + " is already defined in " + same->file +
+                       ", which serves it in every namespace");
+    } else if (other != nullptr) {
+      warn(served, "class " + className(served) + " is defined as a class and as an association; " +
+                       "clients see only the instances of the association");
+    }
+    if (same == nullptr) same = &served;
+  }
+
   void warnUndeclared(const ServedClass& served) {
     std::string text = "class " + className(served) + " is defined, but not declared";
     if (!served.nameSpace.isNull()) {
@@ -76,8 +95,15 @@ class Checker {
     warnings_.push_back({Diagnostic::Severity::warning, served.file, 0, 0, message, {}});
   }
 
+  struct Definitions {
+    const ServedClass* asClass = nullptr;
+    const ServedClass* asAssociation = nullptr;
+  };
+
   const ClassRepository& repository_;
   std::vector<Diagnostic>& warnings_;
+  // The first of each name; they outlive the checker.
+  std::unordered_map<CIMName, Definitions, NameHash, NameEqual> seen_;
 };
 
 }  // namespace

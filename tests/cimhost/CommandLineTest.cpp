@@ -103,11 +103,18 @@ TEST(CommandLine, ValuesStayAsTheyAreGiven) {
   EXPECT_EQ(dump.line->files, (std::vector<std::string>{"a.xml", "b.xml"}));
 }
 
+TEST(CommandLine, TheVersionNeedsNoHome) {
+  const Parsed parsed = parse({"--version"});
+  EXPECT_FALSE(parsed.line);
+  EXPECT_EQ(parsed.exitCode, 0);
+  EXPECT_EQ(parsed.out, "cimhost " PROJECT_VERSION "\n");
+}
+
 TEST(CommandLine, HelpNamesTheExitCodes) {
   const Parsed parsed = parse({"--help"});
   EXPECT_FALSE(parsed.line);
   EXPECT_EQ(parsed.exitCode, 0);
-  EXPECT_THAT(parsed.out, HasSubstr("16 for CIM_ERR_NOT_FOUND"));
+  EXPECT_THAT(parsed.out, HasSubstr("16 for\nCIM_ERR_NOT_FOUND"));
 }
 
 struct UsageCase {
@@ -134,6 +141,11 @@ TEST(CommandLine, UsageErrors) {
       {"no method", {"--home", "h", "invoke", "root:A.k=1"}, "METHOD"},
       {"filter class", {"--home", "h", "associators", "root:A.k=1", "--assoc-class", "1x"}, "1x"},
       {"role of names", {"--home", "h", "names", "root:A", "--role", "x"}, "--role"},
+      {"empty location", {"--home", "h", "registration", "--location", ""}, "--location"},
+      {"module name with a line end",
+       {"--home", "h", "registration", "--module-name", "a\nb"},
+       "--module-name"},
+      {"vendor that is not UTF-8", {"--home", "h", "registration", "--vendor", "\xff"}, "UTF-8"},
       {"option of another command", {"--home", "h", "names", "root:A", "--deep"}, "--deep"},
   };
   for (const UsageCase& row : cases) {

@@ -195,13 +195,13 @@ TEST_F(HostTest, PluginsThatCannotBeCalledAreToldWithoutLoadingThem) {
   };
   const auto define = [&](const std::string& name, const std::string& module,
                           const std::string& type) {
-    write("run/" + name + ".xml",
-          "<plugin>" + module + "<class name=\"A\"><instances><constant type=\"int\">1</constant>" +
-              "</instances>" + call("f_" + name, type) + "</class></plugin>");
+    write("mof/root/test/" + name + ".mof",
+          "class A_" + name + " { [Key] string f_" + name + "; };");
+    write("run/" + name + ".xml", "<plugin>" + module + "<class name=\"A_" + name +
+                                      "\"><instances><constant type=\"int\">1</constant>" +
+                                      "</instances>" + call("f_" + name, type) +
+                                      "</class></plugin>");
   };
-  write("mof/root/test/classes.mof",
-        "class A { [Key] string f_absent; [Key] string f_text; [Key] string f_pipe; [Key] string "
-        "f_words; [Key] string f_type; [Key] string f_none; [Key] string f_searched; };");
   for (const char* name : {"absent", "text", "pipe", "words"}) {
     const std::string module =
         std::string("<module name=\"") + name + "\" path=\"short\"></module>";
@@ -232,6 +232,20 @@ TEST_F(HostTest, PluginsThatCannotBeCalledAreToldWithoutLoadingThem) {
           "function types",
           "run/none.xml: warning: function f_none is never called: no module element stands before "
           "it"));
+}
+
+TEST_F(HostTest, DefinitionsOfOneNameAreTold) {
+  write("mof/root/test/classes.mof", "class A { [Key] string Name; };");
+  const std::string association =
+      "<association name=\"A\" namespace2=\"root/test\" propertyname1=\"x\" propertyname2=\"y\">"
+      "<classname name=\"A\"/><classname name=\"A\"/><condition><true/></condition></association>";
+  write("run/a.xml", "<plugin><module name=\"m\" path=\"short\"></module>" + definitionOf("A") +
+                         definitionOf("a") + association + "</plugin>");
+  EXPECT_THAT(diagnostics(),
+              ElementsAre("run/a.xml: warning: class a is already defined in run/a.xml, which "
+                          "serves it in every namespace",
+                          "run/a.xml: warning: class A is defined as a class and as an "
+                          "association; clients see only the instances of the association"));
 }
 
 TEST_F(HostTest, AGoodHomeChecksWell) {
@@ -342,6 +356,112 @@ TEST_F(HostTest, AssociationsAreFollowed) {
   EXPECT_EQ(run({"reference-names", disk, "--result-class", "Link_Port"}), 0);
   EXPECT_EQ(out_.str(), "root/test:Link_Port.Name=\"link\"\n");
   EXPECT_EQ(run({"associators", disk, "--assoc-class", "Nope"}), 14);
+}
+
+constexpr const char* kServerClasses =
+    "class PG_ProviderModule { [Key] string Name; string Vendor; string Version; "
+    "string InterfaceType; string InterfaceVersion; string Location; };\n"
+    "class PG_Provider { [Key] string ProviderModuleName; [Key] string Name; };\n"
+    "class PG_ProviderCapabilities { [Key] string ProviderModuleName; [Key] string ProviderName; "
+    "[Key] string CapabilityID; string ClassName; string Namespaces[]; uint16 ProviderType[]; "
+    "string SupportedProperties[]; string SupportedMethods[]; };\n";
+
+constexpr const char* kRegistration = R"(// Registers libDisk.so with OpenPegasus.
+// While the server runs, after the class declarations:
+//   cimmof -n root/PG_InterOp FILE
+// To take it back:
+//   cimprovider -d -m Disk-1
+//   cimprovider -r -m Disk-1
+
+instance of PG_ProviderModule {
+  Name = "Disk-1";
+  Vendor = "A \"B\" \\ C\n\x001Bé";
+  Version = "2.0";
+  InterfaceType = "C++Default";
+  InterfaceVersion = "2.9.0";
+  Location = "Disk";
+};
+
+instance of PG_Provider {
+  ProviderModuleName = "Disk-1";
+  Name = "CommonProvider";
+};
+
+instance of PG_ProviderCapabilities {
+  ProviderModuleName = "Disk-1";
+  ProviderName = "CommonProvider";
+  CapabilityID = "Link_Port";
+  ClassName = "Link_Port";
+  Namespaces = {"root/test"};
+  ProviderType = {2, 3};
+  SupportedProperties = NULL;
+  SupportedMethods = NULL;
+};
+
+instance of PG_ProviderCapabilities {
+  ProviderModuleName = "Disk-1";
+  ProviderName = "CommonProvider";
+  CapabilityID = "Test_Disk";
+  ClassName = "Test_Disk";
+  Namespaces = {"root/other", "root/test"};
+  ProviderType = {2};
+  SupportedProperties = NULL;
+  SupportedMethods = NULL;
+};
+
+instance of PG_ProviderCapabilities {
+  ProviderModuleName = "Disk-1";
+  ProviderName = "CommonProvider";
+  CapabilityID = "Test_Port";
+  ClassName = "Test_Port";
+  Namespaces = {"root/test"};
+  ProviderType = {2, 5};
+  SupportedProperties = NULL;
+  SupportedMethods = NULL;
+};
+)";
+
+TEST_F(HostTest, RegistrationIsMofForTheServer) {
+  writeLinkedFiles();
+  fs::create_directories(home_ / "mof/root/other");
+  fs::create_directories(home_ / "mof/root/PG_InterOp");
+  write("mof/root/other/disk.mof", "class Test_Disk { [Key] string Name; };\n");
+  write("run/test.xml",
+        "<plugin><module name=\"m\" path=\"short\"></module><class name="
+        "\"Test_Disk\"><instances><constant type=\"int\">1</constant></instances>"
+        "</class></plugin>");
+  const auto print = [this] {
+    return run({"registration", "--module-name", "Disk-1", "--vendor",
+                "A \"B\" \\ C\n\x1b"
+                "é",
+                "--module-version", "2.0", "--location", "Disk"});
+  };
+  ASSERT_EQ(print(), ExitCode::kOk) << error_.str();
+  EXPECT_EQ(error_.str(), "");
+  EXPECT_EQ(out_.str(), kRegistration);
+  // It parses as MOF, and printing again gives the same.
+  write("mof/root/PG_InterOp/registration.mof", kServerClasses + out_.str());
+  EXPECT_EQ(print(), ExitCode::kOk);
+  EXPECT_EQ(error_.str(), "");
+  EXPECT_EQ(out_.str(), kRegistration);
+}
+
+TEST_F(HostTest, RegistrationWarnsAndRefuses) {
+  EXPECT_EQ(run({"registration"}), ExitCode::kProblems);
+  EXPECT_THAT(error_.str(), HasSubstr("nothing to register"));
+  const std::string start = "<plugin><module name=\"m\" path=\"short\"></module>";
+  write("run/a.xml", start + definitionOf("Undeclared") + "</plugin>");
+  EXPECT_EQ(run({"registration"}), ExitCode::kOk);
+  EXPECT_THAT(out_.str(), HasSubstr("ClassName = \"Undeclared\""));
+  EXPECT_THAT(error_.str(), HasSubstr("not declared in namespace root/test"));
+  write("run/b.xml", start + "<class name=\"Y\">\n</class></plugin>");
+  EXPECT_EQ(run({"registration"}), ExitCode::kProblems);
+  EXPECT_EQ(out_.str(), "");
+  const std::string problems = error_.str();
+  run({"check"});
+  EXPECT_THAT(out_.str(), testing::StartsWith(problems));
+  EXPECT_EQ(shell("registration 2>/dev/null"), "");
+  EXPECT_EQ(status_, ExitCode::kProblems);
 }
 
 TEST_F(HostTest, DumpsShowWhatIsRegistered) {

@@ -1,0 +1,102 @@
+#include "cimhost/Registration.h"
+
+#include "cimhost/Text.h"
+
+#include <gmock/gmock.h>
+
+#include <string>
+#include <utility>
+#include <vector>
+
+namespace {
+
+using namespace cimhost;
+
+enum Kind : unsigned { kPlain = 0, kAssociation = 1, kMethods = 2 };
+
+struct Definition {
+  const char* nameSpace;
+  const char* className;
+  unsigned kind;
+};
+
+ServedClass served(const Definition& definition) {
+  ServedClass result;
+  if (*definition.nameSpace != '\0') {
+    result.nameSpace = Pegasus::CIMNamespaceName(definition.nameSpace);
+  }
+  result.className = Pegasus::CIMName(definition.className);
+  result.association = (definition.kind & kAssociation) != 0;
+  result.hasMethods = (definition.kind & kMethods) != 0;
+  result.file = "run/a.xml";
+  return result;
+}
+
+// "id: class in namespace namespace; association; methods"
+std::string text(const ProviderCapability& capability) {
+  std::string result =
+      toUtf8(capability.id) + ": " + toUtf8(capability.className.getString()) + " in";
+  for (const auto& space : capability.nameSpaces) result += " " + toUtf8(space.getString());
+  if (capability.association) result += "; association";
+  if (capability.methods) result += "; methods";
+  return result;
+}
+
+struct Case {
+  const char* name;
+  std::vector<Definition> definitions;
+  std::vector<const char*> capabilities;
+  std::size_t warnings;
+};
+
+// Class A is declared in root/x and root/y, nothing else is.
+TEST(Registration, OneCapabilityForEachClassAndSetOfProviderTypes) {
+  ClassRepository repository;
+  for (const char* space : {"root/y", "root/x"}) {
+    repository.addNamespace(Pegasus::CIMNamespaceName(space));
+    repository.addClass(Pegasus::CIMNamespaceName(space), Pegasus::CIMClass(Pegasus::CIMName("A")));
+  }
+  const Case cases[] = {
+      {"sorted, whatever the order of the files",
+       {{"root/b", "b", kPlain}, {"root/a", "B", kPlain}, {"root/a", "A", kPlain}},
+       {"A: A in root/a", "b: b in root/a root/b"},
+       0},
+      {"defined again, in other letter case",
+       {{"root/a", "A", kPlain}, {"ROOT/A", "a", kPlain}},
+       {"A: A in root/a"},
+       0},
+      {"methods in one namespace of three",
+       {{"root/a", "A", kPlain}, {"root/b", "A", kMethods}, {"root/c", "A", kPlain}},
+       {"A: A in root/a root/c", "root/b:A: A in root/b; methods"},
+       0},
+      {"class and association at once",
+       {{"root/a", "L", kMethods}, {"root/a", "L", kAssociation}},
+       {"L: L in root/a; association; methods"},
+       0},
+      {"without a namespace: where it is declared",
+       {{"", "A", kMethods}},
+       {"A: A in root/x root/y; methods"},
+       0},
+      {"with and without",
+       {{"", "A", kPlain}, {"root/z", "A", kPlain}},
+       {"A: A in root/x root/y root/z"},
+       0},
+      {"without a namespace and nowhere declared",
+       {{"", "B", kPlain}, {"root/a", "C", kPlain}},
+       {"C: C in root/a"},
+       1},
+      {"nothing", {}, {}, 0},
+  };
+  for (const Case& row : cases) {
+    SCOPED_TRACE(row.name);
+    ServedClasses all;
+    for (const Definition& each : row.definitions) all.add(served(each));
+    const Registration registration(all, repository);
+    std::vector<std::string> texts;
+    for (const auto& each : registration.capabilities()) texts.push_back(text(each));
+    EXPECT_THAT(texts, testing::ElementsAreArray(row.capabilities));
+    EXPECT_EQ(registration.warnings().size(), row.warnings);
+  }
+}
+
+}  // namespace
