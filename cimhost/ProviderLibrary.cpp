@@ -15,6 +15,9 @@ namespace {
 constexpr const char* kEntryPoint = "PegasusCreateProvider";
 constexpr const char* kLibraryFile = "libCommonProvider.so";
 
+// Where the provider library is installed, seen from the program's folder.
+constexpr const char* kInstalledFolder = COMMONPROVIDER_INSTALLED_FOLDER;
+
 using CreateProvider = Pegasus::CIMProvider* (*)(const Pegasus::String&);
 
 std::string loaderError() {
@@ -99,8 +102,8 @@ std::string findProviderLibrary(const std::string& given) {
   const fs::path program = fs::read_symlink("/proc/self/exe", error);
   if (!error) {
     const fs::path folder = program.parent_path();
-    for (const fs::path& candidate :
-         {folder.parent_path() / "lib" / kLibraryFile, folder / kLibraryFile}) {
+    for (const fs::path& place : {fs::path("../lib"), fs::path(), fs::path(kInstalledFolder)}) {
+      const fs::path candidate = (folder / place / kLibraryFile).lexically_normal();
       if (fs::is_regular_file(candidate, error)) return candidate.string();
     }
   }

@@ -53,9 +53,9 @@ class ProviderLibrary {
 };
 
 /// The provider library to load: `given` as an absolute path when it is not empty; else the file
-/// libCommonProvider.so in ../lib beside the program's folder or in that folder itself; else the
-/// bare file name, which leaves the search to the loader. Call it before the working directory
-/// changes.
+/// libCommonProvider.so in ../lib beside the program's folder, in that folder itself, or where it
+/// is installed, by its way from the program's folder; else the bare file name, which leaves the
+/// search to the loader. Call it before the working directory changes.
 std::string findProviderLibrary(const std::string& given);
 
 }  // namespace cimhost

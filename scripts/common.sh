@@ -32,6 +32,8 @@ i386_packages=(g++-multilib)
 clang_packages=(clang)
 benchmark_packages=(libbenchmark-dev)
 
+package_packages=(dpkg-dev fakeroot file lintian man-db make pkg-config)
+
 # configure PRESET [ARGUMENT...]: quiet unless it fails.
 configure() {
   local preset=$1 log
