@@ -2,6 +2,7 @@
 
 #include "cimhost/OperationStatus.h"
 #include "cimhost/PathArgument.h"
+#include "cimhost/ServeArguments.h"
 #include "cimhost/Text.h"
 #include "cimhost/output/DisplayText.h"
 
@@ -23,8 +24,9 @@ constexpr const char* kFooter =
     "Values are written as NAME=VALUE; NAME alone is null. Arrays: NAME=a,b or NAME=[]\n"
     "\n"
     "Exit codes: 0 done; 1 check, registration or dump found errors; 2 usage, malformed path,\n"
-    "value that does not fit; 3 home directory or provider library unusable; 4 results could not\n"
-    "be written; 10 + CIM status code when the operation failed, for example 16 for\n"
+    "value that does not fit; 3 home directory, provider library, users, certificate or address\n"
+    "unusable; 4 results could not be written; 5 serve: requests did not end in time; 10 + CIM "
+    "status code when the operation failed, for example 16 for\n"
     "CIM_ERR_NOT_FOUND.";
 
 struct FormatRow {
@@ -62,7 +64,8 @@ enum Options : unsigned {
   kValues = 64,     // NAME=VALUE..., at least one
   kMethod = 128,    // METHOD [NAME=VALUE...]
   kFiles = 256,     // [FILE...]
-  kModule = 512     // what a registration says of the provider module
+  kModule = 512,    // what a registration says of the provider module
+  kServe = 1024     // what a server is to do
 };
 
 struct CommandRow {
@@ -100,7 +103,9 @@ constexpr CommandRow kCommands[] = {
     {Command::registration, "registration",
      "Print the MOF that registers the classes with OpenPegasus", nullptr, nullptr, kModule},
     {Command::dump, "dump", "Print what definition files define; default: all of run/", nullptr,
-     nullptr, kFiles}};
+     nullptr, kFiles},
+    {Command::serve, "serve", "Answer CIM operations over HTTP until a signal ends it", nullptr,
+     nullptr, kServe}};
 
 CLI::Option* addText(CLI::App& app, const char* name, std::string& value, const char* description,
                      const char* type) {
@@ -181,6 +186,7 @@ void addCommand(CLI::App& app, const CommandRow& row, CommandLine& line, Argumen
   if ((row.options & (kValues | kMethod)) != 0) addValueArguments(command, row.options, line);
   if ((row.options & kFiles) != 0) command.add_option("FILE", line.files)->type_name("");
   if ((row.options & kModule) != 0) addModuleOptions(command, arguments);
+  if ((row.options & kServe) != 0) addServeArguments(command, line.serve);
 }
 
 void addGlobalOptions(CLI::App& app, CommandLine& line, Arguments& arguments) {
@@ -251,6 +257,7 @@ std::optional<CommandLine> parseCommandLine(int argc, const char* const* argv, s
       line.includeQualifiers = true;
     }
     convertArguments(arguments, line);
+    if (line.command == Command::serve) requireUsable(line.serve);
     exitCode = ExitCode::kOk;
     return line;
   } catch (const CLI::ParseError& problem) {

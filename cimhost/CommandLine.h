@@ -2,6 +2,7 @@
 
 #include "cimhost/Registration.h"
 #include "cimhost/Requests.h"
+#include "cimhost/ServeOptions.h"
 #include "cimhost/output/ResultWriter.h"
 
 #include <Pegasus/Common/CIMObjectPath.h>
@@ -19,8 +20,9 @@ struct ExitCode {
   static constexpr int kOk = 0;
   static constexpr int kProblems = 1;     ///< check, registration or dump found errors
   static constexpr int kUsage = 2;        ///< command line, malformed path, value that does not fit
-  static constexpr int kCannotStart = 3;  ///< home directory or provider library
+  static constexpr int kCannotStart = 3;  ///< home directory, provider library, server's files
   static constexpr int kOutput = 4;       ///< results could not be written
+  static constexpr int kHung = 5;         ///< serve: requests did not end in time
   static constexpr int kOperation = 10;
 };
 
@@ -40,7 +42,8 @@ struct CommandLine {
     classes,
     check,
     registration,
-    dump
+    dump,
+    serve
   };
 
   Command command = Command::check;
@@ -60,6 +63,7 @@ struct CommandLine {
   std::vector<std::string> values;  ///< NAME=VALUE of `modify` and `invoke`.
   std::vector<std::string> files;   ///< Of `dump`.
   RegistrationOptions registration;
+  ServeOptions serve;
 };
 
 /// Reads the command line. No value: help or the version was asked for and went to `out` (exitCode

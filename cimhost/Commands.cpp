@@ -155,6 +155,7 @@ OperationStatus runOperationCommand(const CommandLine& line, const Host& host,
     case Command::check:
     case Command::registration:
     case Command::dump:
+    case Command::serve:
       break;
   }
   return {};

@@ -31,6 +31,15 @@ Diagnostic toDiagnostic(const MofDiagnostic& problem, const Home& home) {
           bytePlace(problem.source, problem.caret)};
 }
 
+// Nobody reaches the host of a provider that has been terminated, even when that failed.
+struct Detach {
+  ~Detach() {
+    handle.reset();
+    Pegasus::setEmbeddedHost(nullptr);
+  }
+  std::unique_ptr<Pegasus::CIMOMHandle>& handle;
+};
+
 }  // namespace
 
 Host::Host(const std::string& homeDirectory)
@@ -43,22 +52,27 @@ Host::Host(const std::string& homeDirectory)
   const auto problems =
       checkConfigurationFile(home_.configuration(), home_.relative(home_.configuration()));
   diagnostics_.insert(diagnostics_.end(), problems.begin(), problems.end());
-  Pegasus::setEmbeddedHost(&cimom_);
-  handle_ = std::make_unique<Pegasus::CIMOMHandle>();
 }
 
 Host::~Host() {
   try {
-    provider_.unload();
+    unloadProvider();
   } catch (const HostError&) {
     // Whoever wants to know calls unloadProvider().
   }
-  handle_.reset();
-  Pegasus::setEmbeddedHost(nullptr);
 }
 
 void Host::loadProvider(const std::string& file) {
+  unloadProvider();
+  Pegasus::setEmbeddedHost(&cimom_);
+  handle_ = std::make_unique<Pegasus::CIMOMHandle>();
   provider_.load(file, kProviderName, *handle_);
+}
+
+void Host::unloadProvider() {
+  if (handle_ == nullptr) return;
+  const Detach detach{handle_};
+  provider_.unload();
 }
 
 void Host::readDeclarations() {

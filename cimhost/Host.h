@@ -15,8 +15,8 @@
 namespace cimhost {
 
 /// The embedded CIM host of one home directory: its class declarations, its definitions and, once
-/// loaded, the provider. One per process: it changes the working directory and is what every
-/// CIMOMHandle reaches.
+/// loaded, the provider. It changes the working directory of the process, and at most one of a
+/// process has its provider loaded.
 class Host {
  public:
   /// Enters home/run and reads declarations, definitions and configuration; malformed files become
@@ -27,10 +27,12 @@ class Host {
   Host(const Host&) = delete;
   Host& operator=(const Host&) = delete;
 
-  /// Loads the provider library `file`. Throws HostError. Not while operations run.
+  /// Loads the provider library `file` and becomes the host that every new CIMOMHandle reaches.
+  /// Throws HostError. Not while operations run.
   void loadProvider(const std::string& file);
-  /// Terminates the provider; throws HostError when that fails. Not while operations run.
-  void unloadProvider() { provider_.unload(); }
+  /// Terminates the provider and is reached by handles no longer; throws HostError when that fails.
+  /// Not while operations run.
+  void unloadProvider();
 
   const ClassRepository& repository() const { return repository_; }
   const Operations& operations() const { return operations_; }

@@ -26,7 +26,7 @@ need() {
     apt-get install -y -qq --no-install-recommends "${missing[@]}" >/dev/null
 }
 
-build_packages=(cmake ninja-build g++ libcli11-dev nlohmann-json3-dev libexpat1-dev)
+build_packages=(cmake ninja-build g++ libcli11-dev nlohmann-json3-dev libexpat1-dev libmicrohttpd-dev libcrypt-dev libgnutls28-dev)
 test_packages=(libgtest-dev libgmock-dev googletest)
 i386_packages=(g++-multilib)
 clang_packages=(clang)

@@ -1,0 +1,54 @@
+#include "cimhost/http/ClientConnection.h"
+
+#include "cimhost/http/Exchange.h"
+
+#include <sys/socket.h>
+
+namespace cimhost {
+
+void ClientConnection::begin(std::shared_ptr<Exchange> exchange, Clock::time_point deadline) {
+  // The last use of an exchange writes the log: not under the lock.
+  std::shared_ptr<Exchange> previous = std::move(exchange);
+  const std::lock_guard<std::mutex> lock(mutex_);
+  exchange_.swap(previous);
+  deadline_ = deadline;
+  warned_ = false;
+}
+
+void ClientConnection::expire(Clock::time_point now, Clock::duration grace) {
+  const std::lock_guard<std::mutex> lock(mutex_);
+  if (now < deadline_) return;
+  if (exchange_ == nullptr || warned_ || !exchange_->cut("took too long")) {
+    shutdown(socket_, SHUT_RDWR);
+  }
+  warned_ = true;
+  deadline_ = now + grace;
+}
+
+void ClientConnection::cut() {
+  const std::lock_guard<std::mutex> lock(mutex_);
+  if (exchange_ == nullptr || !exchange_->cut("the server stops")) shutdown(socket_, SHUT_RDWR);
+}
+
+void ConnectionTable::add(ClientConnection* connection) {
+  const std::lock_guard<std::mutex> lock(mutex_);
+  connections_.insert(connection);
+}
+
+void ConnectionTable::remove(ClientConnection* connection) {
+  const std::lock_guard<std::mutex> lock(mutex_);
+  connections_.erase(connection);
+}
+
+void ConnectionTable::expire(ClientConnection::Clock::time_point now,
+                             ClientConnection::Clock::duration grace) {
+  const std::lock_guard<std::mutex> lock(mutex_);
+  for (ClientConnection* each : connections_) each->expire(now, grace);
+}
+
+void ConnectionTable::cutAll() {
+  const std::lock_guard<std::mutex> lock(mutex_);
+  for (ClientConnection* each : connections_) each->cut();
+}
+
+}  // namespace cimhost

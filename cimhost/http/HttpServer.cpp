@@ -1,0 +1,323 @@
+#include "cimhost/http/HttpServer.h"
+
+#include "cimhost/HostError.h"
+
+#include <gnutls/gnutls.h>
+#include <microhttpd.h>
+
+#include <cstdarg>
+#include <cstdio>
+#include <filesystem>
+#include <fstream>
+#include <sstream>
+#include <utility>
+#include <vector>
+
+namespace cimhost {
+
+namespace {
+
+using Clock = std::chrono::steady_clock;
+
+constexpr unsigned kTransportThreads = 2;
+constexpr std::chrono::milliseconds kExpiryPeriod{200};
+constexpr std::size_t kReadBlock = 32U << 10U;
+// Beside request line and headers, the memory of a connection holds what is read and written.
+constexpr std::size_t kConnectionBuffers = 48U << 10U;
+constexpr std::uintmax_t kMaximumPemSize = 1U << 20U;
+constexpr const char* kPriorities = "NORMAL:-VERS-ALL:+VERS-TLS1.3:+VERS-TLS1.2";
+
+using ExchangePointer = std::shared_ptr<Exchange>;
+using ConnectionPointer = std::shared_ptr<ClientConnection>;
+using Response = std::unique_ptr<MHD_Response, void (*)(MHD_Response*)>;
+
+std::string readPem(const std::string& file) {
+  namespace fs = std::filesystem;
+  std::error_code error;
+  if (!fs::is_regular_file(file, error)) throw HostError(file + ": no such file");
+  if (fs::file_size(file, error) > kMaximumPemSize || error) {
+    throw HostError(file + ": larger than 1 MiB");
+  }
+  std::ifstream stream(file, std::ios::binary);
+  std::ostringstream text;
+  text << stream.rdbuf();
+  if (!stream) throw HostError(file + ": cannot be read");
+  return text.str();
+}
+
+gnutls_datum_t datumOf(std::string& text) {
+  return {reinterpret_cast<unsigned char*>(text.data()), static_cast<unsigned>(text.size())};
+}
+
+void addHeaders(MHD_Response& response, const HttpHeaders& headers) {
+  for (const auto& [name, value] : headers) {
+    // An empty value, as of Ext, is not taken otherwise.
+    MHD_add_response_header(&response, name.c_str(), value.empty() ? " " : value.c_str());
+  }
+}
+
+void freeString(void* text) {
+  delete static_cast<std::string*>(text);
+}
+
+Response wholeResponse(std::string body) {
+  auto owned = std::make_unique<std::string>(std::move(body));
+  MHD_Response* response = MHD_create_response_from_buffer_with_free_callback_cls(
+      owned->size(), owned->data(), freeString, owned.get());
+  if (response != nullptr) owned.release();
+  return {response, MHD_destroy_response};
+}
+
+// A stream's source keeps the exchange and its connection.
+struct Source {
+  ExchangePointer exchange;
+  MHD_Connection* connection;
+};
+
+ssize_t readSource(void* closure, std::uint64_t, char* bytes, std::size_t size) {
+  const Source& source = *static_cast<Source*>(closure);
+  const ssize_t got = source.exchange->pipe().read(
+      bytes, size, [&source] { MHD_suspend_connection(source.connection); });
+  if (got == ReplyPipe::kEnd) return MHD_CONTENT_READER_END_OF_STREAM;
+  if (got == ReplyPipe::kCut) return MHD_CONTENT_READER_END_WITH_ERROR;
+  return got;
+}
+
+void freeSource(void* closure) {
+  delete static_cast<Source*>(closure);
+}
+
+Response streamedResponse(const ExchangePointer& exchange, MHD_Connection* connection) {
+  auto source = std::make_unique<Source>(Source{exchange, connection});
+  MHD_Response* response = MHD_create_response_from_callback(MHD_SIZE_UNKNOWN, kReadBlock,
+                                                             readSource, source.get(), freeSource);
+  if (response != nullptr) source.release();
+  return {response, MHD_destroy_response};
+}
+
+MHD_Result send(MHD_Connection* connection, Exchange& exchange, int status, Response response) {
+  if (response == nullptr) return MHD_NO;
+  exchange.replying(status);
+  return MHD_queue_response(connection, static_cast<unsigned>(status), response.get());
+}
+
+MHD_Result sendRejection(MHD_Connection* connection, Exchange& exchange, bool last) {
+  const Rejection& rejection = *exchange.rejection();
+  Response response = wholeResponse(exchange.rejectionText());
+  if (response == nullptr) return MHD_NO;
+  addHeaders(*response, rejection.headers);
+  MHD_add_response_header(response.get(), "Content-Type", "text/plain");
+  if (last) MHD_add_response_header(response.get(), "Connection", "close");
+  return send(connection, exchange, rejection.status, std::move(response));
+}
+
+MHD_Result sendReply(MHD_Connection* connection, const ExchangePointer& exchange, bool last) {
+  ReplyPipe& pipe = exchange->pipe();
+  Response response =
+      pipe.isWhole() ? wholeResponse(pipe.takeWhole()) : streamedResponse(exchange, connection);
+  if (response == nullptr) return MHD_NO;
+  addHeaders(*response, exchange->request().replyHeaders(pipe.headers()));
+  if (pipe.status() == MHD_HTTP_SERVICE_UNAVAILABLE) addHeaders(*response, {{"Retry-After", "1"}});
+  if (last) MHD_add_response_header(response.get(), "Connection", "close");
+  return send(connection, *exchange, pipe.status(), std::move(response));
+}
+
+MHD_Result copyHeader(void* closure, MHD_ValueKind, const char* name, std::size_t nameSize,
+                      const char* value, std::size_t valueSize) {
+  HttpRequest& request = *static_cast<HttpRequest*>(closure);
+  request.addHeader({name, nameSize},
+                    value == nullptr ? std::string_view() : std::string_view(value, valueSize));
+  return MHD_YES;
+}
+
+}  // namespace
+
+// What the library calls; `closure` is the server. Nothing may be thrown into it.
+struct HttpCallbacks {
+  static void connectionChanged(void* closure, MHD_Connection* connection, void** context,
+                                MHD_ConnectionNotificationCode code) try {
+    HttpServer& server = *static_cast<HttpServer*>(closure);
+    if (code == MHD_CONNECTION_NOTIFY_STARTED) {
+      *context = addConnection(server, connection);
+    } else if (*context != nullptr) {
+      const std::unique_ptr<ConnectionPointer> owned(static_cast<ConnectionPointer*>(*context));
+      server.connections_.remove(owned->get());
+      *context = nullptr;
+    }
+  } catch (const std::exception&) {
+    // A connection without a context gets no exchange, and is closed by its first request.
+  }
+
+  static void* requestStarted(void* closure, const char*, MHD_Connection* connection) try {
+    HttpServer& server = *static_cast<HttpServer*>(closure);
+    const ConnectionPointer* client = clientOf(connection);
+    if (client == nullptr) return nullptr;
+    auto exchange = std::make_shared<Exchange>(server.services_, *client,
+                                               [connection] { MHD_resume_connection(connection); });
+    (*client)->begin(exchange, Clock::now() + server.services_.limits.requestTimeout);
+    return new ExchangePointer(std::move(exchange));
+  } catch (const std::exception&) {
+    return nullptr;
+  }
+
+  static MHD_Result request(void* closure, MHD_Connection* connection, const char* url,
+                            const char* method, const char* version, const char* bytes,
+                            std::size_t* size, void** context) try {
+    if (*context == nullptr) return MHD_NO;
+    const ExchangePointer& exchange = *static_cast<ExchangePointer*>(*context);
+    if (exchange->isNew()) {
+      exchange->request().setRequestLine(method, version);
+      MHD_get_connection_values_n(connection, MHD_HEADER_KIND, copyHeader, &exchange->request());
+      exchange->checkHeaders(method, url);
+      return exchange->isHopeless() ? sendRejection(connection, *exchange, true) : MHD_YES;
+    }
+    if (*size > 0) {
+      const bool wanted = exchange->receive(bytes, *size);
+      *size = 0;
+      return wanted ? MHD_YES : MHD_NO;
+    }
+    const bool last = static_cast<HttpServer*>(closure)->services_.draining;
+    if (exchange->rejection()) return sendRejection(connection, *exchange, last);
+    if (!exchange->isSubmitted()) exchange->submit();
+    const auto suspend = [connection] { MHD_suspend_connection(connection); };
+    return exchange->pipe().isReady(suspend) ? sendReply(connection, exchange, last) : MHD_YES;
+  } catch (const std::exception&) {
+    return MHD_NO;
+  }
+
+  static void requestEnded(void* closure, MHD_Connection* connection, void** context,
+                           MHD_RequestTerminationCode code) try {
+    if (*context == nullptr) return;
+    const std::unique_ptr<ExchangePointer> exchange(static_cast<ExchangePointer*>(*context));
+    *context = nullptr;
+    (*exchange)->end(code == MHD_REQUEST_TERMINATED_COMPLETED_OK);
+    HttpServer& server = *static_cast<HttpServer*>(closure);
+    if (const ConnectionPointer* client = clientOf(connection)) {
+      (*client)->begin(nullptr, Clock::now() + 2 * server.services_.limits.idleTimeout);
+    }
+  } catch (const std::exception&) {
+    // The log line is lost.
+  }
+
+  // Only what it says while it starts is of interest: later it is about single clients.
+  __attribute__((format(printf, 2, 0))) static void complain(void* closure, const char* format,
+                                                             va_list arguments) {
+    HttpServer& server = *static_cast<HttpServer*>(closure);
+    if (server.daemon_ != nullptr || server.quiet_) return;
+    char text[256];
+    std::vsnprintf(text, sizeof text, format, arguments);
+    server.daemonProblem_ = text;
+  }
+
+ private:
+  static void* addConnection(HttpServer& server, MHD_Connection* connection) {
+    const auto* address = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CLIENT_ADDRESS);
+    const auto* socket = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CONNECTION_FD);
+    if (address == nullptr || socket == nullptr) return nullptr;
+    auto client = std::make_unique<ConnectionPointer>(
+        std::make_shared<ClientConnection>(socket->connect_fd, addressText(*address->client_addr),
+                                           addressGroup(*address->client_addr)));
+    (*client)->begin(nullptr, Clock::now() + server.services_.limits.idleTimeout);
+    server.connections_.add(client->get());
+    return client.release();
+  }
+
+  static const ConnectionPointer* clientOf(MHD_Connection* connection) {
+    const auto* info = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_SOCKET_CONTEXT);
+    return info == nullptr ? nullptr : static_cast<ConnectionPointer*>(info->socket_context);
+  }
+};
+
+TlsFiles readTlsFiles(const std::string& certificateFile, const std::string& keyFile) {
+  TlsFiles files{readPem(certificateFile), readPem(keyFile)};
+  const gnutls_datum_t certificate = datumOf(files.certificate);
+  const gnutls_datum_t key = datumOf(files.key);
+  gnutls_certificate_credentials_t credentials = nullptr;
+  int error = gnutls_certificate_allocate_credentials(&credentials);
+  if (error == GNUTLS_E_SUCCESS) {
+    error =
+        gnutls_certificate_set_x509_key_mem(credentials, &certificate, &key, GNUTLS_X509_FMT_PEM);
+    gnutls_certificate_free_credentials(credentials);
+  }
+  if (error < 0) {
+    throw HostError(certificateFile + " with " + keyFile + ": " + gnutls_strerror(error));
+  }
+  return files;
+}
+
+HttpServer::HttpServer(const HttpSettings& settings, RequestHandler handler, RecordSink log)
+    : services_(settings.limits, std::move(handler), std::move(log)),
+      socket_(settings.address, settings.port),
+      port_(socket_.port()),
+      tls_(settings.tls) {
+  services_.setUsers(settings.users);
+  start(settings);
+  scheduleExpiry();
+}
+
+HttpServer::~HttpServer() {
+  stop();
+}
+
+void HttpServer::start(const HttpSettings& settings) {
+  unsigned flags = MHD_USE_EPOLL_INTERNAL_THREAD | MHD_ALLOW_SUSPEND_RESUME | MHD_USE_ERROR_LOG;
+  const ServeLimits& limits = settings.limits;
+  const auto number = [](MHD_OPTION option, std::size_t value) {
+    return MHD_OptionItem{option, static_cast<intptr_t>(value), nullptr};
+  };
+  std::vector<MHD_OptionItem> options = {
+      number(MHD_OPTION_LISTEN_SOCKET, static_cast<std::size_t>(socket_.descriptor())),
+      number(MHD_OPTION_THREAD_POOL_SIZE, kTransportThreads),
+      number(MHD_OPTION_CONNECTION_MEMORY_LIMIT, limits.headerSize + kConnectionBuffers),
+      number(MHD_OPTION_CONNECTION_LIMIT, limits.connections),
+      number(MHD_OPTION_PER_IP_CONNECTION_LIMIT, limits.connectionsPerAddress),
+      number(MHD_OPTION_CONNECTION_TIMEOUT, static_cast<std::size_t>(limits.idleTimeout.count())),
+  };
+  if (tls_) {
+    flags |= MHD_USE_TLS;
+    options.push_back({MHD_OPTION_HTTPS_MEM_CERT, 0, tls_->certificate.data()});
+    options.push_back({MHD_OPTION_HTTPS_MEM_KEY, 0, tls_->key.data()});
+    options.push_back({MHD_OPTION_HTTPS_PRIORITIES, 0, const_cast<char*>(kPriorities)});
+  }
+  options.push_back({MHD_OPTION_END, 0, nullptr});
+  daemon_ =
+      MHD_start_daemon(flags, 0, nullptr, nullptr, &HttpCallbacks::request, this,              //
+                       MHD_OPTION_EXTERNAL_LOGGER, &HttpCallbacks::complain, this,             //
+                       MHD_OPTION_NOTIFY_CONNECTION, &HttpCallbacks::connectionChanged, this,  //
+                       MHD_OPTION_URI_LOG_CALLBACK, &HttpCallbacks::requestStarted, this,      //
+                       MHD_OPTION_NOTIFY_COMPLETED, &HttpCallbacks::requestEnded, this,        //
+                       MHD_OPTION_ARRAY, options.data(), MHD_OPTION_END);
+  if (daemon_ == nullptr) throw HostError("the HTTP server cannot start: " + daemonProblem_);
+}
+
+void HttpServer::scheduleExpiry() {
+  services_.housekeeper.at(Clock::now() + kExpiryPeriod, [this] {
+    connections_.expire(Clock::now(), services_.limits.idleTimeout);
+    scheduleExpiry();
+  });
+}
+
+void HttpServer::drain() {
+  services_.draining = true;
+  if (!std::exchange(quiet_, true)) {
+    MHD_quiesce_daemon(daemon_);
+    socket_.close();
+  }
+}
+
+bool HttpServer::waitUntilIdle(std::chrono::milliseconds time) {
+  std::unique_lock<std::mutex> lock(services_.countMutex);
+  return services_.ended.wait_for(lock, time, [this] { return services_.count == 0; });
+}
+
+void HttpServer::stop() {
+  if (daemon_ == nullptr) return;
+  drain();
+  // Nothing may be suspended when the daemon stops, and no request is from now on.
+  connections_.cutAll();
+  MHD_stop_daemon(std::exchange(daemon_, nullptr));
+  services_.pool.stop();
+  services_.housekeeper.stop();
+}
+
+}  // namespace cimhost
