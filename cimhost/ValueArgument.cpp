@@ -170,10 +170,16 @@ CIMValue parseValue(const DeclaredType& declared,
     if (declared.isArray) appendElements(*text, elements);
   }
   if (!declared.isArray && texts.size() > 1) throw ValueArgumentError("more than one value given");
+  if (!declared.isArray) elements.push_back(*texts.front());
+  return parseElements(declared, elements);
+}
+
+CIMValue parseElements(const DeclaredType& declared, const std::vector<std::string>& texts) {
+  if (!declared.isArray && texts.size() != 1) throw ValueArgumentError("one value expected");
   return visitCimType(declared.type, [&](auto tag) {
     using T = typename decltype(tag)::Type;
-    if (declared.isArray) return makeArray<T>(declared, elements);
-    return CIMValue(ElementParser(*texts.front()).parse<T>());
+    if (declared.isArray) return makeArray<T>(declared, texts);
+    return CIMValue(ElementParser(texts.front()).parse<T>());
   });
 }
 

@@ -45,4 +45,9 @@ struct DeclaredType {
 Pegasus::CIMValue parseValue(const DeclaredType& declared,
                              const std::vector<std::optional<std::string>>& texts);
 
+/// The same where every element stands alone: one text for a scalar, any number for an array. Texts
+/// are taken as they are, without the list syntax of an argument.
+Pegasus::CIMValue parseElements(const DeclaredType& declared,
+                                const std::vector<std::string>& texts);
+
 }  // namespace cimhost

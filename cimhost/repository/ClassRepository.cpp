@@ -204,6 +204,11 @@ Pegasus::CIMQualifier ClassRepository::findQualifier(const CIMNamespaceName& nam
   return found == nullptr ? Pegasus::CIMQualifier() : found->qualifier.clone();
 }
 
+std::vector<QualifierDeclaration> ClassRepository::qualifiers(
+    const CIMNamespaceName& nameSpace) const {
+  return impl_->require(nameSpace).qualifiers.all();
+}
+
 bool ClassRepository::hasClass(const CIMNamespaceName& nameSpace, const CIMName& name) const {
   return impl_->find(nameSpace, name) != nullptr;
 }

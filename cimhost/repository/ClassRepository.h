@@ -1,6 +1,6 @@
 #pragma once
 
-#include "cimhost/repository/QualifierScope.h"
+#include "cimhost/repository/QualifierTable.h"
 
 #include <Pegasus/Common/CIMClass.h>
 #include <Pegasus/Common/CIMName.h>
@@ -51,6 +51,9 @@ class ClassRepository {
   /// The declaration of a qualifier (a copy), or an uninitialized handle.
   Pegasus::CIMQualifier findQualifier(const Pegasus::CIMNamespaceName& nameSpace,
                                       const Pegasus::CIMName& name) const;
+
+  /// All qualifier declarations, the standard ones included, sorted by name. Read them only.
+  std::vector<QualifierDeclaration> qualifiers(const Pegasus::CIMNamespaceName& nameSpace) const;
 
   /// True when the namespace exists and has the class.
   bool hasClass(const Pegasus::CIMNamespaceName& nameSpace, const Pegasus::CIMName& name) const;

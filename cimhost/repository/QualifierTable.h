@@ -6,6 +6,7 @@
 #include <Pegasus/Common/CIMQualifier.h>
 
 #include <unordered_map>
+#include <vector>
 
 namespace cimhost {
 
@@ -24,11 +25,17 @@ class QualifierTable {
   /// nullptr when there is none; else valid until the next add() of that name.
   const QualifierDeclaration* find(const Pegasus::CIMName& name) const;
 
+  /// All of them, the standard ones included, sorted by name.
+  std::vector<QualifierDeclaration> all() const;
+
  private:
   std::unordered_map<Pegasus::CIMName, QualifierDeclaration, NameHash, NameEqual> declarations_;
 };
 
 /// A standard qualifier of DSP0004, section 5.6.3, or nullptr.
 const QualifierDeclaration* findStandardQualifier(const Pegasus::CIMName& name);
+
+/// All standard qualifiers.
+std::vector<QualifierDeclaration> standardQualifiers();
 
 }  // namespace cimhost

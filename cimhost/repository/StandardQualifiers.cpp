@@ -143,12 +143,22 @@ Table makeTable() {
   return table;
 }
 
+const Table& standardTable() {
+  static const Table table = makeTable();
+  return table;
+}
+
 }  // namespace
 
 const QualifierDeclaration* findStandardQualifier(const Pegasus::CIMName& name) {
-  static const Table table = makeTable();
-  const auto found = table.find(name);
-  return found != table.end() ? &found->second : nullptr;
+  const auto found = standardTable().find(name);
+  return found != standardTable().end() ? &found->second : nullptr;
+}
+
+std::vector<QualifierDeclaration> standardQualifiers() {
+  std::vector<QualifierDeclaration> result;
+  for (const auto& each : standardTable()) result.push_back(each.second);
+  return result;
 }
 
 }  // namespace cimhost

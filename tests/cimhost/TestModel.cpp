@@ -111,7 +111,8 @@ TestHost::TestHost(const std::string& providerName) {
                            "Test_Many",          "Test_ManyNoComplete",
                            "Test_ManyThrows",    "Test_Swallows",
                            "Test_ServerDisks",   "Test_Nested",
-                           "Test_NoNamespace",   "Test_EchoPath"}) {
+                           "Test_NoNamespace",   "Test_EchoPath",
+                           "Test_Memory"}) {
     repository.addClass(kNamespace, makeClass(name, "", {"Name", "Size"}));
     served.add({kNamespace, CIMName(name), false, false, "test.xml", {}});
   }

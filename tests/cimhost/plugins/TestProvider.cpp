@@ -112,7 +112,14 @@ void deliverArray(const Request& request) {
   request.complete();
 }
 
+// What Test_Memory was last modified to.
+CIMInstance& remembered() {
+  static CIMInstance instance;
+  return instance;
+}
+
 const std::map<std::string, Behaviour> kBehaviours = {
+    {"Test_Memory", [](const Request& r) { r.handler.deliver(remembered()), r.complete(); }},
     {"Test_Disk", [](const Request& r) { r.deliver("a"), r.deliver("b"), r.complete(); }},
     {"Test_BigDisk", [](const Request& r) { r.deliver("big"), r.complete(); }},
     {"Test_Array", deliverArray},
@@ -233,6 +240,7 @@ class TestProvider final : public CIMInstanceProvider,
              std::to_string(instance.getPropertyCount()) + (includeQualifiers ? " q " : " ") +
              utf8(list.toString()));
     }
+    if (path.getClassName() == CIMName("Test_Memory")) remembered() = instance.clone();
     handler.processing();
     handler.complete();
   }
