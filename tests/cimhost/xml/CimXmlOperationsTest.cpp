@@ -26,12 +26,17 @@ TEST_F(CimXmlTest, AWholeReply) {
   EXPECT_EQ(reply.status, 200);
   EXPECT_EQ(reply.headers.at("Content-Type"), "application/xml; charset=\"utf-8\"");
   EXPECT_EQ(reply.headers.at("CIMOperation"), "MethodResponse");
-  EXPECT_EQ(reply.body.substr(0, 233),
-            "<?xml version=\"1.0\" encoding=\"utf-8\" ?>\n"
-            "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\">\n"
-            "<MESSAGE ID=\"42\" PROTOCOLVERSION=\"1.0\">\n<SIMPLERSP>\n"
-            "<IMETHODRESPONSE NAME=\"GetInstance\">\n<IRETURNVALUE>\n"
-            "<INSTANCE CLASSNAME=\"Test_BigDisk\">");
+  const std::string head =
+      "<?xml version=\"1.0\" encoding=\"utf-8\" ?>\n"
+      "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\">\n"
+      "<MESSAGE ID=\"42\" PROTOCOLVERSION=\"1.0\">\n<SIMPLERSP>\n"
+      "<IMETHODRESPONSE NAME=\"GetInstance\">\n<IRETURNVALUE>\n";
+  const std::string tail =
+      "\n</IRETURNVALUE>\n</IMETHODRESPONSE>\n</SIMPLERSP>\n</MESSAGE>\n</CIM>\n";
+  EXPECT_EQ(reply.body,
+            head + "<INSTANCE CLASSNAME=\"Test_BigDisk\">" +
+                "<PROPERTY NAME=\"Name\" TYPE=\"string\"><VALUE>big</VALUE></PROPERTY>" + kSize +
+                "</INSTANCE>" + tail);
   EXPECT_EQ(reply.summary.operation, "GetInstance");
   EXPECT_EQ(reply.summary.target, "root/test:Test_BigDisk");
   EXPECT_EQ(reply.summary.objects, 1u);
