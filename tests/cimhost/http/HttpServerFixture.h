@@ -44,7 +44,11 @@ class Latch {
 /// reply is the user, a colon and the body.
 class HttpServerTest : public testing::Test {
  protected:
-  ~HttpServerTest() override { go.open(); }
+  ~HttpServerTest() override {
+    go.open();
+    // It logs into the other members.
+    server.reset();
+  }
 
   cimhost::HttpServer& start() {
     server = std::make_unique<cimhost::HttpServer>(
