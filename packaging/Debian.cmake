@@ -24,6 +24,12 @@ set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS_PRIVATE_DIRS
 set(CPACK_DEBIAN_PACKAGE_PRIORITY optional)
 if(CMAKE_SIZEOF_VOID_P EQUAL 4 AND CMAKE_SYSTEM_PROCESSOR MATCHES "^(x86_64|i.86)$")
   set(CPACK_DEBIAN_PACKAGE_ARCHITECTURE i386)
+  if(CMAKE_SYSTEM_PROCESSOR STREQUAL "x86_64")
+    # Read by cpack, whose search for dpkg-shlibdeps it answers.
+    file(CONFIGURE OUTPUT CPackI386.cmake @ONLY CONTENT
+      "set(SHLIBDEPS_EXECUTABLE \"@CMAKE_CURRENT_SOURCE_DIR@/shlibdeps-i386\" CACHE FILEPATH \"\")\n")
+    set(CPACK_PROJECT_CONFIG_FILE "${CMAKE_CURRENT_BINARY_DIR}/CPackI386.cmake")
+  endif()
 endif()
 
 # debian_package(COMPONENT PACKAGE SECTION DESCRIPTION [DEPENDS ...] [RECOMMENDS ...]): control data in
@@ -45,14 +51,21 @@ endmacro()
 function(debian_packages)
   configure_file(debian/changelog.in changelog @ONLY)
   set(CPACK_COMPONENTS_ALL ${ARGN})
-  debian_package(provider commonprovider admin "generic, data-driven CIM provider
+  # The two builds of the provider may be installed side by side.
+  if(CIM_API STREQUAL "openpegasus")
+    set(provider_package commonprovider-openpegasus)
+    set(provider_server "OpenPegasus")
+  else()
+    set(provider_package commonprovider)
+    set(provider_server "cimhost, the embedded CIM host")
+  endif()
+  debian_package(provider ${provider_package} admin "generic, data-driven CIM provider
 A shared library through which a CIM server serves instances, associations
 and method calls of classes that definition files describe. A definition says
 which functions of a plain C library, the plug-in, give the instances and the
 values of their properties.
 .
-This package holds the provider library and the manual page of definition
-files.")
+This package holds the provider library for ${provider_server}.")
   debian_package(cimhost cimhost admin "embedded CIM host for CommonProvider
 A program that serves the classes of a home directory where no CIM server is
 installed: it loads the provider library as a server does, reads class
@@ -66,7 +79,7 @@ properties of CIM classes.
 .
 This package holds the C header that checks the functions' types and reads and
 writes their buffers, two examples with definition files and class
-declarations, and the manuals."
+declarations, and the manuals of plug-ins, definition files and cimhost."
     RECOMMENDS "cimhost, gcc | c-compiler, make, pkg-config")
   # Nothing in it depends on the machine.
   set(CPACK_DEBIAN_DEV_PACKAGE_ARCHITECTURE all)

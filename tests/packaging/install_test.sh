@@ -1,4 +1,4 @@
-# install_test.sh CMAKE BUILD-FOLDER: installs into an empty folder, moves it, and serves from there.
+# install_test.sh CMAKE BUILD-FOLDER [CFLAGS]: installs into an empty folder, moves it, and serves from there.
 
 set -euo pipefail
 
@@ -16,6 +16,14 @@ expect() {
 }
 
 expect 'Load_Average.Name="last 15 min"' "$cimhost" --home "$2/home/loadavg" names root/load:Load_Average
+
+# The examples build against the installed header, which is nowhere else.
+if command -v pkg-config >/dev/null && command -v make >/dev/null; then
+  export PKG_CONFIG_PATH=$folder/moved/share/pkgconfig
+  example=$folder/moved/share/doc/commonprovider-dev/examples/loadavg
+  make -s -C "$example" CFLAGS="${3-} -Werror"
+  expect 'Load_Average.Name="last 1 min"' "$cimhost" --home "$example/home" names root/load:Load_Average
+fi
 
 # It is the installed library that answered, and the build's own is not looked for.
 rm "$(find "$folder/moved" -name libCommonProvider.so)"
