@@ -66,11 +66,17 @@ which functions of a plain C library, the plug-in, give the instances and the
 values of their properties.
 .
 This package holds the provider library for ${provider_server}.")
+  if(TARGET cimhost_serve)
+    set(cimhost_answers "on the command line and over HTTP (CIM-XML)")
+  else()
+    set(cimhost_answers "on the command line")
+  endif()
   debian_package(cimhost cimhost admin "embedded CIM host for CommonProvider
 A program that serves the classes of a home directory where no CIM server is
 installed: it loads the provider library as a server does, reads class
-declarations (MOF), and answers requests on the command line. It checks
-definition files, too."
+declarations (MOF), and answers requests
+${cimhost_answers}.
+It checks definition files, too."
     DEPENDS "commonprovider (= ${CPACK_PACKAGE_VERSION}-${CPACK_DEBIAN_PACKAGE_RELEASE})"
     RECOMMENDS "bash-completion")
   debian_package(dev commonprovider-dev libdevel "header and examples for plug-ins of CommonProvider
