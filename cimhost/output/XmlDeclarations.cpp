@@ -77,6 +77,10 @@ constexpr ScopeRow kScopes[] = {
 
 }  // namespace
 
+bool isFalseKey(const CIMConstQualifier& qualifier) {
+  return qualifier.getName() == CIMName("Key") && qualifier.getValue().equal(CIMValue(false));
+}
+
 void appendClassName(XmlBuffer& out, const CIMName& name) {
   out.append("<CLASSNAME");
   appendNameAttribute(out, name);

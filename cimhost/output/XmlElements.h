@@ -38,10 +38,15 @@ void appendArraySize(XmlBuffer& out, Pegasus::Uint32 size);
 /// PROPERTY, PROPERTY.ARRAY or PROPERTY.REFERENCE.
 void appendProperty(XmlBuffer& out, const Pegasus::CIMConstProperty& property);
 
+/// Key(false), which means the same as no Key: some clients take any Key for a true one.
+bool isFalseKey(const Pegasus::CIMConstQualifier& qualifier);
+
+/// The qualifiers of an object or one of its parts, but for Key(false).
 template <class Element>
 void appendQualifiers(XmlBuffer& out, const Element& element) {
   for (Pegasus::Uint32 i = 0; i < element.getQualifierCount(); ++i) {
-    appendQualifier(out, element.getQualifier(i));
+    const Pegasus::CIMConstQualifier qualifier = element.getQualifier(i);
+    if (!isFalseKey(qualifier)) appendQualifier(out, qualifier);
   }
 }
 

@@ -90,7 +90,9 @@ TEST(XmlText, ClassesWithMethods) {
   method.addParameter(CIMParameter(CIMName("a"), CIMTYPE_UINT8, true, 3));
   method.addParameter(CIMParameter(CIMName("r"), CIMTYPE_REFERENCE, true, 0, CIMName("B")));
   declaration.addMethod(method);
-  declaration.addProperty(CIMProperty(CIMName("d"), CIMValue(Uint8(5))));
+  CIMProperty property(CIMName("d"), CIMValue(Uint8(5)));
+  property.addQualifier(CIMQualifier(CIMName("KEY"), CIMValue(false)));
+  declaration.addProperty(property);
   XmlBuffer out;
   appendClass(out, declaration);
   EXPECT_EQ(out.view(),
