@@ -27,7 +27,8 @@ need() {
 }
 
 build_packages=(cmake ninja-build g++ libcli11-dev nlohmann-json3-dev libexpat1-dev libmicrohttpd-dev libcrypt-dev libgnutls28-dev)
-test_packages=(libgtest-dev libgmock-dev googletest)
+client_packages=(sblim-wbemcli)
+test_packages=(libgtest-dev libgmock-dev googletest "${client_packages[@]}")
 i386_packages=(g++-multilib)
 clang_packages=(clang)
 benchmark_packages=(libbenchmark-dev)
