@@ -107,7 +107,7 @@ AssociationPlan Operations::planFor(const CIMNamespaceName& nameSpace,
                                     const CIMObjectPath& objectName,
                                     const AssociationFilter& filter) const {
   const CIMName className = objectName.getClassName();
-  requireClass(nameSpace, className);
+  requireClass(nameSpace, className, CIM_ERR_INVALID_PARAMETER);
   const CIMClass declaration =
       repository_.getClass(nameSpace, className, false, true, true, CIMPropertyList());
   if (objectName.getKeyBindings().size() == 0 && declaration.hasKeys()) {

@@ -120,12 +120,13 @@ OperationStatus Operations::enumerateClassNames(const EnumerateClassNamesRequest
   });
 }
 
-void Operations::requireClass(const CIMNamespaceName& nameSpace, const CIMName& className) const {
+void Operations::requireClass(const CIMNamespaceName& nameSpace, const CIMName& className,
+                              CIMStatusCode missing) const {
   if (!repository_.hasNamespace(nameSpace)) {
     throw CIMException(CIM_ERR_INVALID_NAMESPACE, nameSpace.getString());
   }
   if (!repository_.hasClass(nameSpace, className)) {
-    throw CIMException(CIM_ERR_INVALID_CLASS, className.getString());
+    throw CIMException(missing, className.getString());
   }
 }
 

@@ -74,7 +74,8 @@ class Operations {
   using TargetCall = std::function<void(const Pegasus::CIMObjectPath& classPath)>;
 
   void requireClass(const Pegasus::CIMNamespaceName& nameSpace,
-                    const Pegasus::CIMName& className) const;
+                    const Pegasus::CIMName& className,
+                    Pegasus::CIMStatusCode missing = Pegasus::CIM_ERR_INVALID_CLASS) const;
   std::vector<Pegasus::CIMName> servedTargets(const Pegasus::CIMNamespaceName& nameSpace,
                                               const Pegasus::CIMName& className) const;
   std::vector<Pegasus::CIMName> subclasses(const Pegasus::CIMNamespaceName& nameSpace,

@@ -205,7 +205,7 @@ TEST(Associators, RequestsThatCannotBeAnswered) {
         .code;
   };
   EXPECT_EQ(codeOf("root/nowhere", "Test_Disk.Name=\"a\""), CIM_ERR_INVALID_NAMESPACE);
-  EXPECT_EQ(codeOf("root/test", "Test_Missing.Name=\"a\""), CIM_ERR_INVALID_CLASS);
+  EXPECT_EQ(codeOf("root/test", "Test_Missing.Name=\"a\""), CIM_ERR_INVALID_PARAMETER);
   EXPECT_EQ(codeOf("root/test", "Test_Disk"), CIM_ERR_NOT_SUPPORTED);
   TestHost bare("Bare");
   EXPECT_TRUE(

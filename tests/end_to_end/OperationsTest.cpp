@@ -107,7 +107,7 @@ TEST_F(HostOperations, RefusedAndEmptyAnswersAreToldApart) {
   EXPECT_EQ(run({"reference-names", port}).out, "");
   EXPECT_EQ(run({"associator-names", port, "--result-class", "Host_FileSystem"}).out, "");
   EXPECT_EQ(run({"associator-names", port, "--assoc-class", "NoSuchClass"}).code, 14);
-  EXPECT_EQ(run({"associator-names", "root/host:NoSuchClass.Name=\"x\""}).code, 15);
+  EXPECT_EQ(run({"associator-names", "root/host:NoSuchClass.Name=\"x\""}).code, 14);
 }
 
 TEST_F(HostOperations, DumpShowsWhatWasRead) {
