@@ -95,7 +95,7 @@ Digits digitsOf(const char (&text)[kLength], bool interval) {
 }
 
 Uint64 dayNumber(const Digits& digits, bool interval) {
-  if (interval) return digits.number(0, 8);
+  if (interval) return digits.number(0, 8, 1);
   const Date date{digits.number(0, 4), digits.number(4, 6, 1), digits.number(6, 8, 1)};
   if (date.month < 1 || date.month > 12) throw DateTimeOutOfRangeException("illegal month number");
   if (date.day < 1 || date.day > daysInMonth(date.year, date.month)) {
@@ -149,7 +149,9 @@ CIMDateTime::CIMDateTime(const String& text) : CIMDateTime() {
 CIMDateTime::CIMDateTime(Uint64 microSeconds, Boolean isInterval)
     : microSeconds_(microSeconds), utcOffset_(0), wildcards_(0), interval_(isInterval) {
   if (microSeconds >= (isInterval ? kIntervalEnd : kTimeStampEnd)) {
-    throw DateTimeOutOfRangeException("too many microseconds");
+    throw DateTimeOutOfRangeException(
+        isInterval ? "Cannot create a CIMDateTime interval greater than 100 million days"
+                   : "Cannot create a CIMDateTime time stamp beyond the year 10,000");
   }
 }
 
@@ -218,8 +220,8 @@ CIMDateTime CIMDateTime::getCurrentDateTime() {
 }
 
 Sint64 CIMDateTime::getDifference(CIMDateTime start, CIMDateTime finish) {
-  requireSameKind(start.interval_, finish.interval_);
-  return finish.earliest() - start.earliest();
+  if (start.interval_ != finish.interval_) throw InvalidDateTimeFormatException();
+  return Sint64(finish.earliest() - start.earliest());
 }
 
 Boolean CIMDateTime::isInterval() const {
@@ -229,13 +231,18 @@ Boolean CIMDateTime::isInterval() {
   return interval_;
 }
 
-// The first and the last instant (in UTC) that the value may stand for.
-Sint64 CIMDateTime::earliest() const {
-  return Sint64(microSeconds_) - utcOffset_ * Sint64(kMinute);
+// The first and the last instant (in UTC) that the value may stand for. What is left open takes its
+// part of the offset with it. Before the year 0 the count goes round, as the server's does.
+Uint64 CIMDateTime::earliest() const {
+  constexpr Uint32 kNoMinutes = 10;
+  constexpr Uint32 kNoHours = 12;
+  if (wildcards_ >= kNoHours) return microSeconds_;
+  const int minutes = wildcards_ >= kNoMinutes ? utcOffset_ / 60 * 60 : utcOffset_;
+  return microSeconds_ - Uint64(minutes * Sint64(kMinute));
 }
 
-Sint64 CIMDateTime::latest() const {
-  return earliest() + Sint64(openSpan(microSeconds_, wildcards_, interval_)) - 1;
+Uint64 CIMDateTime::latest() const {
+  return earliest() + openSpan(microSeconds_, wildcards_, interval_) - 1;
 }
 
 Boolean CIMDateTime::equal(const CIMDateTime& x) const {
@@ -245,9 +252,7 @@ Boolean CIMDateTime::equal(const CIMDateTime& x) const {
 }
 
 Uint64 CIMDateTime::toMicroSeconds() const {
-  const Sint64 utc = earliest();
-  if (utc < 0) throw DateTimeOutOfRangeException("before the year 0 in UTC");
-  return Uint64(utc);
+  return earliest();
 }
 
 Boolean CIMDateTime::operator<(const CIMDateTime& x) const {

@@ -7,7 +7,7 @@
 PEGASUS_NAMESPACE_BEGIN
 
 bool InstanceRep::identical(const ObjectRep& other) const {
-  return dynamic_cast<const InstanceRep*>(&other) != nullptr && sameContent(other);
+  return sameContent(other);
 }
 
 Boolean InstanceReader::identical(const CIMConstInstance& other) const {

@@ -2,6 +2,7 @@
 #include <Pegasus/Common/CIMObjectPath.h>
 #include <Pegasus/Common/CIMValue.h>
 
+#include <cerrno>
 #include <cstdlib>
 #include <limits>
 
@@ -47,13 +48,36 @@ bool parseInteger(const String& text, T& x) {
   return true;
 }
 
+const char* skipDigits(const char* text) {
+  while (*text >= '0' && *text <= '9') ++text;
+  return text;
+}
+
+const char* skipSign(const char* text) {
+  return *text == '+' || *text == '-' ? text + 1 : text;
+}
+
+// A point with digits behind it is there, and all is ASCII digits.
+bool isReal(const char* text) {
+  text = skipDigits(skipSign(text));
+  if (*text != '.') return false;
+  const char* end = skipDigits(text + 1);
+  if (end == text + 1) return false;
+  if (*end == 'e' || *end == 'E') {
+    text = skipSign(end + 1);
+    end = skipDigits(text);
+    if (end == text) return false;
+  }
+  return *end == '\0';
+}
+
 template <class T>
 bool parseReal(const String& text, T& x) {
   const CString utf8 = text.getCString();
-  const char* const begin = utf8;
-  char* end = nullptr;
-  x = static_cast<T>(std::strtod(begin, &end));
-  return end != begin && *end == '\0';
+  if (!isReal(utf8)) return false;
+  errno = 0;
+  x = static_cast<T>(std::strtod(utf8, nullptr));
+  return errno == 0;
 }
 
 /// The key's text as a value of type T. False, or an exception of T's own, when it is none.
@@ -68,7 +92,7 @@ bool parseKey(const String& text, T& x) {
     return parseReal(text, x);
   } else if constexpr (std::is_same_v<T, Char16>) {
     x = text[0];
-    return text.size() == 1;
+    return true;
   } else if constexpr (std::is_same_v<T, CIMObject> || std::is_same_v<T, CIMInstance>) {
     return false;
   } else {
@@ -83,16 +107,21 @@ CIMKeyBinding::CIMKeyBinding(const CIMName& name, const CIMValue& value)
     : CIMKeyBinding(name, value.isArray() ? String() : value.toString(), keyTypeOf(value)) {}
 
 Boolean CIMKeyBinding::equal(CIMValue value) {
+  CIMValue own;
   try {
     if (keyTypeOf(value) != type_) return false;
-    return visitCimType(value.getType(), [&](auto tag) {
+    const bool parsed = visitCimType(value.getType(), [&](auto tag) {
       typename decltype(tag)::Type x{};
-      return parseKey(value_, x) && CIMValue(x) == value;
+      if (!parseKey(value_, x)) return false;
+      own = CIMValue(x);
+      return true;
     });
+    if (!parsed) return false;
   } catch (const Exception&) {
     // The text is no date, no path, or the type is none of a key.
     return false;
   }
+  return own == value;
 }
 
 PEGASUS_NAMESPACE_END

@@ -47,7 +47,7 @@ CIMMethod::CIMMethod(const CIMName& name, CIMType type, const CIMName& classOrig
     : QualifiedHandle(Ref<QualifiedRep>(new MethodRep(name, type, classOrigin, propagated))) {}
 
 void CIMMethod::setName(const CIMName& name) {
-  rep().rename(name);
+  rep().rename(name, MethodRep::kKind);
 }
 void CIMMethod::setType(CIMType type) {
   rep().type = type;

@@ -73,10 +73,10 @@ void ObjectReader::filterProperties(Boolean includeQualifiers, Boolean includeCl
 }
 
 Boolean AnyObjectReader::isClass() const {
-  return dynamic_cast<const ClassRep*>(&rep()) != nullptr;
+  return dynamic_cast<const ClassRep*>(HandleAccess::repOrNull(*this).get()) != nullptr;
 }
 Boolean AnyObjectReader::isInstance() const {
-  return dynamic_cast<const InstanceRep*>(&rep()) != nullptr;
+  return dynamic_cast<const InstanceRep*>(HandleAccess::repOrNull(*this).get()) != nullptr;
 }
 Boolean AnyObjectReader::identical(const CIMConstObject& other) const {
   return rep().identical(*HandleAccess::rep<ObjectRep>(other));

@@ -39,11 +39,9 @@ void requireLegalHost(const String& host) {
   if (host.size() > 0 && !isLegalHost(host)) throwMalformed(host, "invalid hostname");
 }
 
-ObjectPathParts parseOrThrow(const String& text) {
-  ObjectPathParts parts;
+void parseOrThrow(const String& text, ObjectPathParts& parts) {
   String reason;
   if (!parseObjectPath(text, parts, &reason)) throwMalformed(text, reason);
-  return parts;
 }
 
 // Sorted, and references in canonical form; shares `keyBindings` when there is nothing to change.
@@ -53,7 +51,9 @@ Array<CIMKeyBinding> canonical(const Array<CIMKeyBinding>& keyBindings) {
   for (Uint32 i = 0; i < keys.size(); ++i) {
     const CIMKeyBinding& key = keys.getData()[i];
     if (key.getType() != CIMKeyBinding::REFERENCE) continue;
-    const String text = formatObjectPath(parseOrThrow(key.getValue()));
+    ObjectPathParts reference;
+    parseOrThrow(key.getValue(), reference);
+    const String text = formatObjectPath(reference);
     if (text != key.getValue()) keys[i].setValue(text);
   }
   return keys;
@@ -125,15 +125,15 @@ void CIMObjectPath::set(const String& host, const CIMNamespaceName& nameSpace,
                         const CIMName& className, const Array<CIMKeyBinding>& keyBindings) {
   requireLegalHost(host);
   CIMObjectPath fresh(new CIMObjectPathRep);
-  fresh.rep_->parts = {host, nameSpace, className, canonical(keyBindings)};
+  fresh.rep_->parts = {host, nameSpace, className, keyBindings};
   std::swap(rep_, fresh.rep_);
+  rep_->parts.keyBindings = canonical(rep_->parts.keyBindings);
 }
 
 void CIMObjectPath::set(const String& objectName) {
   const String text(objectName);  // it may be a part of this path
   clear();
-  ObjectPathParts parts = parseOrThrow(text);
-  makeUnique()->parts = std::move(parts);
+  parseOrThrow(text, makeUnique()->parts);
 }
 
 const String& CIMObjectPath::getHost() const {
@@ -170,8 +170,10 @@ const Array<CIMKeyBinding>& CIMObjectPath::getKeyBindings() const {
 }
 
 void CIMObjectPath::setKeyBindings(const Array<CIMKeyBinding>& keyBindings) {
-  Array<CIMKeyBinding> keys = canonical(keyBindings);
-  makeUnique()->parts.keyBindings = std::move(keys);
+  Array<CIMKeyBinding> keys(keyBindings);
+  Array<CIMKeyBinding>& own = makeUnique()->parts.keyBindings;
+  own = std::move(keys);
+  own = canonical(own);
 }
 
 String CIMObjectPath::toString() const {

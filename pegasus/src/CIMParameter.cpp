@@ -55,7 +55,7 @@ CIMParameter::CIMParameter(const CIMName& name, CIMType type, Boolean isArray, U
 }
 
 void CIMParameter::setName(const CIMName& name) {
-  rep().rename(name);
+  rep().rename(name, ParameterRep::kKind);
 }
 
 PEGASUS_NAMESPACE_END

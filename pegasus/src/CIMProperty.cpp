@@ -22,7 +22,7 @@ PropertyRep::PropertyRep(const CIMName& name, const CIMValue& initialValue, Uint
 
 void PropertyRep::setValue(const CIMValue& newValue) {
   if (!newValue.typeCompatible(value_)) throw TypeMismatchException();
-  if (arraySize_ != 0 && !newValue.isNull() && newValue.getArraySize() != arraySize_) {
+  if (arraySize_ != 0 && newValue.getArraySize() != arraySize_) {
     throw TypeMismatchException();
   }
   value_ = newValue;
@@ -76,7 +76,7 @@ CIMProperty::CIMProperty(const CIMName& name, const CIMValue& value, Uint32 arra
           new PropertyRep(name, value, arraySize, referenceClassName, classOrigin, propagated))) {}
 
 void CIMProperty::setName(const CIMName& name) {
-  rep().rename(name);
+  rep().rename(name, PropertyRep::kKind);
 }
 void CIMProperty::setValue(const CIMValue& value) {
   rep().setValue(value);

@@ -43,7 +43,7 @@ CIMQualifier::CIMQualifier(const CIMName& name, const CIMValue& value, const CIM
     : QualifierReader(Ref<QualifierRep>(new QualifierRep(name, value, flavor, propagated))) {}
 
 void CIMQualifier::setName(const CIMName& name) {
-  rep().rename(name);
+  rep().rename(name, QualifierRep::kKind);
 }
 void CIMQualifier::setValue(const CIMValue& value) {
   rep().value = value;

@@ -22,8 +22,8 @@ const char* cimStatusCodeToString(CIMStatusCode code) {
       "CIM_ERR_INVALID_QUERY",
       "CIM_ERR_METHOD_NOT_AVAILABLE",
       "CIM_ERR_METHOD_NOT_FOUND",
-      "",
-      "",
+      "empty",
+      "empty",
       "CIM_ERR_NAMESPACE_NOT_EMPTY",
       "CIM_ERR_INVALID_ENUMERATION_CONTEXT",
       "CIM_ERR_INVALID_OPERATION_TIMEOUT",
@@ -37,7 +37,7 @@ const char* cimStatusCodeToString(CIMStatusCode code) {
   static_assert(sizeof kNames / sizeof *kNames == CIM_ERR_SERVER_IS_SHUTTING_DOWN + 1,
                 "one name per code");
   const auto index = static_cast<unsigned>(code);
-  return index < sizeof kNames / sizeof *kNames ? kNames[index] : "";
+  return index < sizeof kNames / sizeof *kNames ? kNames[index] : "Unrecognized CIM status code";
 }
 
 PEGASUS_NAMESPACE_END

@@ -1,8 +1,10 @@
 // CIMValue::toString
+#include <algorithm>
 #include <charconv>
 #include <cstdio>
 
 #include "CIMValueAccess.h"
+#include "Utf8.h"
 
 PEGASUS_NAMESPACE_BEGIN
 
@@ -27,12 +29,36 @@ void appendReal(String& out, double x) {
   appendAscii(out, text, static_cast<std::size_t>(size));
 }
 
-bool isSurrogate(Uint16 unit) {
-  return unit >= 0xD800 && unit <= 0xDFFF;
+constexpr Uint16 kReplacement = 0xFFFD;
+
+// Appends up to the first unit 0; false when there is one. A surrogate takes the next unit with it,
+// whether it is its partner or not.
+bool appendText(String& out, const String& text) {
+  const Char16* const units = text.getChar16Data();
+  const Uint32 size = text.size();
+  Uint32 run = 0;
+  for (Uint32 i = 0; i < size; ++i) {
+    const Uint16 unit = units[i];
+    if (unit != 0 && isCharacter(unit)) continue;
+    const bool surrogate = isHighSurrogate(unit) || isLowSurrogate(unit);
+    const Uint32 next = surrogate ? std::min(i + 2, size) : i + 1;
+    if (isHighSurrogate(unit) && next == i + 2 && isLowSurrogate(units[i + 1])) {
+      i = next - 1;
+      continue;
+    }
+    out.append(units + run, i - run);
+    if (unit == 0) return false;
+    out.append(Char16(kReplacement));
+    run = next;
+    i = next - 1;
+  }
+  out.append(units + run, size - run);
+  return true;
 }
 
+// False when the text of the whole value ends here.
 template <class T>
-void appendElement(String& out, const T& x) {
+bool appendElement(String& out, const T& x) {
   if constexpr (std::is_same_v<T, Boolean>) {
     appendAscii(out, x ? "TRUE" : "FALSE", x ? 4 : 5);
   } else if constexpr (std::is_integral_v<T>) {
@@ -40,17 +66,17 @@ void appendElement(String& out, const T& x) {
   } else if constexpr (std::is_floating_point_v<T>) {
     appendReal(out, static_cast<double>(x));
   } else if constexpr (std::is_same_v<T, Char16>) {
-    // Neither the terminator nor half a character is text.
     const Uint16 unit = x;
-    if (unit != 0 && !isSurrogate(unit)) out.append(x);
+    if (unit == 0 || isHighSurrogate(unit)) return false;
+    out.append(isCharacter(unit) ? x : Char16(kReplacement));
   } else if constexpr (std::is_same_v<T, String>) {
-    const Uint32 end = x.find(Char16(0));
-    out.append(x.getChar16Data(), end == PEG_NOT_FOUND ? x.size() : end);
+    return appendText(out, x);
   } else if constexpr (std::is_same_v<T, CIMInstance>) {
     out.append(CIMObject(x).toString());
   } else {
     out.append(x.toString());
   }
+  return true;
 }
 
 }  // namespace
@@ -66,7 +92,7 @@ String CIMValue::toString() const {
     }
     const Array<T>& elements = CIMValueAccess::held<Array<T>>(*this);
     for (Uint32 i = 0; i < elements.size(); ++i) {
-      appendElement<T>(out, elements[i]);
+      if (!appendElement<T>(out, elements[i])) return;
       out.append(Char16(' '));
     }
   });

@@ -23,10 +23,12 @@ class Element : public Shareable {
 
   const CIMName& name() const { return name_; }
 
-  void rename(const CIMName& name) {
+  /// `kind` is what the message calls it.
+  void rename(const CIMName& name, const char* kind) {
     if (name.isNull()) throw UninitializedObjectException();
     if (containers_.load(std::memory_order_relaxed) != 0 && name_ != name) {
-      throw Exception("Attempted to change the name of a property already in a container.");
+      throw Exception(String("Attempted to change the name of a ") + String(kind) +
+                      String(" already in a container."));
     }
     name_ = name;
   }

@@ -43,9 +43,25 @@ bool isPortSuffix(const std::string& text) {
   return port <= 65535;
 }
 
-bool isAddress(int family, const std::string& text) {
-  unsigned char address[sizeof(in6_addr)];
-  return inet_pton(family, text.c_str(), address) == 1;
+// Four numbers up to 255, of three digits at most.
+bool isAddress4(const std::string& text) {
+  std::size_t start = 0;
+  for (int part = 0; part < 4; ++part) {
+    const std::size_t end = part < 3 ? text.find('.', start) : text.size();
+    if (end == std::string::npos || end == start || end - start > 3) return false;
+    const auto first = text.begin() + std::ptrdiff_t(start);
+    const auto last = text.begin() + std::ptrdiff_t(end);
+    if (!std::all_of(first, last, isDigit) || std::stoi(std::string(first, last)) > 255) {
+      return false;
+    }
+    start = end + 1;
+  }
+  return true;
+}
+
+bool isAddress6(const std::string& text) {
+  in6_addr address;
+  return inet_pton(AF_INET6, text.c_str(), &address) == 1;
 }
 
 }  // namespace
@@ -54,17 +70,18 @@ bool isLegalHost(const String& host) {
   std::string text;
   for (Uint32 i = 0; i < host.size(); ++i) {
     const Uint16 unit = host.getChar16Data()[i];
-    if (unit == 0 || unit >= 0x80) return false;
+    if (unit == 0) break;
+    if (unit >= 0x80) return false;
     text += static_cast<char>(unit);
   }
   if (!text.empty() && text[0] == '[') {
     const std::size_t close = text.find(']');
-    return close != std::string::npos && isAddress(AF_INET6, text.substr(1, close - 1)) &&
+    return close != std::string::npos && isAddress6(text.substr(1, close - 1)) &&
            isPortSuffix(text.substr(close + 1));
   }
   const std::size_t colon = std::min(text.find(':'), text.size());
   const std::string name = text.substr(0, colon);
-  return (isDottedName(name) || isAddress(AF_INET, name)) && isPortSuffix(text.substr(colon));
+  return (isDottedName(name) || isAddress4(name)) && isPortSuffix(text.substr(colon));
 }
 
 PEGASUS_NAMESPACE_END

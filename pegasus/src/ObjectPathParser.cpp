@@ -73,8 +73,10 @@ class Parser {
     at_ = 2;
     const Uint32 slash = text_.find(at_, '/');
     if (slash == PEG_NOT_FOUND) return fail("missing slash after hostname");
-    parts_.host = upTo(slash);
-    return isLegalHost(parts_.host) || fail("invalid hostname");
+    const String host = upTo(slash);
+    if (!isLegalHost(host)) return fail("invalid hostname");
+    parts_.host = host;
+    return true;
   }
 
   bool parseNamespace() {
@@ -83,7 +85,8 @@ class Parser {
       return parts_.host.size() == 0 || fail("host specified, missing namespace");
     }
     const String name = upTo(colon);
-    if (!CIMNamespaceName::legal(name)) return fail("invalid namespace name");
+    const bool hasSecondSlash = parts_.host.size() > 0 && name[0] == '/';
+    if (hasSecondSlash || !CIMNamespaceName::legal(name)) return fail("invalid namespace name");
     parts_.nameSpace = name;
     return true;
   }
@@ -121,9 +124,15 @@ class Parser {
     String value;
     ++at_;
     if (!unescape(value)) return false;
+    addQuoted(name, value);
     if (at_ < text_.size() && !sees(at_++, ',')) {
       return failPair("next key-value pair has to start with comma");
     }
+    return true;
+  }
+
+  // What reads as a path with keys is a reference.
+  bool addQuoted(const String& name, const String& value) {
     ObjectPathParts reference;
     if (value.find(Char16('=')) != PEG_NOT_FOUND && parseObjectPath(value, reference) &&
         reference.keyBindings.size() > 0) {
@@ -153,7 +162,7 @@ class Parser {
     return true;
   }
 
-  const String& text_;
+  const String text_;
   ObjectPathParts& parts_;
   String* const reason_;
   Uint32 at_ = 0;
@@ -209,7 +218,8 @@ void sortKeyBindings(Array<CIMKeyBinding>& keyBindings) {
 }
 
 bool parseObjectPath(const String& text, ObjectPathParts& parts, String* reason) {
-  return Parser(text, parts, reason).parse();
+  const Uint32 end = text.find(Char16(0));
+  return Parser(end == PEG_NOT_FOUND ? text : text.subString(0, end), parts, reason).parse();
 }
 
 String formatObjectPath(const ObjectPathParts& parts) {

@@ -12,8 +12,9 @@ struct ObjectPathParts {
   Array<CIMKeyBinding> keyBindings;
 };
 
-/// Parses a whole path into `parts`, which is empty before. Returns whether it is one; if not,
-/// `parts` may be half filled and `reason`, unless null, says why. Throws std::bad_alloc only.
+/// Parses a text, up to its first unit 0, into `parts`, which is empty before. Returns whether it
+/// is a path; if not, `parts` holds what came before the mistake and `reason`, unless null, says
+/// why. Throws std::bad_alloc only.
 ///
 /// Recurses into quoted values that are paths themselves. Each level of quotes doubles the
 /// backslashes of the next, so the depth is at most the logarithm of the length.

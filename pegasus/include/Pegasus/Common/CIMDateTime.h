@@ -42,8 +42,8 @@ class PEGASUS_COMMON_LINKAGE CIMDateTime {
   Boolean operator!=(const CIMDateTime& x) const;
 
  private:
-  Sint64 earliest() const;
-  Sint64 latest() const;
+  Uint64 earliest() const;
+  Uint64 latest() const;
 
   Uint64 microSeconds_;  // local time of a time stamp, since the start of the year 0
   Sint16 utcOffset_;     // minutes
