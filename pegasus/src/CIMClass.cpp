@@ -14,7 +14,9 @@ bool ClassRep::identical(const ObjectRep& other) const {
 
 void ClassRep::checkProperty(const PropertyRep& property) const {
   const bool isReference = property.value().getType() == CIMTYPE_REFERENCE;
-  if (isReference && property.referenceClassName().isNull()) throw TypeMismatchException();
+  if (!isReference || !property.referenceClassName().isNull()) return;
+  // A name that is there already is the first thing to complain about.
+  if (properties.find(property.name()) == PEG_NOT_FOUND) throw TypeMismatchException();
 }
 
 ClassRep& ClassReader::rep() const {

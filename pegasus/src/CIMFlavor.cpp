@@ -35,12 +35,15 @@ CIMFlavor CIMFlavor::operator+(const CIMFlavor& flavor) const {
 }
 
 String CIMFlavor::toString() const {
-  static constexpr const char* kNames[] = {"EnableOverride ", "ToSubclass ",      "ToInstance ",
-                                           "Translatable ",   "DisableOverride ", "Restricted "};
+  static constexpr const char* kNames[] = {"OVERRIDABLE",  "TOSUBCLASS",      "TOINSTANCE",
+                                           "TRANSLATABLE", "DISABLEOVERRIDE", "RESTRICTED"};
   String out;
   Uint32 bit = 1;
   for (const char* name : kNames) {
-    if (bits_ & bit) out.append(String(name));
+    if (bits_ & bit) {
+      if (out.size() > 0) out.append(Char16(' '));
+      out.append(String(name));
+    }
     bit <<= 1;
   }
   return out;

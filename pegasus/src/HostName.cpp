@@ -1,6 +1,7 @@
 #include "HostName.h"
 
 #include <arpa/inet.h>
+#include <net/if.h>
 
 #include <algorithm>
 #include <string>
@@ -59,9 +60,14 @@ bool isAddress4(const std::string& text) {
   return true;
 }
 
+// An address of fe80::/16 names its interface behind a percent sign, and no other one does.
 bool isAddress6(const std::string& text) {
+  const std::size_t percent = text.find('%');
   in6_addr address;
-  return inet_pton(AF_INET6, text.c_str(), &address) == 1;
+  if (inet_pton(AF_INET6, text.substr(0, percent).c_str(), &address) != 1) return false;
+  const bool isLinkLocal = address.s6_addr[0] == 0xFE && address.s6_addr[1] == 0x80;
+  if (percent == std::string::npos) return !isLinkLocal;
+  return isLinkLocal && if_nametoindex(text.c_str() + percent + 1) != 0;
 }
 
 }  // namespace

@@ -1,6 +1,7 @@
 #include "ObjectPathParser.h"
 
 #include <algorithm>
+#include <vector>
 
 #include "HostName.h"
 
@@ -42,11 +43,19 @@ class Parser {
     while (at_ < text_.size()) {
       if (!parseKeyBinding()) return false;
     }
+    for (const Reference& reference : references_) {
+      parts_.keyBindings[reference.index].setValue(reference.text);
+    }
     sortKeyBindings(parts_.keyBindings);
     return true;
   }
 
  private:
+  struct Reference {
+    Uint32 index;
+    String text;
+  };
+
   bool fail(const char* reason, const String& detail = String::EMPTY, const char* rest = "") {
     if (reason_) *reason_ = String(reason) + detail + String(rest);
     return false;
@@ -136,7 +145,8 @@ class Parser {
     ObjectPathParts reference;
     if (value.find(Char16('=')) != PEG_NOT_FOUND && parseObjectPath(value, reference) &&
         reference.keyBindings.size() > 0) {
-      return add(name, formatObjectPath(reference), CIMKeyBinding::REFERENCE);
+      references_.push_back({parts_.keyBindings.size(), formatObjectPath(reference)});
+      return add(name, value, CIMKeyBinding::REFERENCE);
     }
     return add(name, value, CIMKeyBinding::STRING);
   }
@@ -165,6 +175,8 @@ class Parser {
   const String text_;
   ObjectPathParts& parts_;
   String* const reason_;
+  // References get their canonical form when the whole path has turned out to be one.
+  std::vector<Reference> references_;
   Uint32 at_ = 0;
 };
 

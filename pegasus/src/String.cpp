@@ -232,12 +232,13 @@ const Char16* String::getChar16Data() const {
 }
 
 CString String::getCString() const {
-  const size_t bytes = utf8Size(rep_->units(), rep_->size);
+  const size_t units = encodableUnits(rep_->units(), rep_->size);
+  const size_t bytes = utf8Size(rep_->units(), units);
   char* const text = new char[bytes + 1];
-  if (bytes == rep_->size) {
+  if (bytes == units) {
     for (size_t i = 0; i < bytes; ++i) text[i] = static_cast<char>(Uint16(rep_->units()[i]));
   } else {
-    encodeUtf8(rep_->units(), rep_->size, text);
+    encodeUtf8(rep_->units(), units, text);
   }
   text[bytes] = '\0';
   return CString(text);

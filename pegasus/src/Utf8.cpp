@@ -45,11 +45,6 @@ Uint32 decodeSequence(const char* text, std::size_t available) {
   return code < 0xD800 || code > 0xFFFF || isCharacter(Uint16(code)) ? code : kReplacement;
 }
 
-// A high surrogate at the very end stands for nothing.
-std::size_t encodableUnits(const Char16* units, std::size_t size) {
-  return size > 0 && isHighSurrogate(units[size - 1]) ? size - 1 : size;
-}
-
 // The code point at units[i]; advances i past it.
 Uint32 nextCode(const Char16* units, std::size_t size, std::size_t& i) {
   const Uint32 unit = Uint16(units[i++]);
@@ -91,17 +86,15 @@ Utf8Decoded decodeUtf8(const char* text, std::size_t size, Char16* out) {
 
 std::size_t utf8Size(const Char16* units, std::size_t size) {
   if (isAscii(units, size)) return size;
-  const std::size_t end = encodableUnits(units, size);
   std::size_t bytes = 0;
-  for (std::size_t i = 0; i < end;) bytes += encodedSize(nextCode(units, end, i));
+  for (std::size_t i = 0; i < size;) bytes += encodedSize(nextCode(units, size, i));
   return bytes;
 }
 
 void encodeUtf8(const Char16* units, std::size_t size, char* out) {
   constexpr unsigned char kLead[] = {0, 0, 0xC0, 0xE0, 0xF0};
-  const std::size_t end = encodableUnits(units, size);
-  for (std::size_t i = 0; i < end;) {
-    Uint32 code = nextCode(units, end, i);
+  for (std::size_t i = 0; i < size;) {
+    Uint32 code = nextCode(units, size, i);
     const std::size_t bytes = encodedSize(code);
     for (std::size_t k = bytes; k-- > 1; code >>= 6)
       out[k] = static_cast<char>(0x80 | (code & 0x3F));

@@ -30,11 +30,16 @@ struct Utf8Decoded {
 /// U+FFFF become U+FFFD.
 Utf8Decoded decodeUtf8(const char* text, std::size_t size, Char16* out);
 
+/// How many of the units a text is encoded of: a high surrogate at the very end stands for nothing.
+inline std::size_t encodableUnits(const Char16* units, std::size_t size) {
+  return size > 0 && isHighSurrogate(units[size - 1]) ? size - 1 : size;
+}
+
 /// Bytes that encodeUtf8() writes for these units.
 std::size_t utf8Size(const Char16* units, std::size_t size);
 
 /// Writes utf8Size() bytes, without a terminator. A surrogate without its partner becomes the three
-/// bytes of its own code, a high surrogate at the very end becomes nothing.
+/// bytes of its own code.
 void encodeUtf8(const Char16* units, std::size_t size, char* out);
 
 PEGASUS_NAMESPACE_END

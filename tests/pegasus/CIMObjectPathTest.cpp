@@ -107,6 +107,9 @@ TEST(CIMObjectPath, RefusesMalformedText) {
       {"//[::1/root:A", "invalid hostname"},
       {"//[]/root:A", "invalid hostname"},
       {"//[::1]x/root:A", "invalid hostname"},
+      {"//[::1%lo]/root:A", "invalid hostname"},
+      {"//[fe80::1]/root:A", "invalid hostname"},
+      {"//[fe80::1%]/root:A", "invalid hostname"},
       {"//h\xC3\xB6st/root:A", "invalid hostname"},
       {"A.b", "invalid key-value pair, missing equal sign"},
       {"A.,", "invalid key-value pair, missing equal sign"},
@@ -156,6 +159,7 @@ TEST(CIMObjectPath, KeepsWhatWasReadBeforeTheMistake) {
       {"A.z=1,a=2,c=x", "||A|z:N:1 a:N:2"},
       {R"(//h/root:A.b="x"y)", "h|root|A|b:S:x"},
       {R"(A.b="x)", "||A|"},
+      {R"(A.b="B.z=1,a=2",c)", "||A|b:R:B.z=1,a=2"},
   };
   for (const auto& c : cases) {
     CIMObjectPath assigned = path("//old/root:Old.k=1");

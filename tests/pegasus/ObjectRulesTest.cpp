@@ -124,6 +124,9 @@ TEST(ObjectRules, NamesAreUniqueInAnyCase) {
   EXPECT_EQ(thrownMessage<AlreadyExistsException>(
                 [&] { cls.addProperty(makeProperty("bETA", Uint32(1))); }),
             "already exists: property \"bETA\"");
+  // Before it is said that a reference needs a class.
+  EXPECT_THROW(cls.addProperty(makeProperty("bETA", CIMValue(CIMTYPE_REFERENCE, false))),
+               AlreadyExistsException);
   EXPECT_EQ(thrownMessage<AlreadyExistsException>(
                 [&] { cls.addMethod(CIMMethod(CIMName("RUN"), CIMTYPE_UINT8)); }),
             "already exists: method \"RUN\"");
@@ -284,6 +287,16 @@ TEST(ObjectRules, FiltersAndBuildsInstances) {
     EXPECT_EQ(filtered.getQualifierCount(), c.qualifiers ? 2u : 0u);
   }
   EXPECT_EQ(summary(cls), "Bqo O Aqo ");
+}
+
+TEST(ObjectRules, FlavorsWriteTheirNames) {
+  CIMFlavor flavor(CIMFlavor::DEFAULTS);
+  EXPECT_EQ(text(flavor.toString()), "OVERRIDABLE TOSUBCLASS");
+  flavor.addFlavor(CIMFlavor::RESTRICTED);
+  flavor.removeFlavor(CIMFlavor::ENABLEOVERRIDE);
+  EXPECT_EQ(text((flavor + CIMFlavor::TRANSLATABLE).toString()),
+            "TOSUBCLASS TRANSLATABLE RESTRICTED");
+  EXPECT_EQ(text(CIMFlavor(CIMFlavor::NONE).toString()), "");
 }
 
 TEST(ObjectRules, ObjectsKnowWhatTheyAre) {

@@ -64,6 +64,7 @@ TEST(StringUtf8, EncodesHalfCharacters) {
             "a\xED\xA0\x80"
             "b");
   EXPECT_EQ(text(String(units + 4, 1)), "");
+  EXPECT_EQ(text(String("\xC3\xA9").append(units[2])), "\xC3\xA9");
 }
 
 TEST(StringUtf8, RefusesMalformedText) {
