@@ -14,15 +14,16 @@ using Enumerate = ProviderTest;
 TEST_F(Enumerate, EachIndexGivesAnInstanceAndFetchesTheClassAnew) {
   setTable(state->left, {"a", "b"});
   state->numbers[1] = 7;
-  host.add(makeClass(
-      "T_Item", {declared("Undefined", CIMTYPE_STRING, Key::kUnqualified),
-                 declared("Size", CIMTYPE_UINT8), declared("Name", CIMTYPE_STRING, Key::kYes)}));
+  host.add(makeClass("T_Item", {declared("Undefined", CIMTYPE_STRING, Key::kUnqualified),
+                                declared("Size", CIMTYPE_UINT8, Key::kYes),
+                                declared("Name", CIMTYPE_STRING, Key::kYes)}));
   start(itemClass(property("Size", call("number", "getIi")) +
                   property("NotInTheClass", constant("int", "1"))));
   // The class's order, not the definition's; its name as the client spells it.
-  EXPECT_THAT(enumerate("root/t:t_item").events,
-              ElementsAre("processing", "root/t:t_item.Name=\"a\" {Size=uint8 0, Name=string a}",
-                          "root/t:t_item.Name=\"b\" {Size=uint8 7, Name=string b}", "complete"));
+  EXPECT_THAT(
+      enumerate("root/t:t_item").events,
+      ElementsAre("processing", "root/t:t_item.Name=\"a\",Size=0 {Size=uint8 0, Name=string a}",
+                  "root/t:t_item.Name=\"b\",Size=7 {Size=uint8 7, Name=string b}", "complete"));
   EXPECT_THAT(host.calls, ElementsAre("getClass root/t t_item 0 1 1 null",
                                       "getClass root/t t_item 0 1 1 null"));
 }

@@ -3,7 +3,7 @@
 #include <cstring>
 
 #include "ProviderTest.h"
-#include "ValueTable.h"
+#include "conversion/ValueTable.h"
 
 using namespace Pegasus;
 

@@ -1,7 +1,7 @@
 // modifyInstance: which properties are written, to which instance, with which value.
 
 #include "ProviderTest.h"
-#include "ValueTable.h"
+#include "conversion/ValueTable.h"
 
 using namespace Pegasus;
 
@@ -122,6 +122,30 @@ TEST_F(ModifyItem, ErrorOfTheHostPasses) {
   use(empty);
   // Nothing can be enumerated, so nothing is found.
   EXPECT_THAT(modify("root/t:T_Item.Name=\"a\"", sent), ElementsAre("processing", "complete"));
+}
+
+using ValueMapProperty = ProviderTest;
+
+// No attribute of a definition names the mapping property, so none is ever found.
+TEST_F(ValueMapProperty, ReadsAsUnknownAndIsNotWritten) {
+  host.add(makeClass(
+      "T_Item", {declared("Name", CIMTYPE_STRING, Key::kYes), declared("Size", CIMTYPE_UINT8)}));
+  start(definedClass("T_Item", constant("int", "1"),
+                     property("Name", constant("int", "1") + "<conversion type=\"valuemap\"/>",
+                              call("setText", "setSi")) +
+                         property("Size", constant("int", "3") + "<conversion type=\"valuemap\"/>",
+                                  call("setNumber", "setIi"))));
+  EXPECT_THAT(enumerate("root/t:T_Item").events,
+              ElementsAre("processing",
+                          "root/t:T_Item.Name=\"Unknown\" {Name=string Unknown, Size=uint8 3}",
+                          "complete"));
+  CIMInstance sent(CIMName("T_Item"));
+  sent.addProperty(CIMProperty(CIMName("Name"), CIMValue(String("OK"))));
+  sent.addProperty(CIMProperty(CIMName("Size"), CIMValue(Uint8(4))));
+  RecordingHandler handler;
+  provider->modifyInstance(context, pathOf("root/t:T_Item.Name=\"Unknown\""), sent, false,
+                           CIMPropertyList(), handler);
+  EXPECT_STREQ(state->record, "number 4@0\n");
 }
 
 }  // namespace

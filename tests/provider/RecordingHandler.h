@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-#include "CimText.h"
+#include "conversion/CimText.h"
 
 /// Notes every call that an operation makes on its handler, in order.
 class RecordingHandler : public Pegasus::InstanceResponseHandler,

@@ -1,9 +1,11 @@
 // CIM values read into definition values, for associations and conditions.
 
-#include "ProviderTest.h"
+#include <gmock/gmock.h>
+
 #include "ValueTable.h"
 #include "engine/ProviderDefArgument.h"
 #include "provider/CimConversion.h"
+#include "tests/support/LogLevel.h"
 
 using namespace Pegasus;
 

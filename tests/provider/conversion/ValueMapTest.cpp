@@ -2,7 +2,10 @@
 
 #include "provider/ValueMap.h"
 
-#include "ProviderTest.h"
+#include <gmock/gmock.h>
+
+#include "CimText.h"
+#include "MakeClass.h"
 
 using namespace Pegasus;
 
@@ -88,36 +91,12 @@ INSTANTIATE_TEST_SUITE_P(
         MapCase{"SignAndBlanksAndTail", {"-3", " +4x"}, {"A", "B"}, -3, "A", "B", "4"},
         MapCase{"NoDigits", {"many"}, {"A"}, 0, "none", "A", "0"},
         MapCase{"BeyondInt", {"99999999999999999999"}, {"A"}, 0, "none", "A", "2147483647"}),
-    kByName);
+    [](const auto& given) { return given.param.name; });
 
 TEST(ValueMappingErrors, PropertyThatTheClassLacks) {
   CIMClass mapped = mappedClass(kNumbers, kTexts);
   EXPECT_THROW(Vaneth::valueMapText(mapped, "Nothing", 1), Exception);
   EXPECT_THROW(Vaneth::valueMapNumber(mapped, "", String("OK")), Exception);
-}
-
-using ValueMapProperty = ProviderTest;
-
-// No attribute of a definition names the mapping property, so none is ever found.
-TEST_F(ValueMapProperty, ReadsAsUnknownAndIsNotWritten) {
-  host.add(makeClass(
-      "T_Item", {declared("Name", CIMTYPE_STRING, Key::kYes), declared("Size", CIMTYPE_UINT8)}));
-  start(definedClass("T_Item", constant("int", "1"),
-                     property("Name", constant("int", "1") + "<conversion type=\"valuemap\"/>",
-                              call("setText", "setSi")) +
-                         property("Size", constant("int", "3") + "<conversion type=\"valuemap\"/>",
-                                  call("setNumber", "setIi"))));
-  EXPECT_THAT(enumerate("root/t:T_Item").events,
-              ElementsAre("processing",
-                          "root/t:T_Item.Name=\"Unknown\" {Name=string Unknown, Size=uint8 3}",
-                          "complete"));
-  CIMInstance sent(CIMName("T_Item"));
-  sent.addProperty(CIMProperty(CIMName("Name"), CIMValue(String("OK"))));
-  sent.addProperty(CIMProperty(CIMName("Size"), CIMValue(Uint8(4))));
-  RecordingHandler handler;
-  provider->modifyInstance(context, pathOf("root/t:T_Item.Name=\"Unknown\""), sent, false,
-                           CIMPropertyList(), handler);
-  EXPECT_STREQ(state->record, "number 4@0\n");
 }
 
 }  // namespace
