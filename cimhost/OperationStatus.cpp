@@ -1,5 +1,7 @@
 #include "cimhost/OperationStatus.h"
 
+#include <string_view>
+
 #include "cimhost/Text.h"
 
 namespace cimhost {
@@ -21,7 +23,10 @@ namespace {
 
 // A provider may throw any number; what a client gets, and an exit code, needs one of the standard.
 Pegasus::CIMStatusCode failureCode(Pegasus::CIMStatusCode thrown) {
-  const bool known = thrown != CIM_ERR_SUCCESS && *Pegasus::cimStatusCodeToString(thrown) != '\0';
+  // Codes without a name have a text in place of one.
+  const bool known =
+      thrown != CIM_ERR_SUCCESS &&
+      std::string_view(Pegasus::cimStatusCodeToString(thrown)).substr(0, 4) == "CIM_";
   return known ? thrown : CIM_ERR_FAILED;
 }
 
