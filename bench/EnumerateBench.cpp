@@ -2,6 +2,7 @@
 // through a provider class written by hand for the one class, over the same API and plug-in. Both
 // fetch the class for every instance.
 
+#include "bench/BenchDevice.h"
 #include "provider/SimpleInstanceResponseHandler.h"
 
 #include <Pegasus/Common/CIMClass.h>
@@ -12,51 +13,15 @@
 
 #include <benchmark/benchmark.h>
 #include <dlfcn.h>
-#include <unistd.h>
 
 #include <cstdio>
 #include <cstring>
-#include <filesystem>
-#include <fstream>
 #include <stdexcept>
 
 using namespace Pegasus;
+using namespace bench;
 
 namespace {
-
-struct PropertyRow {
-  const char* name;
-  CIMType type;
-  bool isArray;
-  bool key;
-  const char* function;
-  const char* functionType;
-};
-
-constexpr PropertyRow kProperties[] = {
-    {"DeviceID", CIMTYPE_STRING, false, true, "benchText", "getSi"},
-    {"Caption", CIMTYPE_STRING, false, false, "benchText", "getSi"},
-    {"Number", CIMTYPE_UINT32, false, false, "benchNumber", "getIi"},
-    {"Percent", CIMTYPE_UINT8, false, false, "benchNumber", "getIi"},
-    {"Offset", CIMTYPE_SINT16, false, false, "benchNumber", "getIi"},
-    {"Size", CIMTYPE_UINT64, false, false, "benchLong", "getLi"},
-    {"Ready", CIMTYPE_BOOLEAN, false, false, "benchNumber", "getIi"},
-    {"Load", CIMTYPE_REAL64, false, false, "benchNumber", "getIi"},
-    {"Counters", CIMTYPE_SINT32, true, false, "benchNumbers", "getAIi"},
-    {"Labels", CIMTYPE_STRING, true, false, "benchTexts", "getASi"},
-};
-
-CIMClass benchClass() {
-  CIMClass cimClass(CIMName("Bench_Device"));
-  for (const PropertyRow& row : kProperties) {
-    CIMProperty property(CIMName(row.name), CIMValue(row.type, row.isArray));
-    property.addQualifier(CIMQualifier(CIMName("Key"), CIMValue(row.key)));
-    property.addQualifier(
-        CIMQualifier(CIMName("Description"), CIMValue(String("A property of the device."))));
-    cimClass.addProperty(property);
-  }
-  return cimClass;
-}
 
 class BenchHost : public CIMOMHandleRep {
  public:
@@ -167,47 +132,6 @@ class HandWritten {
   int (*numbers_)(void*, int);
   int (*texts_)(void*, int);
 };
-
-std::string definitionText() {
-  std::string text = std::string("<plugin><module name=\"") + BENCH_PLUGIN +
-                     "\"/><class name=\"Bench_Device\" namespace=\"root/bench\"><instances>"
-                     "<functioncall><function name=\"benchCount\" type=\"getI\"/></functioncall>"
-                     "</instances>";
-  for (const PropertyRow& row : kProperties) {
-    text += std::string("<property name=\"") + row.name +
-            "\"><get><functioncall><function name=\"" + row.function + "\" type=\"" +
-            row.functionType + "\"/><argument type=\"index\"/></functioncall></get></property>";
-  }
-  return text + "</class></plugin>";
-}
-
-// The working directory of a server: the definition file in run/, where the process is while the
-// object lives.
-class WorkingDirectory {
- public:
-  WorkingDirectory() : before_(std::filesystem::current_path()) {
-    char name[] = "/tmp/commonprovider-bench-XXXXXX";
-    if (mkdtemp(name) == nullptr) throw std::runtime_error("no temporary directory");
-    tree_ = name;
-    std::filesystem::create_directory(tree_ / "run");
-    std::ofstream(tree_ / "run" / "bench.xml") << definitionText();
-    std::filesystem::current_path(tree_ / "run");
-  }
-  ~WorkingDirectory() {
-    std::filesystem::current_path(before_);
-    std::filesystem::remove_all(tree_);
-  }
-
- private:
-  std::filesystem::path before_;
-  std::filesystem::path tree_;
-};
-
-const CIMObjectPath& benchPath() {
-  static const CIMObjectPath path(String(), CIMNamespaceName("root/bench"),
-                                  CIMName("Bench_Device"));
-  return path;
-}
 
 // Checks what was delivered, so that both sides are known to do the same work.
 void check(benchmark::State& state, Vaneth::SimpleInstanceResponseHandler& handler) {

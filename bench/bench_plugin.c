@@ -8,6 +8,7 @@ int benchText(void* out, int index);
 int benchTexts(void* out, int index);
 int benchNumbers(void* out, int index);
 int benchCount(void);
+int benchManyCount(void);
 
 int benchNumber(int index) {
   return index + 1;
@@ -52,4 +53,8 @@ int benchNumbers(void* out, int index) {
 
 int benchCount(void) {
   return 1000;
+}
+
+int benchManyCount(void) {
+  return 10000;
 }
