@@ -82,19 +82,12 @@ bool isPair(std::uint32_t high, std::uint32_t low) {
 
 }  // namespace
 
-char* XmlBuffer::room(std::size_t bytes) {
-  if (capacity_ - size_ < bytes) {
-    const std::size_t capacity = std::max(size_ + bytes, 2 * capacity_);
-    std::unique_ptr<char[]> larger(new char[capacity]);
-    if (size_ != 0) std::memcpy(larger.get(), bytes_.get(), size_);
-    bytes_ = std::move(larger);
-    capacity_ = capacity;
-  }
-  return bytes_.get() + size_;
-}
-
-void XmlBuffer::append(std::string_view markup) {
-  advance(put(room(markup.size()), markup));
+void XmlBuffer::grow(std::size_t bytes) {
+  const std::size_t capacity = std::max(size_ + bytes, 2 * capacity_);
+  std::unique_ptr<char[]> larger(new char[capacity]);
+  if (size_ != 0) std::memcpy(larger.get(), bytes_.get(), size_);
+  bytes_ = std::move(larger);
+  capacity_ = capacity;
 }
 
 void XmlBuffer::appendText(const Pegasus::String& text) {

@@ -3,6 +3,7 @@
 #include <Pegasus/Common/String.h>
 
 #include <cstddef>
+#include <cstring>
 #include <memory>
 #include <string_view>
 
@@ -13,7 +14,10 @@ namespace cimhost {
 class XmlBuffer {
  public:
   /// Markup, as it is.
-  void append(std::string_view markup);
+  void append(std::string_view markup) {
+    std::memcpy(room(markup.size()), markup.data(), markup.size());
+    size_ += markup.size();
+  }
 
   /// Text or an attribute's value: `<`, `>`, `&` and `"` become the named entities, and what XML
   /// has no form for (control characters, lone surrogates, U+FFFE and U+FFFF, bytes that are not
@@ -27,7 +31,11 @@ class XmlBuffer {
   void clear() { size_ = 0; }
 
  private:
-  char* room(std::size_t bytes);
+  char* room(std::size_t bytes) {
+    if (capacity_ - size_ < bytes) grow(bytes);
+    return bytes_.get() + size_;
+  }
+  void grow(std::size_t bytes);
   void advance(const char* end) { size_ = static_cast<std::size_t>(end - bytes_.get()); }
 
   std::unique_ptr<char[]> bytes_;
