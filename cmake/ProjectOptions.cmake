@@ -1,6 +1,7 @@
 # Compiler settings shared by every target of the project (link to project_options).
 
 option(COMMONPROVIDER_WERROR "Treat compiler warnings as errors" OFF)
+option(COMMONPROVIDER_FUZZERS "Build the fuzzers (needs clang)" OFF)
 option(COMMONPROVIDER_BENCHMARKS "Build the benchmarks (needs Google Benchmark and expat)" OFF)
 # CIM-XML over HTTP uses Debian's expat and libmicrohttpd, which are there for one word size only.
 if(CMAKE_SIZEOF_VOID_P EQUAL 4)
@@ -43,4 +44,8 @@ if(COMMONPROVIDER_SANITIZE)
   add_compile_options(-fsanitize=${COMMONPROVIDER_SANITIZE} -fno-omit-frame-pointer
     -fno-sanitize-recover=all)
   add_link_options(-fsanitize=${COMMONPROVIDER_SANITIZE})
+endif()
+
+if(COMMONPROVIDER_FUZZERS)
+  add_compile_options(-fsanitize=fuzzer-no-link)
 endif()
