@@ -28,7 +28,7 @@ need() {
 
 build_packages=(cmake ninja-build g++ libcli11-dev nlohmann-json3-dev libexpat1-dev libmicrohttpd-dev libcrypt-dev libgnutls28-dev)
 client_packages=(sblim-wbemcli)
-test_packages=(libgtest-dev libgmock-dev googletest "${client_packages[@]}")
+test_packages=(libgtest-dev libgmock-dev googletest curl openssl "${client_packages[@]}")
 i386_packages=(g++-multilib)
 clang_packages=(clang)
 benchmark_packages=(libbenchmark-dev)

@@ -4,8 +4,11 @@
 #include <Pegasus/Provider/CIMInstanceProvider.h>
 #include <Pegasus/Provider/CIMMethodProvider.h>
 
+#include <unistd.h>
+
 #include <cstdio>
 #include <cstdlib>
+#include <fstream>
 #include <functional>
 #include <map>
 #include <stdexcept>
@@ -15,8 +18,11 @@ using namespace Pegasus;
 
 namespace {
 
-// The only trace that outlives the library.
+// The only traces that outlive the library: the environment, and a file for other processes.
 void record(const std::string& event) {
+  if (const char* file = std::getenv("TEST_PROVIDER_TRACE")) {
+    std::ofstream(file, std::ios::app) << event << std::endl;
+  }
   const char* before = std::getenv("TEST_PROVIDER_EVENTS");
   setenv("TEST_PROVIDER_EVENTS", ((before != nullptr ? before : "") + event + ";").c_str(), 1);
 }
@@ -77,6 +83,14 @@ void deliverWhatTheServerHas(const Request& request) {
   request.complete();
 }
 
+void waitForGo(const Request& request) {
+  record("waiting");
+  const char* file = std::getenv("TEST_PROVIDER_GO");
+  while (file != nullptr && !std::ifstream(file)) usleep(10000);
+  request.deliver("waited");
+  request.complete();
+}
+
 void askForItself(const Request& request) {
   record("nested");
   request.server.enumerateInstances(request.context, request.path.getNameSpace(),
@@ -124,6 +138,7 @@ const std::map<std::string, Behaviour> kBehaviours = {
     {"Test_BigDisk", [](const Request& r) { r.deliver("big"), r.complete(); }},
     {"Test_Array", deliverArray},
     {"Test_Prints", deliverPrinting},
+    {"Test_Waits", waitForGo},
     {"Test_User", deliverUser},
     {"Test_Nothing", [](const Request&) {}},
     {"Test_OnlyCompletes", [](const Request& r) { r.complete(); }},

@@ -1,0 +1,220 @@
+// Who may come in: users, delays, TLS.
+
+#include "HttpServerFixture.h"
+
+#include "../../support/RunProgram.h"
+#include "../../support/TemporaryTree.h"
+
+#include "cimhost/HostError.h"
+#include "cimhost/http/FailureDelays.h"
+
+#include <crypt.h>
+#include <gmock/gmock.h>
+
+namespace {
+
+using namespace cimhost;
+using testing::HasSubstr;
+
+// Cheap hashes of "secret": the cost is the hash's own matter.
+std::string hashOf(const char* setting) {
+  crypt_data data{};
+  return crypt_r("secret", setting, &data);
+}
+const std::string& sha512() {
+  static const std::string hash = hashOf("$6$rounds=1000$saltsalt$");
+  return hash;
+}
+const std::string& bcrypt() {
+  static const std::string hash = hashOf("$2y$04$abcdefghijklmnopqrstuu");
+  return hash;
+}
+
+std::string basic(const std::string& encoded) {
+  return "Authorization: Basic " + encoded + "\r\n";
+}
+
+class UsersTest : public HttpServerTest {
+ protected:
+  std::string write(const std::string& text) {
+    const std::string file = (tree_.root() / "users").string();
+    TemporaryTree::write(file, text);
+    return file;
+  }
+  void startWithUsers() {
+    settings.users = std::make_shared<Authenticator>(
+        write("# who\nalice:" + sha512() + "\r\n\nbob:" + bcrypt() + "\n"));
+    start();
+  }
+
+ private:
+  TemporaryTree tree_;
+};
+
+struct LoginCase {
+  const char* name;
+  std::string header;
+  std::string body;  // Empty: refused.
+};
+
+class Logins : public UsersTest, public testing::WithParamInterface<LoginCase> {};
+
+TEST_P(Logins, AreCheckedBeforeTheHandler) {
+  startWithUsers();
+  HttpClient client(port());
+  // The second time what has been verified is remembered.
+  for (int i = 0; i < 2; ++i) {
+    const HttpReply reply = client.ask(post("x", GetParam().header));
+    if (GetParam().body.empty()) {
+      EXPECT_EQ(reply.status, 401);
+      EXPECT_THAT(reply.header("WWW-Authenticate"), HasSubstr("Basic realm="));
+      EXPECT_EQ(calls(), 0);
+    } else {
+      EXPECT_EQ(reply.body, GetParam().body);
+    }
+  }
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Table, Logins,
+    testing::Values(LoginCase{"Sha512", basic("YWxpY2U6c2VjcmV0"), "alice:x"},
+                    LoginCase{"Bcrypt", "authorization: bAsIc  Ym9iOnNlY3JldA==\r\n", "bob:x"},
+                    LoginCase{"Nobody", "", ""},
+                    LoginCase{"WrongPassword", basic("YWxpY2U6c2VjcmVU"), ""},
+                    LoginCase{"PasswordAndMore", basic("YWxpY2U6c2VjcmV0AA=="), ""},
+                    LoginCase{"UnknownUser", basic("Y2Fyb2w6c2VjcmV0"), ""},
+                    LoginCase{"NoColon", basic("YWxpY2U="), ""},
+                    LoginCase{"NotBase64", basic("!!!!"), ""}, LoginCase{"Empty", basic(""), ""},
+                    LoginCase{"OtherScheme", "Authorization: Bearer YWxpY2U6c2VjcmV0\r\n", ""},
+                    LoginCase{"TooLong", basic(std::string(4000, 'A')), ""}),
+    [](const auto& each) { return each.param.name; });
+
+TEST_F(UsersTest, HealthNeedsNoUser) {
+  startWithUsers();
+  EXPECT_EQ(ask("GET /healthz HTTP/1.1\r\nHost: x\r\n\r\n").status, 200);
+}
+
+TEST_F(UsersTest, WrongPasswordsSlowTheAddressDown) {
+  startWithUsers();
+  const std::string wrong = post("x", basic("YWxpY2U6c2VjcmVU"));
+  for (int i = 0; i < FailureDelays::kFreeFailures; ++i) ask(wrong);
+  const auto before = std::chrono::steady_clock::now();
+  EXPECT_EQ(ask(wrong).status, 401);
+  EXPECT_GE(std::chrono::steady_clock::now() - before, FailureDelays::kFirstDelay / 2);
+  // Right ones come in, and end it.
+  EXPECT_EQ(ask(post("x", basic("Ym9iOnNlY3JldA=="))).status, 200);
+  EXPECT_EQ(records(5).at(0).note, "wrong credentials of alice");
+}
+
+TEST_F(UsersTest, NewUsersTakeTheOldOnesPlace) {
+  startWithUsers();
+  const std::string alice = post("x", basic("YWxpY2U6c2VjcmV0"));
+  ASSERT_EQ(ask(alice).status, 200);
+  server->setUsers(std::make_shared<Authenticator>(write("bob:" + bcrypt() + "\n")));
+  EXPECT_EQ(ask(alice).status, 401);
+}
+
+TEST_F(UsersTest, UnusableFilesAreToldWithTheirLine) {
+  struct FileCase {
+    std::string text;
+    const char* problem;
+  };
+  const FileCase cases[] = {
+      {"", "no users"},
+      {"# nobody\n", "no users"},
+      {"alice\n", ":1: expected name:hash"},
+      {"\n:" + sha512() + "\n", ":2: expected name:hash"},
+      {"alice:$apr1$TqI9WECO$LHZB2DqRlk9nObiB6vJG9.\n", ":1: not a SHA-512"},
+      {"alice:{SHA}W6ph5Mm5Pz8GgiULbPgzG37mj9g=\n", ":1: not a SHA-512"},
+      {"alice:secret\n", ":1: not a SHA-512"},
+      {"alice:" + sha512().substr(1) + "\n", ":1: not a SHA-512"},
+      {"alice:" + sha512() + "x\n", ":1: not a SHA-512"},
+      {"alice:$6$\n", ":1: not a SHA-512"},
+      {"a:" + sha512() + "\na:" + bcrypt() + "\n", ":2: user comes twice"},
+      {std::string((1U << 20U) + 1, '\n'), "larger than 1 MiB"},
+  };
+  for (const FileCase& each : cases) {
+    try {
+      const UserFile users(write(each.text));
+      ADD_FAILURE() << each.text;
+    } catch (const HostError& problem) {
+      EXPECT_THAT(problem.what(), HasSubstr(each.problem)) << each.text;
+    }
+  }
+  EXPECT_THROW(UserFile("/"), HostError);
+}
+
+TEST(FailureDelaysTest, AttemptsOfAnAddressGetTheirTurnsOneByOne) {
+  using std::chrono::milliseconds;
+  FailureDelays delays;
+  auto now = FailureDelays::Clock::time_point() + std::chrono::hours(1);
+  for (int i = 0; i < FailureDelays::kFreeFailures; ++i) {
+    EXPECT_EQ(delays.reserve("a", now), milliseconds(0));
+    delays.failed("a", now);
+  }
+  EXPECT_EQ(delays.reserve("a", now), milliseconds(250));
+  EXPECT_EQ(delays.reserve("a", now), milliseconds(500));
+  EXPECT_EQ(delays.reserve("b", now), milliseconds(0));
+  for (int i = 0; i < 100; ++i) delays.failed("a", now);
+  while (delays.reserve("a", now)) {
+  }
+  EXPECT_EQ(delays.reserve("a", now + FailureDelays::kMemory * 2), milliseconds(0));
+  delays.succeeded("a");
+  EXPECT_EQ(delays.size(), 0U);
+}
+
+TEST(FailureDelaysTest, RemembersAFixedNumberOfAddresses) {
+  FailureDelays delays;
+  auto now = FailureDelays::Clock::time_point() + std::chrono::hours(1);
+  for (int i = 0; i < static_cast<int>(FailureDelays::kAddresses) + 50; ++i) {
+    delays.failed(std::to_string(i), now += std::chrono::milliseconds(1));
+  }
+  EXPECT_EQ(delays.size(), FailureDelays::kAddresses);
+}
+
+class TlsTest : public HttpServerTest {
+ protected:
+  void SetUp() override {
+    const ProgramResult made =
+        runProgram({"/usr/bin/openssl", "req", "-x509", "-newkey", "rsa:2048", "-nodes", "-days",
+                    "2", "-subj", "/CN=localhost", "-addext", "subjectAltName=IP:127.0.0.1",
+                    "-keyout", key(), "-out", certificate()});
+    ASSERT_EQ(made.code, 0) << made.err;
+  }
+
+  std::string key() const { return (tree_.root() / "key.pem").string(); }
+  std::string certificate() const { return (tree_.root() / "cert.pem").string(); }
+  std::string other() const { return (tree_.root() / "other.pem").string(); }
+
+  ProgramResult curl(const std::vector<std::string>& options) {
+    std::vector<std::string> all = {"/usr/bin/curl", "-sS",        "--max-time", "20",
+                                    "--cacert",      certificate()};
+    all.insert(all.end(), options.begin(), options.end());
+    all.push_back("https://127.0.0.1:" + std::to_string(port()) + "/cimom");
+    return runProgram(all);
+  }
+
+  TemporaryTree tree_;
+};
+
+TEST_F(TlsTest, RepliesCrossItWholeFromVersion12On) {
+  settings.tls = readTlsFiles(certificate(), key());
+  start();
+  EXPECT_EQ(curl({"--data-binary", "hello", "--tlsv1.3"}).out, ":hello");
+  EXPECT_EQ(curl({"--data-binary", "hello", "--tls-max", "1.2"}).out, ":hello");
+  EXPECT_NE(
+      curl({"--data-binary", "hello", "--tls-max", "1.1", "--ciphers", "DEFAULT@SECLEVEL=0"}).code,
+      0);
+  EXPECT_EQ(curl({"--data-binary", "size=1000000"}).out.size(), 1000000U);
+  // Plain HTTP is no handshake.
+  EXPECT_EQ(ask(post("x")).status, 0);
+}
+
+TEST_F(TlsTest, FilesThatDoNotFitAreTold) {
+  ASSERT_EQ(runProgram({"/usr/bin/openssl", "genrsa", "-out", other(), "2048"}).code, 0);
+  EXPECT_THROW(readTlsFiles(certificate(), other()), HostError);
+  EXPECT_THROW(readTlsFiles(key(), key()), HostError);
+  EXPECT_THROW(readTlsFiles(certificate(), tree_.root().string()), HostError);
+}
+
+}  // namespace

@@ -1,0 +1,72 @@
+#include "cimhost/http/RequestLog.h"
+
+#include "../../support/TemporaryTree.h"
+
+#include "cimhost/HostError.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using namespace cimhost;
+using testing::EndsWith;
+using testing::HasSubstr;
+
+std::string lineOf(const RequestRecord& record) {
+  return toLogLine(record, std::chrono::system_clock::time_point(std::chrono::milliseconds(1005)));
+}
+
+TEST(RequestLogTest, OneLineTellsOfARequest) {
+  RequestRecord record;
+  record.client = "127.0.0.1";
+  record.user = "alice";
+  record.summary = {"GetInstance", "root/host:Host_FileSystem", 200, 6, 0};
+  record.bytes = 812;
+  record.duration = std::chrono::milliseconds(3);
+  EXPECT_EQ(lineOf(record),
+            "1970-01-01T00:00:01.005Z client=127.0.0.1 user=alice operation=GetInstance "
+            "target=root/host:Host_FileSystem http=200 cim=6 objects=0 bytes=812 ms=3");
+}
+
+TEST(RequestLogTest, TextsOfClientsStayInTheirField) {
+  const struct {
+    std::string text;
+    std::string field;
+  } cases[] = {
+      {"", "operation=- "},
+      {"-", "operation=\"-\" "},
+      {"a b", "operation=\"a b\" "},
+      {"a\" http=200", "operation=\"a\\\" http=200\" "},
+      {"a\\", "operation=\"a\\\\\" "},
+      {"a\nb\x1b[31m", "operation=\"a\\nb\\x1b[31m\" "},
+      {"\xc3\xa4", "operation=\"\xc3\xa4\" "},
+      {"\xff", "operation=\"\\xff\" "},
+      {std::string(100000, 'x'), "operation=\"" + std::string(200, 'x') + "\xe2\x80\xa6\" "},
+  };
+  for (const auto& each : cases) {
+    RequestRecord record;
+    record.summary.operation = each.text;
+    EXPECT_THAT(lineOf(record), HasSubstr(each.field));
+  }
+}
+
+TEST(RequestLogTest, ReopeningFollowsTheName) {
+  const TemporaryTree tree;
+  const auto file = tree.logs() / "requests.log";
+  const auto old = tree.logs() / "requests.log.1";
+  RequestLog log(file.string());
+  log.message("first");
+  std::filesystem::rename(file, old);
+  log.message("second");
+  log.reopen();
+  log.message("third");
+  EXPECT_THAT(TemporaryTree::read(old), EndsWith("Z second\n"));
+  EXPECT_THAT(TemporaryTree::read(file), EndsWith("Z third\n"));
+  std::filesystem::remove(file);
+  std::filesystem::create_directory(file);
+  log.reopen();
+  log.write({});
+  EXPECT_THROW(RequestLog(file.string()), HostError);
+}
+
+}  // namespace
