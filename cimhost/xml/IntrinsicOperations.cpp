@@ -79,17 +79,17 @@ struct Work {
   const Operations& operations() const { return call.operations; }
   const CIMNamespaceName& nameSpace() const { return call.nameSpace; }
   CIMName className() const {
-    const CIMName name = parameters.requiredClassName("ClassName");
+    CIMName name = parameters.requiredClassName("ClassName");
     call.isAbout(name);
     return name;
   }
   CIMObjectPath instanceName() const {
-    const CIMObjectPath path = parameters.instanceName("InstanceName");
+    CIMObjectPath path = parameters.instanceName("InstanceName");
     call.isAbout(path.getClassName());
     return path;
   }
   CIMObjectPath objectName() const {
-    const CIMObjectPath path = parameters.objectName("ObjectName");
+    CIMObjectPath path = parameters.objectName("ObjectName");
     call.isAbout(path.getClassName());
     return path;
   }

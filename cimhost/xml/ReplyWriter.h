@@ -17,7 +17,7 @@ namespace cimhost {
 /// until then is a clean ERROR; after that it cuts the reply off. For one request, on one thread.
 class ReplyWriter {
  public:
-  static constexpr std::size_t kPiece = 64 * 1024;
+  static constexpr std::size_t kPiece = 65536;
 
   /// Both must outlive the writer.
   ReplyWriter(ReplyStream& stream, const CimMessage& message);
