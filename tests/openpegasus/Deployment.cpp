@@ -1,13 +1,15 @@
 #include "Deployment.h"
 
+#include "tests/compared/ComparedClasses.h"
+
 namespace fs = std::filesystem;
 
 Deployment::Deployment(CimServer::Providers providers) {
   std::string name = (fs::temp_directory_path() / "openpegasus-XXXXXX").string();
   if (mkdtemp(name.data()) == nullptr) throw std::runtime_error("cannot make " + name);
   root_ = name;
-  writeHome(cimhostHome());
-  writeHome(root_ / "server");
+  writeComparedHome(cimhostHome());
+  writeComparedHome(root_ / "server");
   server_ = std::make_unique<CimServer>(root_ / "server", providers);
   declareAndRegister();
 }
@@ -37,15 +39,6 @@ Deployment::~Deployment() {
   server_.reset();
   std::error_code ignored;
   fs::remove_all(root_, ignored);
-}
-
-void Deployment::writeHome(const fs::path& home) const {
-  for (const char* folder : {"run", "lib", "logs", "mof/root/compare"}) {
-    fs::create_directories(home / folder);
-  }
-  fs::create_symlink(COMPARE_PLUGIN, home / "lib/libcompare.so");
-  TemporaryTree::write(home / "run/compare.xml", comparedDefinitions());
-  TemporaryTree::write(home / "mof/root/compare/compare.mof", comparedDeclarations());
 }
 
 void Deployment::declareAndRegister() {

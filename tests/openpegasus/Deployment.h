@@ -3,7 +3,6 @@
 #include <memory>
 
 #include "CimServer.h"
-#include "ComparedClasses.h"
 #include "tests/support/TemporaryTree.h"
 
 /// The compared classes, served by a CIM server and by cimhost: each with the same definitions,
@@ -27,7 +26,6 @@ class Deployment {
   std::filesystem::path cimhostHome() const { return root_ / "cimhost"; }
 
  private:
-  void writeHome(const std::filesystem::path& home) const;
   void declareAndRegister();
 
   std::filesystem::path root_;

@@ -1,13 +1,17 @@
 #pragma once
 
+#include <filesystem>
 #include <string>
 
 /// The classes of namespace root/compare, which a CIM server and cimhost serve alike: every type,
 /// arrays, properties that clients set, methods, an abstract class above and a subclass below, and
-/// associations. The plug-in is plugins/compare.c.
+/// associations. The plug-in is compare.c.
 
 /// Class declarations with their qualifiers, for cimmof and for cimhost.
 std::string comparedDeclarations();
 
 /// The definition file.
 std::string comparedDefinitions();
+
+/// Makes `home` a home directory of these classes.
+void writeComparedHome(const std::filesystem::path& home);

@@ -1,5 +1,7 @@
 #include "ComparedClasses.h"
 
+#include "tests/support/TemporaryTree.h"
+
 #include <iterator>
 
 namespace {
@@ -210,4 +212,13 @@ std::string comparedDefinitions() {
   </association>
 </plugin>
 )";
+}
+
+void writeComparedHome(const std::filesystem::path& home) {
+  for (const char* folder : {"run", "lib", "logs", "mof/root/compare"}) {
+    std::filesystem::create_directories(home / folder);
+  }
+  std::filesystem::create_symlink(COMPARE_PLUGIN, home / "lib/libcompare.so");
+  TemporaryTree::write(home / "run/compare.xml", comparedDefinitions());
+  TemporaryTree::write(home / "mof/root/compare/compare.mof", comparedDeclarations());
 }
