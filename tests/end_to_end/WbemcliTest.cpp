@@ -58,13 +58,13 @@ class Wbemcli : public testing::Test {
     nameSpace_ = nameSpace;
   }
 
-  ProgramResult run(const std::string& arguments, const std::string& user = "") const {
+  ProgramResult run(const std::string& arguments, const std::string& before = "http://") const {
     const std::string address = "127.0.0.1:" + std::to_string(server_->port());
     std::vector<std::string> command = {"/usr/bin/timeout", "60", kClient};
     for (std::string& word : words(arguments)) {
-      const std::string path = "http://" + user + address + "/";
+      const std::string path = before + address + "/";
       if (word[0] == ':') word = path + nameSpace_ + (word == ":" ? "" : word);
-      if (word[0] == '/') word = path + word.substr(1);
+      if (word.rfind("/root/", 0) == 0) word = path + word.substr(1);
       command.push_back(word);
     }
     ProgramResult result = runProgram(command);
@@ -305,22 +305,31 @@ TEST_F(Wbemcli, SeesAReplyAsItIsOnTheWire) {
       << out;
 }
 
-TEST_F(Wbemcli, ShowsItsPassword) {
+TEST_F(Wbemcli, ShowsItsPasswordOnceItTrustsTheCertificate) {
+  const std::string folder = tree_.root().string();
+  ASSERT_EQ(runProgram({"/usr/bin/openssl", "req", "-x509", "-newkey", "rsa:2048", "-nodes",
+                        "-subj", "/CN=localhost", "-addext", "subjectAltName=IP:127.0.0.1",
+                        "-keyout", folder + "/key", "-out", folder + "/certificate"})
+                .code,
+            0);
   // SHA-512 crypt of "secret".
-  const std::string users = (tree_.root() / "users").string();
-  TemporaryTree::write(users,
+  TemporaryTree::write(folder + "/users",
                        "anna:$6$saltsalt$TVLlQcbpFVof5W3Yz4DTP6gRstiNuHwwTt6GLc1E5n0U"
                        "0aDehy0S5knV8wiOQSpT0Y77vwPZN.Pq.H91p5hVO1\n");
-  serve((tree_.root() / "compare").string(), "root/compare", {"--users", users});
-  EXPECT_EQ(run("ecn :Cmp_Element", "anna:secret@").out, "S/Cmp_SubElement\n");
-  const std::pair<const char*, const char*> refused[] = {
-      {"", "Http Exception: Username/password required."},
-      {"anna:wrong@", "Http Exception: Invalid username/password."},
-      {"bert:secret@", "Http Exception: Invalid username/password."}};
-  for (const auto& [user, message] : refused) {
-    const ProgramResult result = run("ecn :Cmp_Element", user);
+  serve(folder + "/compare", "root/compare",
+        {"--bind", "0.0.0.0", "--users", folder + "/users", "--tls-cert", folder + "/certificate",
+         "--tls-key", folder + "/key"});
+  const std::string trusting = "-cacert " + folder + "/certificate ecn :Cmp_Element";
+  EXPECT_EQ(run(trusting, "https://anna:secret@").out, "S/Cmp_SubElement\n");
+  const std::tuple<std::string, const char*, const char*> refused[] = {
+      {"ecn :Cmp_Element", "anna:secret@", "SSL peer certificate or SSH remote key was not OK"},
+      {trusting, "", "Username/password required."},
+      {trusting, "anna:wrong@", "Invalid username/password."},
+      {trusting, "bert:secret@", "Invalid username/password."}};
+  for (const auto& [command, user, message] : refused) {
+    const ProgramResult result = run(command, std::string("https://") + user);
     EXPECT_EQ(result.code, kFailed) << user;
-    EXPECT_EQ(result.err, failure(message)) << user;
+    EXPECT_EQ(result.err, failure(std::string("Http Exception: ") + message)) << user;
   }
 }
 
