@@ -4,7 +4,9 @@
 #include <gtest/gtest.h>
 
 #include <atomic>
+#include <chrono>
 #include <thread>
+#include <vector>
 
 #include "tests/cimhost/http/HttpClient.h"
 #include "tests/compared/ComparedClasses.h"
@@ -65,9 +67,9 @@ std::string echo(int number) {
 
 // A client has one property of one of the four instances to itself.
 struct Place {
-  explicit Place(int client)
+  explicit Place(std::size_t client)
       : instance(path("Cmp_Stored", client % 2 == 0 ? "plain" : "a b,c=d.e:f")),
-        property(std::vector<std::string>{"S32", "U64", "U8", "Text"}[client / 2U]) {}
+        property(std::vector<std::string>{"S32", "U64", "U8", "Text"}[client / 2]) {}
 
   std::string read() const {
     return operation("GetProperty",
@@ -87,7 +89,7 @@ struct Place {
 
 class Client {
  public:
-  Client(int port, int number) : http_(static_cast<std::uint16_t>(port)), place_(number) {}
+  Client(int port, std::size_t number) : http_(static_cast<std::uint16_t>(port)), place_(number) {}
 
   /// Request number `round`; what is wrong with the reply, or nothing.
   std::string round(int round) {
@@ -146,12 +148,12 @@ TEST(Concurrency, ClientsDoNotDisturbEachOther) {
   std::atomic<int> done{0};
   std::vector<std::string> problems(kClients);
   std::vector<std::thread> clients;
-  for (int number = 0; number < kClients; ++number) {
+  for (std::size_t number = 0; number < kClients; ++number) {
     clients.emplace_back([&, number] {
       Client client(server.port(), number);
-      std::string& problem = problems[static_cast<std::size_t>(number)];
+      std::string& problem = problems[number];
       for (int round = 0; round < rounds && problem.empty(); ++round) {
-        problem = client.round(round + number);
+        problem = client.round(round + static_cast<int>(number));
         ++done;
       }
       done += problem.empty() ? 0 : rounds;

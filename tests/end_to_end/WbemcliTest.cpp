@@ -3,7 +3,10 @@
 #include <gtest/gtest.h>
 #include <unistd.h>
 
+#include <algorithm>
+#include <memory>
 #include <regex>
+#include <tuple>
 
 #include "tests/compared/ComparedClasses.h"
 #include "tests/support/CimhostServer.h"
@@ -49,6 +52,12 @@ class Wbemcli : public testing::Test {
     setenv("no_proxy", "127.0.0.1", 1);
     writeComparedHome(tree_.root() / "compare");
     serve((tree_.root() / "compare").string(), "root/compare");
+  }
+
+  // What a sanitizer has seen is in the exit code.
+  void TearDown() override {
+    const int code = server_ == nullptr ? 0 : server_->stop();
+    EXPECT_EQ(code, 0);
   }
 
   void serve(const std::string& home, const std::string& nameSpace,
@@ -286,7 +295,6 @@ TEST_F(Wbemcli, IsToldWhatCannotBeDone) {
       {"mi ':Cmp_Part.Name=\"part 9\"' 'Owner=\"x\"'", "",
        "Cim: (1) CIM_ERR_FAILED: Too few objects delivered."},
   });
-  EXPECT_EQ(server_->stop(), 0);
 }
 
 TEST_F(Wbemcli, SeesAReplyAsItIsOnTheWire) {
