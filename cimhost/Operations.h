@@ -73,8 +73,7 @@ class Operations {
  private:
   using TargetCall = std::function<void(const Pegasus::CIMObjectPath& classPath)>;
 
-  void requireClass(const Pegasus::CIMNamespaceName& nameSpace,
-                    const Pegasus::CIMName& className,
+  void requireClass(const Pegasus::CIMNamespaceName& nameSpace, const Pegasus::CIMName& className,
                     Pegasus::CIMStatusCode missing = Pegasus::CIM_ERR_INVALID_CLASS) const;
   std::vector<Pegasus::CIMName> servedTargets(const Pegasus::CIMNamespaceName& nameSpace,
                                               const Pegasus::CIMName& className) const;
