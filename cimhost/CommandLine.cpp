@@ -98,6 +98,8 @@ constexpr CommandRow kCommands[] = {
      kSelection | kLocal},
     {Command::classes, "classes", "The classes of a namespace, or below a class", "NS[:CLASS]",
      parseNamespaceOrClass, kClasses},
+    {Command::qualifiers, "qualifiers", "Print the qualifiers of a namespace as MOF", "NS",
+     parseNamespaceOrClass, kNone},
     {Command::check, "check", "Report every problem in the files of the home directory", nullptr,
      nullptr, kNone},
     {Command::registration, "registration",

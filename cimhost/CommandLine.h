@@ -41,6 +41,7 @@ struct CommandLine {
     declaration,
     classes,
     check,
+    qualifiers,
     registration,
     dump,
     serve

@@ -3,6 +3,7 @@
 #include "cimhost/DefinitionFiles.h"
 #include "cimhost/RequestArguments.h"
 #include "cimhost/output/DisplayText.h"
+#include "cimhost/output/MofText.h"
 
 #include <pwd.h>
 #include <unistd.h>
@@ -152,6 +153,7 @@ OperationStatus runOperationCommand(const CommandLine& line, const Host& host,
                                  writer);
     case Command::classes:
       return listClasses(line, operations, writer);
+    case Command::qualifiers:
     case Command::check:
     case Command::registration:
     case Command::dump:
@@ -177,6 +179,11 @@ int outputCode(const std::ostream& out, std::ostream& error) {
   return ExitCode::kOutput;
 }
 
+int operationCode(const OperationStatus& status, std::ostream& error) {
+  error << "cimhost: " << displayText(status.toString()) << '\n';
+  return ExitCode::kOperation + static_cast<int>(status.code);
+}
+
 bool isError(const Diagnostic& problem) {
   return problem.severity == Diagnostic::Severity::error;
 }
@@ -191,6 +198,7 @@ bool needsProvider(Command command) {
   switch (command) {
     case Command::declaration:
     case Command::classes:
+    case Command::qualifiers:
     case Command::check:
     case Command::registration:
     case Command::dump:
@@ -204,6 +212,7 @@ int runCommand(const CommandLine& line, const Host& host, std::ostream& out, std
   if (line.command == Command::check) return runCheck(host, out);
   if (line.command == Command::registration) return runRegistration(line, host, out, error);
   print(host.diagnostics(), error);
+  if (line.command == Command::qualifiers) return runQualifiers(line, host, out, error);
   CommandWriter writer(makeResultWriter(line.format, out, formOf(line.command)),
                        host.operations().hostName());
   OperationStatus status;
@@ -215,10 +224,19 @@ int runCommand(const CommandLine& line, const Host& host, std::ostream& out, std
   }
   const bool hasResult = line.command != Command::modify;
   if ((status.ok() && hasResult) || writer.any()) writer.finish();
-  if (!status.ok()) {
-    error << "cimhost: " << displayText(status.toString()) << '\n';
-    return ExitCode::kOperation + static_cast<int>(status.code);
-  }
+  return status.ok() ? outputCode(out, error) : operationCode(status, error);
+}
+
+int runQualifiers(const CommandLine& line, const Host& host, std::ostream& out,
+                  std::ostream& error) {
+  const Pegasus::CIMNamespaceName& nameSpace = line.target.getNameSpace();
+  const OperationStatus status = runOperation([&] {
+    for (const QualifierDeclaration& each : host.repository().qualifiers(nameSpace)) {
+      out << mofQualifier(each);
+    }
+  });
+  if (!status.ok()) return operationCode(status, error);
+  out.flush();
   return outputCode(out, error);
 }
 

@@ -17,6 +17,10 @@ int runCommand(const CommandLine& line, const Host& host, std::ostream& out, std
 /// All that is wrong in the home directory's files, and a line that counts it; kOk without errors.
 int runCheck(const Host& host, std::ostream& out);
 
+/// Writes the qualifier declarations of a namespace as MOF.
+int runQualifiers(const CommandLine& line, const Host& host, std::ostream& out,
+                  std::ostream& error);
+
 /// Writes the MOF that registers what the home directory serves. Problems go to `error`; with an
 /// error among them, or nothing to register, nothing is written.
 int runRegistration(const CommandLine& line, const Host& host, std::ostream& out,

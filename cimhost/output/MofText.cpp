@@ -6,6 +6,8 @@
 #include <charconv>
 #include <cmath>
 #include <cstdio>
+#include <utility>
+#include <vector>
 
 namespace cimhost {
 
@@ -111,12 +113,33 @@ std::string MofFormatter::object(const CIMObject& any) const {
   return any.isInstance() ? instance(CIMInstance(any)) : mofClass(CIMClass(any));
 }
 
-std::string flavorsText(const CIMFlavor& flavor) {
+std::string joined(const std::vector<std::string>& words, const std::string& separator) {
   std::string text;
-  if (flavor.hasFlavor(CIMFlavor::RESTRICTED)) text += " Restricted";
-  if (flavor.hasFlavor(CIMFlavor::DISABLEOVERRIDE)) text += " DisableOverride";
-  if (flavor.hasFlavor(CIMFlavor::TRANSLATABLE)) text += " Translatable";
-  return text.empty() ? text : ":" + text;
+  for (const std::string& word : words) text += (text.empty() ? "" : separator) + word;
+  return text;
+}
+
+std::string flavorsText(const CIMFlavor& flavor, const std::string& separator) {
+  std::vector<std::string> words;
+  if (flavor.hasFlavor(CIMFlavor::RESTRICTED)) words.push_back("Restricted");
+  if (flavor.hasFlavor(CIMFlavor::DISABLEOVERRIDE)) words.push_back("DisableOverride");
+  if (flavor.hasFlavor(CIMFlavor::TRANSLATABLE)) words.push_back("Translatable");
+  return joined(words, separator);
+}
+
+// Servers' compilers do not know "schema" as a scope, and nothing in MOF files is one.
+std::string scopesText(unsigned scope) {
+  constexpr std::pair<unsigned, const char*> kScopes[] = {
+      {QualifierScope::kClass, "class"},           {QualifierScope::kAssociation, "association"},
+      {QualifierScope::kIndication, "indication"}, {QualifierScope::kProperty, "property"},
+      {QualifierScope::kReference, "reference"},   {QualifierScope::kMethod, "method"},
+      {QualifierScope::kParameter, "parameter"}};
+  std::vector<std::string> words;
+  if (scope == QualifierScope::kAny) return "any";
+  for (const auto& [bit, word] : kScopes) {
+    if ((scope & bit) != 0) words.push_back(word);
+  }
+  return joined(words, ", ");
 }
 
 std::string qualifierText(const CIMConstQualifier& qualifier) {
@@ -128,8 +151,8 @@ std::string qualifierText(const CIMConstQualifier& qualifier) {
   } else if (valueText != "TRUE") {
     text += "(" + valueText + ")";
   }
-  const std::string flavors = flavorsText(qualifier.getFlavor());
-  return flavors.empty() ? text : text + " " + flavors;
+  const std::string flavors = flavorsText(qualifier.getFlavor(), " ");
+  return flavors.empty() ? text : text + " : " + flavors;
 }
 
 // Empty without qualifiers.
@@ -226,6 +249,18 @@ std::string mofClass(const CIMClass& declaration) {
   }
   for (Uint32 i = 0; i < object.getMethodCount(); ++i) text += methodText(object.getMethod(i));
   return text + "};\n";
+}
+
+std::string mofQualifier(const QualifierDeclaration& declaration) {
+  const CIMConstQualifier qualifier(declaration.qualifier);
+  std::string text = "Qualifier ";
+  text += mofDeclarator(toUtf8(qualifier.getName().getString()) + " :",
+                        cimTypeToString(qualifier.getType()), qualifier.isArray(), 0);
+  if (!qualifier.getValue().isNull()) text += " = " + mofValue(qualifier.getValue());
+  text += ", Scope(" + scopesText(declaration.scope) + ")";
+  const std::string flavors = flavorsText(qualifier.getFlavor(), ", ");
+  if (!flavors.empty()) text += ", Flavor(" + flavors + ")";
+  return text + ";\n";
 }
 
 std::string mofDeclarator(const std::string& type, const std::string& name, bool isArray,

@@ -1,5 +1,7 @@
 #pragma once
 
+#include "cimhost/repository/QualifierTable.h"
+
 #include <Pegasus/Common/CIMClass.h>
 #include <Pegasus/Common/CIMInstance.h>
 #include <Pegasus/Common/CIMValue.h>
@@ -21,6 +23,9 @@ std::string mofInstance(const Pegasus::CIMInstance& instance);
 
 /// The class declaration with its qualifiers, and a line end.
 std::string mofClass(const Pegasus::CIMClass& declaration);
+
+/// The declaration of a qualifier, and a line end.
+std::string mofQualifier(const QualifierDeclaration& declaration);
 
 /// A property's or parameter's type and name: "uint8 Flags[3]", "Demo_Disk REF Disk".
 std::string mofDeclarator(const std::string& type, const std::string& name, bool isArray,

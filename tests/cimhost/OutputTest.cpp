@@ -310,4 +310,16 @@ TEST(MethodResult, EachFormat) {
   EXPECT_THAT(printed(OutputFormat::table, CIMValue(), {}), testing::EndsWith("(return value)\n"));
 }
 
+TEST(Mof, QualifierDeclarations) {
+  const auto text = [](const char* name) {
+    return mofQualifier(*findStandardQualifier(CIMName(name)));
+  };
+  EXPECT_EQ(text("In"),
+            "Qualifier In : boolean = TRUE, Scope(parameter), Flavor(DisableOverride);\n");
+  EXPECT_EQ(text("ValueMap"),
+            "Qualifier ValueMap : string[], Scope(property, method, parameter);\n");
+  EXPECT_EQ(text("Description"),
+            "Qualifier Description : string, Scope(any), Flavor(Translatable);\n");
+}
+
 }  // namespace

@@ -144,17 +144,6 @@ std::string echoDeclaration() {
   return text + ");\n";
 }
 
-constexpr const char* kQualifiers = R"(
-Qualifier Abstract : boolean = false, Scope(class, association, indication), Flavor(Restricted);
-Qualifier Association : boolean = false, Scope(association), Flavor(DisableOverride);
-Qualifier In : boolean = true, Scope(parameter), Flavor(DisableOverride);
-Qualifier Key : boolean = false, Scope(property, reference), Flavor(DisableOverride);
-Qualifier Out : boolean = false, Scope(parameter), Flavor(DisableOverride);
-Qualifier Override : string = null, Scope(property, reference, method), Flavor(Restricted);
-Qualifier Static : boolean = false, Scope(property, method), Flavor(DisableOverride);
-Qualifier Write : boolean = false, Scope(property, reference);
-)";
-
 constexpr const char* kMethods = R"(
   [Static] sint32 Which([In(false), Out] uint32 Index, [In(false), Out] string Name);
   [Static(false)] sint32 Die();
@@ -166,7 +155,7 @@ constexpr const char* kMethods = R"(
 }  // namespace
 
 std::string comparedDeclarations() {
-  return kQualifiers + std::string("[Abstract] class Cmp_Named {\n  [Key] string Name;\n};\n") +
+  return std::string("[Abstract] class Cmp_Named {\n  [Key] string Name;\n};\n") +
          classDeclaration("class Cmp_Part : Cmp_Named", kPart) +
          classDeclaration("class Cmp_Element : Cmp_Named", kElement, echoDeclaration() + kMethods) +
          "class Cmp_SubElement : Cmp_Element {\n};\n" +

@@ -7,7 +7,7 @@
 /// arrays, properties that clients set, methods, an abstract class above and a subclass below, and
 /// associations. The plug-in is compare.c.
 
-/// Class declarations with their qualifiers, for cimmof and for cimhost.
+/// Class declarations, for cimmof and for cimhost. They use standard qualifiers.
 std::string comparedDeclarations();
 
 /// The definition file.

@@ -25,8 +25,12 @@ std::unique_ptr<Deployment>& sharedDeployment() {
 
 Deployment& Deployment::shared() {
   std::unique_ptr<Deployment>& deployment = sharedDeployment();
+  static bool failed = false;
+  if (failed) throw std::runtime_error("there is no deployment");
   if (deployment == nullptr) {
+    failed = true;
     deployment = std::make_unique<Deployment>(CimServer::Providers::inProcess);
+    failed = false;
   }
   return *deployment;
 }
@@ -42,12 +46,19 @@ Deployment::~Deployment() {
 }
 
 void Deployment::declareAndRegister() {
-  const ProgramResult registration = cimhost({"registration"});
-  if (registration.code != 0) throw std::runtime_error(registration.err);
-  TemporaryTree::write(root_ / "registration.mof", registration.out);
+  const auto print = [this](const std::string& name, const std::vector<std::string>& command) {
+    const ProgramResult result = cimhost(command);
+    if (result.code != 0) throw std::runtime_error(result.err);
+    const fs::path file = root_ / name;
+    TemporaryTree::write(file, result.out);
+    return file.string();
+  };
+  server_->mustRun("cimmof",
+                   {"-n", "root/compare", print("qualifiers.mof", {"qualifiers", "root/compare"})});
   server_->mustRun(
       "cimmof", {"-n", "root/compare", (cimhostHome() / "mof/root/compare/compare.mof").string()});
-  server_->mustRun("cimmof", {"-n", "root/PG_InterOp", (root_ / "registration.mof").string()});
+  server_->mustRun("cimmof",
+                   {"-n", "root/PG_InterOp", print("registration.mof", {"registration"})});
 }
 
 ProgramResult Deployment::cimhost(std::vector<std::string> arguments) const {
