@@ -52,8 +52,14 @@ class Checker {
     const std::string declared = toUtf8(property.getName().getString());
     if (declared != name)
       return "declared as " + declared + ": letter case differs; it is left out";
-    if (property.findQualifier(CIMName("Key")) != PEG_NOT_FOUND) return {};
-    return "declared without [Key] or [Key(false)]; the provider delivers no instance of the class";
+    if (property.findQualifier(CIMName("Key")) == PEG_NOT_FOUND) {
+      return "declared without [Key] or [Key(false)]; "
+             "the provider delivers no instance of the class";
+    }
+    if (property.getType() == CIMTYPE_REFERENCE && !declaration.isAssociation()) {
+      return "a reference in a class that is no association; OpenPegasus refuses the declaration";
+    }
+    return {};
   }
 
   static Uint32 findProperty(const CIMClass& declaration, const std::string& name) {

@@ -166,12 +166,13 @@ TEST_F(HostTest, EveryProblemIsReportedAndTheRestServes) {
 
 TEST_F(HostTest, DefinitionsAndDeclarationsThatDoNotFitAreToldApart) {
   write("mof/root/test/classes.mof",
-        "class A { [Key] string Name; [Key(false)] string Good; string Bad; };");
+        "class A { [Key] string Name; [Key(false)] string Good; string Bad; "
+        "[Key(false)] A ref Link; };");
   std::string text =
       "<plugin><module name=\"m\" path=\"short\"></module><class name=\"A\" "
       "namespace=\"root/test\"><instances><constant type=\"int\">1</constant>"
       "</instances>";
-  for (const char* name : {"Name", "good", "Bad", "Undeclared", "1x"}) {
+  for (const char* name : {"Name", "good", "Bad", "Undeclared", "1x", "Link"}) {
     text += std::string("<property name=\"") + name +
             "\"><get><constant type=\"string\">v</constant></get></property>";
   }
@@ -185,7 +186,9 @@ TEST_F(HostTest, DefinitionsAndDeclarationsThatDoNotFitAreToldApart) {
                   "run/a.xml: warning: property Undeclared of class A is defined, but not "
                   "declared; it is left out",
                   "run/a.xml: warning: property 1x of class A is defined, but not declared; "
-                  "it is left out"));
+                  "it is left out",
+                  "run/a.xml: warning: property Link of class A is a reference in a class that is "
+                  "no association; OpenPegasus refuses the declaration"));
 }
 
 TEST_F(HostTest, PluginsThatCannotBeCalledAreToldWithoutLoadingThem) {
