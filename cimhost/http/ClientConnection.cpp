@@ -30,6 +30,24 @@ void ClientConnection::cut() {
   if (exchange_ == nullptr || !exchange_->cut("the server stops")) shutdown(socket_, SHUT_RDWR);
 }
 
+std::unique_ptr<ConnectionTable::Place> ConnectionTable::reserve(const std::string& group) {
+  const std::lock_guard<std::mutex> lock(mutex_);
+  if (reserved_ >= maximum_) return nullptr;
+  const auto entry = ofGroup_.try_emplace(group, 0).first;
+  if (entry->second >= maximumOfGroup_) return nullptr;
+  auto place = std::make_unique<Place>(*this, group);
+  ++entry->second;
+  ++reserved_;
+  return place;
+}
+
+void ConnectionTable::release(const std::string& group) {
+  const std::lock_guard<std::mutex> lock(mutex_);
+  const auto found = ofGroup_.find(group);
+  if (--found->second == 0) ofGroup_.erase(found);
+  --reserved_;
+}
+
 void ConnectionTable::add(ClientConnection* connection) {
   const std::lock_guard<std::mutex> lock(mutex_);
   connections_.insert(connection);

@@ -1,14 +1,56 @@
 #pragma once
 
 #include <chrono>
+#include <cstddef>
 #include <memory>
 #include <mutex>
 #include <string>
+#include <unordered_map>
 #include <unordered_set>
 
 namespace cimhost {
 
+class ClientConnection;
 class Exchange;
+
+/// The open connections of a server, and how many more it takes. A connection is removed before its
+/// socket is closed, so what expire() and cut() do always meets the right socket. May be used from
+/// several threads.
+class ConnectionTable {
+ public:
+  ConnectionTable(std::size_t maximum, std::size_t maximumOfGroup)
+      : maximum_(maximum), maximumOfGroup_(maximumOfGroup) {}
+
+  /// The place of a connection, from here to the end of the object.
+  class Place {
+   public:
+    Place(ConnectionTable& table, std::string group) : table_(table), group_(std::move(group)) {}
+    ~Place() { table_.release(group_); }
+    Place(const Place&) = delete;
+    Place& operator=(const Place&) = delete;
+
+   private:
+    ConnectionTable& table_;
+    std::string group_;
+  };
+
+  /// A place for a connection that comes from there, or null when it may not.
+  std::unique_ptr<Place> reserve(const std::string& group);
+  void add(ClientConnection* connection);
+  void remove(ClientConnection* connection);
+  void expire(std::chrono::steady_clock::time_point now, std::chrono::steady_clock::duration grace);
+  void cutAll();
+
+ private:
+  void release(const std::string& group);
+
+  std::size_t maximum_;
+  std::size_t maximumOfGroup_;
+  std::mutex mutex_;
+  std::unordered_set<ClientConnection*> connections_;
+  std::size_t reserved_ = 0;
+  std::unordered_map<std::string, std::size_t> ofGroup_;
+};
 
 /// One client's connection, and the request that it carries at the moment.
 ///
@@ -18,8 +60,12 @@ class ClientConnection {
  public:
   using Clock = std::chrono::steady_clock;
 
-  ClientConnection(int socket, std::string address, std::string group)
-      : socket_(socket), address_(std::move(address)), group_(std::move(group)) {}
+  ClientConnection(int socket, std::string address, std::string group,
+                   std::unique_ptr<ConnectionTable::Place> place)
+      : socket_(socket),
+        address_(std::move(address)),
+        group_(std::move(group)),
+        place_(std::move(place)) {}
 
   const std::string& address() const { return address_; }
   /// What counts as one client where failures are counted.
@@ -36,24 +82,11 @@ class ClientConnection {
   int socket_;
   std::string address_;
   std::string group_;
+  std::unique_ptr<ConnectionTable::Place> place_;
   std::mutex mutex_;
   std::shared_ptr<Exchange> exchange_;
   Clock::time_point deadline_ = Clock::time_point::max();
   bool warned_ = false;
-};
-
-/// The open connections of a server. A connection is removed before its socket is closed, so what
-/// expire() and cut() do always meets the right socket. May be used from several threads.
-class ConnectionTable {
- public:
-  void add(ClientConnection* connection);
-  void remove(ClientConnection* connection);
-  void expire(ClientConnection::Clock::time_point now, ClientConnection::Clock::duration grace);
-  void cutAll();
-
- private:
-  std::mutex mutex_;
-  std::unordered_set<ClientConnection*> connections_;
 };
 
 }  // namespace cimhost

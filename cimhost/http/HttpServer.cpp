@@ -4,11 +4,15 @@
 
 #include <gnutls/gnutls.h>
 #include <microhttpd.h>
+#include <unistd.h>
 
+#include <algorithm>
+#include <cerrno>
 #include <cstdarg>
 #include <cstdio>
 #include <filesystem>
 #include <fstream>
+#include <mutex>
 #include <sstream>
 #include <utility>
 #include <vector>
@@ -19,11 +23,15 @@ namespace {
 
 using Clock = std::chrono::steady_clock;
 
-constexpr unsigned kTransportThreads = 2;
+// Each has its connections and is run by one thread at a time.
+constexpr std::size_t kEventLoops = 2;
+constexpr std::chrono::milliseconds kLongestWait{10000};
+// Without a descriptor for another connection.
+constexpr std::chrono::milliseconds kAcceptPause{100};
 constexpr std::chrono::milliseconds kExpiryPeriod{200};
 constexpr std::size_t kReadBlock = 32U << 10U;
 // Beside request line and headers, the memory of a connection holds what is read and written.
-constexpr std::size_t kConnectionBuffers = 48U << 10U;
+constexpr std::size_t kConnectionBuffers = 16U << 10U;
 constexpr std::uintmax_t kMaximumPemSize = 1U << 20U;
 constexpr const char* kPriorities = "NORMAL:-VERS-ALL:+VERS-TLS1.3:+VERS-TLS1.2";
 
@@ -132,16 +140,74 @@ MHD_Result copyHeader(void* closure, MHD_ValueKind, const char* name, std::size_
 
 }  // namespace
 
-// What the library calls; `closure` is the server. Nothing may be thrown into it.
+// A part of the connections: those of one daemon, which one thread at a time runs.
+struct HttpServer::EventLoop {
+  struct NewConnection {
+    int socket;
+    sockaddr_storage address;
+    socklen_t size;
+    std::unique_ptr<ConnectionTable::Place> place;
+  };
+
+  EventLoop(HttpServer& itsServer, std::size_t itsIndex) : server(itsServer), index(itsIndex) {}
+  ~EventLoop() {
+    for (const NewConnection& each : arrived) close(each.socket);
+    if (daemon != nullptr) MHD_stop_daemon(daemon);
+  }
+  EventLoop(const EventLoop&) = delete;
+  EventLoop& operator=(const EventLoop&) = delete;
+
+  void add(NewConnection connection) {
+    {
+      const std::lock_guard<std::mutex> lock(mutex);
+      arrived.push_back(std::move(connection));
+    }
+    server.services_.pool.kick(index);
+  }
+
+  void run() {
+    std::vector<NewConnection> added;
+    {
+      const std::lock_guard<std::mutex> lock(mutex);
+      added.swap(arrived);
+    }
+    for (NewConnection& each : added) {
+      place = std::move(each.place);
+      // Closes the socket when it fails.
+      MHD_add_connection(daemon, each.socket, reinterpret_cast<const sockaddr*>(&each.address),
+                         each.size);
+      place.reset();
+    }
+    MHD_run(daemon);
+  }
+
+  std::chrono::milliseconds due() const {
+    MHD_UNSIGNED_LONG_LONG wait = 0;
+    const bool known = MHD_get_timeout(daemon, &wait) == MHD_YES;
+    return known ? std::min(kLongestWait, std::chrono::milliseconds(wait)) : kLongestWait;
+  }
+
+  int descriptor() const { return MHD_get_daemon_info(daemon, MHD_DAEMON_INFO_EPOLL_FD)->epoll_fd; }
+
+  HttpServer& server;
+  std::size_t index;
+  MHD_Daemon* daemon = nullptr;
+  std::mutex mutex;
+  std::vector<NewConnection> arrived;
+  std::unique_ptr<ConnectionTable::Place> place;  // Of the connection that is being added.
+};
+
+// What the library calls; `closure` is the server or an event loop of it. Nothing may be thrown
+// into it.
 struct HttpCallbacks {
   static void connectionChanged(void* closure, MHD_Connection* connection, void** context,
                                 MHD_ConnectionNotificationCode code) try {
-    HttpServer& server = *static_cast<HttpServer*>(closure);
+    HttpServer::EventLoop& loop = *static_cast<HttpServer::EventLoop*>(closure);
     if (code == MHD_CONNECTION_NOTIFY_STARTED) {
-      *context = addConnection(server, connection);
+      *context = addConnection(loop, connection);
     } else if (*context != nullptr) {
       const std::unique_ptr<ConnectionPointer> owned(static_cast<ConnectionPointer*>(*context));
-      server.connections_.remove(owned->get());
+      loop.server.connections_.remove(owned->get());
       *context = nullptr;
     }
   } catch (const std::exception&) {
@@ -149,11 +215,14 @@ struct HttpCallbacks {
   }
 
   static void* requestStarted(void* closure, const char*, MHD_Connection* connection) try {
-    HttpServer& server = *static_cast<HttpServer*>(closure);
+    const HttpServer::EventLoop& loop = *static_cast<HttpServer::EventLoop*>(closure);
+    HttpServer& server = loop.server;
     const ConnectionPointer* client = clientOf(connection);
     if (client == nullptr) return nullptr;
-    auto exchange = std::make_shared<Exchange>(server.services_, *client,
-                                               [connection] { MHD_resume_connection(connection); });
+    auto exchange = std::make_shared<Exchange>(server.services_, *client, [&loop, connection] {
+      MHD_resume_connection(connection);
+      loop.server.services_.pool.kick(loop.index);
+    });
     (*client)->begin(exchange, Clock::now() + server.services_.limits.requestTimeout);
     return new ExchangePointer(std::move(exchange));
   } catch (const std::exception&) {
@@ -203,20 +272,21 @@ struct HttpCallbacks {
   __attribute__((format(printf, 2, 0))) static void complain(void* closure, const char* format,
                                                              va_list arguments) {
     HttpServer& server = *static_cast<HttpServer*>(closure);
-    if (server.daemon_ != nullptr || server.quiet_) return;
+    if (server.started_) return;
     char text[256];
     std::vsnprintf(text, sizeof text, format, arguments);
     server.daemonProblem_ = text;
   }
 
  private:
-  static void* addConnection(HttpServer& server, MHD_Connection* connection) {
+  static void* addConnection(HttpServer::EventLoop& loop, MHD_Connection* connection) {
+    HttpServer& server = loop.server;
     const auto* address = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CLIENT_ADDRESS);
     const auto* socket = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CONNECTION_FD);
     if (address == nullptr || socket == nullptr) return nullptr;
-    auto client = std::make_unique<ConnectionPointer>(
-        std::make_shared<ClientConnection>(socket->connect_fd, addressText(*address->client_addr),
-                                           addressGroup(*address->client_addr)));
+    auto client = std::make_unique<ConnectionPointer>(std::make_shared<ClientConnection>(
+        socket->connect_fd, addressText(*address->client_addr), addressGroup(*address->client_addr),
+        std::move(loop.place)));
     (*client)->begin(nullptr, Clock::now() + server.services_.limits.idleTimeout);
     server.connections_.add(client->get());
     return client.release();
@@ -247,11 +317,12 @@ TlsFiles readTlsFiles(const std::string& certificateFile, const std::string& key
 
 HttpServer::HttpServer(const HttpSettings& settings, RequestHandler handler, RecordSink log)
     : services_(settings.limits, std::move(handler), std::move(log)),
+      connections_(settings.limits.connections, settings.limits.connectionsPerAddress),
       socket_(settings.address, settings.port),
       port_(socket_.port()),
       tls_(settings.tls) {
   services_.setUsers(settings.users);
-  start(settings);
+  startLoops();
   scheduleExpiry();
 }
 
@@ -259,18 +330,35 @@ HttpServer::~HttpServer() {
   stop();
 }
 
-void HttpServer::start(const HttpSettings& settings) {
-  unsigned flags = MHD_USE_EPOLL_INTERNAL_THREAD | MHD_ALLOW_SUSPEND_RESUME | MHD_USE_ERROR_LOG;
-  const ServeLimits& limits = settings.limits;
+void HttpServer::startLoops() {
+  std::vector<WorkerPool::Source> sources;
+  for (std::size_t i = 0; i < kEventLoops; ++i) {
+    loops_.push_back(std::make_unique<EventLoop>(*this, i));
+    EventLoop& loop = *loops_.back();
+    loop.daemon = startDaemon(loop);
+    if (loop.daemon == nullptr) {
+      throw HostError("the HTTP server cannot start: " + daemonProblem_);
+    }
+    sources.push_back({[&loop] { return loop.descriptor(); }, [&loop] { return loop.due(); },
+                       [&loop] { loop.run(); }});
+  }
+  sources.push_back({[this] { return isAccepting() ? socket_.descriptor() : -1; },
+                     [this] { return isAccepting() ? kLongestWait : kAcceptPause; },
+                     [this] { acceptConnections(); }});
+  started_ = true;
+  services_.pool.start(std::move(sources));
+}
+
+MHD_Daemon* HttpServer::startDaemon(EventLoop& loop) {
+  unsigned flags =
+      MHD_USE_EPOLL | MHD_USE_NO_LISTEN_SOCKET | MHD_ALLOW_SUSPEND_RESUME | MHD_USE_ERROR_LOG;
+  const ServeLimits& limits = services_.limits;
   const auto number = [](MHD_OPTION option, std::size_t value) {
     return MHD_OptionItem{option, static_cast<intptr_t>(value), nullptr};
   };
   std::vector<MHD_OptionItem> options = {
-      number(MHD_OPTION_LISTEN_SOCKET, static_cast<std::size_t>(socket_.descriptor())),
-      number(MHD_OPTION_THREAD_POOL_SIZE, kTransportThreads),
       number(MHD_OPTION_CONNECTION_MEMORY_LIMIT, limits.headerSize + kConnectionBuffers),
       number(MHD_OPTION_CONNECTION_LIMIT, limits.connections),
-      number(MHD_OPTION_PER_IP_CONNECTION_LIMIT, limits.connectionsPerAddress),
       number(MHD_OPTION_CONNECTION_TIMEOUT, static_cast<std::size_t>(limits.idleTimeout.count())),
   };
   if (tls_) {
@@ -280,14 +368,37 @@ void HttpServer::start(const HttpSettings& settings) {
     options.push_back({MHD_OPTION_HTTPS_PRIORITIES, 0, const_cast<char*>(kPriorities)});
   }
   options.push_back({MHD_OPTION_END, 0, nullptr});
-  daemon_ =
-      MHD_start_daemon(flags, 0, nullptr, nullptr, &HttpCallbacks::request, this,              //
-                       MHD_OPTION_EXTERNAL_LOGGER, &HttpCallbacks::complain, this,             //
-                       MHD_OPTION_NOTIFY_CONNECTION, &HttpCallbacks::connectionChanged, this,  //
-                       MHD_OPTION_URI_LOG_CALLBACK, &HttpCallbacks::requestStarted, this,      //
-                       MHD_OPTION_NOTIFY_COMPLETED, &HttpCallbacks::requestEnded, this,        //
-                       MHD_OPTION_ARRAY, options.data(), MHD_OPTION_END);
-  if (daemon_ == nullptr) throw HostError("the HTTP server cannot start: " + daemonProblem_);
+  return MHD_start_daemon(flags, 0, nullptr, nullptr, &HttpCallbacks::request, this,   //
+                          MHD_OPTION_EXTERNAL_LOGGER, &HttpCallbacks::complain, this,  //
+                          MHD_OPTION_NOTIFY_CONNECTION, &HttpCallbacks::connectionChanged,
+                          &loop,                                                               //
+                          MHD_OPTION_URI_LOG_CALLBACK, &HttpCallbacks::requestStarted, &loop,  //
+                          MHD_OPTION_NOTIFY_COMPLETED, &HttpCallbacks::requestEnded, this,     //
+                          MHD_OPTION_ARRAY, options.data(), MHD_OPTION_END);
+}
+
+bool HttpServer::isAccepting() const {
+  return !services_.draining && Clock::now() >= acceptAgain_;
+}
+
+void HttpServer::acceptConnections() {
+  while (isAccepting()) {
+    EventLoop::NewConnection connection{};
+    connection.size = sizeof connection.address;
+    auto* const address = reinterpret_cast<sockaddr*>(&connection.address);
+    connection.socket = socket_.accept(address, connection.size);
+    if (connection.socket < 0) {
+      const bool none = errno == EAGAIN || errno == EWOULDBLOCK;
+      if (!none) acceptAgain_ = Clock::now() + kAcceptPause;
+      return;
+    }
+    connection.place = connections_.reserve(addressGroup(*address));
+    if (connection.place != nullptr) {
+      loops_[nextLoop_++ % loops_.size()]->add(std::move(connection));
+    } else {
+      close(connection.socket);
+    }
+  }
 }
 
 void HttpServer::scheduleExpiry() {
@@ -298,11 +409,8 @@ void HttpServer::scheduleExpiry() {
 }
 
 void HttpServer::drain() {
-  services_.draining = true;
-  if (!std::exchange(quiet_, true)) {
-    MHD_quiesce_daemon(daemon_);
-    socket_.close();
-  }
+  if (services_.draining.exchange(true)) return;
+  socket_.refuse();
 }
 
 bool HttpServer::waitUntilIdle(std::chrono::milliseconds time) {
@@ -311,13 +419,12 @@ bool HttpServer::waitUntilIdle(std::chrono::milliseconds time) {
 }
 
 void HttpServer::stop() {
-  if (daemon_ == nullptr) return;
   drain();
-  // Nothing may be suspended when the daemon stops, and no request is from now on.
-  connections_.cutAll();
-  MHD_stop_daemon(std::exchange(daemon_, nullptr));
+  cut();
   services_.pool.stop();
   services_.housekeeper.stop();
+  // Nothing may be suspended when a daemon stops: no request is from cut() on.
+  loops_.clear();
 }
 
 }  // namespace cimhost

@@ -9,6 +9,7 @@
 #include <cstdint>
 #include <memory>
 #include <string>
+#include <vector>
 
 struct MHD_Daemon;
 
@@ -64,7 +65,12 @@ class HttpServer {
  private:
   friend struct HttpCallbacks;
 
-  void start(const HttpSettings& settings);
+  struct EventLoop;
+
+  void startLoops();
+  MHD_Daemon* startDaemon(EventLoop& loop);
+  bool isAccepting() const;
+  void acceptConnections();
   void scheduleExpiry();
 
   ExchangeServices services_;
@@ -72,9 +78,12 @@ class HttpServer {
   ListenSocket socket_;
   std::uint16_t port_;
   std::optional<TlsFiles> tls_;
-  MHD_Daemon* daemon_ = nullptr;
+  std::vector<std::unique_ptr<EventLoop>> loops_;
+  // Of the thread that accepts.
+  std::size_t nextLoop_ = 0;
+  std::chrono::steady_clock::time_point acceptAgain_{};
   std::string daemonProblem_;
-  bool quiet_ = false;
+  bool started_ = false;
 };
 
 }  // namespace cimhost

@@ -5,13 +5,11 @@
 #include <arpa/inet.h>
 #include <netdb.h>
 #include <netinet/in.h>
-#include <sys/socket.h>
 #include <unistd.h>
 
 #include <cerrno>
 #include <cstring>
 #include <memory>
-#include <utility>
 
 namespace cimhost {
 
@@ -53,12 +51,12 @@ ListenSocket::ListenSocket(const std::string& address, std::uint16_t port) {
   descriptor_ = socket(found->ai_family, SOCK_STREAM | SOCK_CLOEXEC | SOCK_NONBLOCK, 0);
   if (openOn(descriptor_, *found)) return;
   const std::string problem = std::strerror(errno);
-  close();
+  if (descriptor_ >= 0) close(descriptor_);
   throw HostError("cannot listen on " + address + " port " + std::to_string(port) + ": " + problem);
 }
 
 ListenSocket::~ListenSocket() {
-  close();
+  close(descriptor_);
 }
 
 std::uint16_t ListenSocket::port() const {
@@ -70,8 +68,16 @@ std::uint16_t ListenSocket::port() const {
                    : reinterpret_cast<const sockaddr_in&>(address).sin_port);
 }
 
-void ListenSocket::close() {
-  if (descriptor_ >= 0) ::close(std::exchange(descriptor_, -1));
+int ListenSocket::accept(sockaddr* address, socklen_t& size) const {
+  int accepted = -1;
+  do {
+    accepted = accept4(descriptor_, address, &size, SOCK_CLOEXEC | SOCK_NONBLOCK);
+  } while (accepted < 0 && (errno == EINTR || errno == ECONNABORTED));
+  return accepted;
+}
+
+void ListenSocket::refuse() {
+  shutdown(descriptor_, SHUT_RDWR);
 }
 
 std::string addressText(const sockaddr& address) {

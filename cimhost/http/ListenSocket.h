@@ -1,9 +1,9 @@
 #pragma once
 
+#include <sys/socket.h>
+
 #include <cstdint>
 #include <string>
-
-struct sockaddr;
 
 namespace cimhost {
 
@@ -18,8 +18,10 @@ class ListenSocket {
 
   int descriptor() const { return descriptor_; }
   std::uint16_t port() const;
-  /// New connections are refused from now on.
-  void close();
+  /// The next connection, not blocking, or -1 when there is none. `size`: as of accept(2).
+  int accept(sockaddr* address, socklen_t& size) const;
+  /// New connections are refused from now on. Any thread.
+  void refuse();
 
  private:
   int descriptor_;
