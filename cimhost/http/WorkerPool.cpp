@@ -87,6 +87,8 @@ void WorkerPool::stop() {
 void WorkerPool::work() {
   Lock lock(mutex_);
   while (!stopped_) {
+    // Whoever is going to be busy leaves a spare one behind.
+    if (!hasStandby_ && resting_ > 0) rest_.notify_one();
     if (hasTask()) {
       runTask(lock);
     } else if (Watched* source = unwatched()) {
@@ -152,8 +154,6 @@ void WorkerPool::rest(Lock& lock) {
   hasStandby_ = true;
   standBy(lock);
   hasStandby_ = false;
-  // Somebody else becomes the spare one.
-  if (resting_ > 0) rest_.notify_one();
 }
 
 void WorkerPool::standBy(Lock& lock) {

@@ -191,6 +191,26 @@ TEST_F(HttpServerTest, MoreRequestsThanMayWaitAreTurnedAway) {
   EXPECT_EQ((replies[0].status == 503 ? replies[0] : replies[1]).header("Retry-After"), "1");
 }
 
+TEST_F(HttpServerTest, RequestsThatHangHoldNoOthersUp) {
+  settings.limits.threads = 4;
+  start();
+  // Each hangs in the middle of what its connection's thread had to do.
+  std::vector<std::unique_ptr<HttpClient>> hanging;
+  for (int i = 0; i < 3; ++i) {
+    hanging.push_back(std::make_unique<HttpClient>(port()));
+    hanging.back()->send(post("wait"));
+    waitForCalls(i + 1);
+  }
+  std::vector<std::unique_ptr<HttpClient>> others;
+  for (int i = 0; i < 4; ++i) {
+    others.push_back(std::make_unique<HttpClient>(port()));
+    EXPECT_EQ(others.back()->ask(post("x")).body, ":x");
+    EXPECT_EQ(others.front()->ask(post("size=1000000")).body.size(), 1000000U);
+  }
+  go.open();
+  for (const auto& each : hanging) EXPECT_EQ(each->receive().body, ":wait");
+}
+
 TEST_F(HttpServerTest, SilentConnectionsAreClosed) {
   settings.limits.idleTimeout = std::chrono::seconds(1);
   start();
