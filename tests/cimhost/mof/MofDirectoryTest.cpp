@@ -6,7 +6,7 @@ namespace cimhost_test {
 namespace {
 
 TEST(MofDirectory, FoldersNameTheNamespaces) {
-  const TemporaryTree tree;
+  const MofTree tree;
   tree.write("top.mof", "class Top {};");
   tree.write("root/host/a.mof", "class A {};");
   tree.write("root/host/notes.txt", "not MOF");
@@ -18,7 +18,7 @@ TEST(MofDirectory, FoldersNameTheNamespaces) {
 
 // Each file stops at what it lacks and goes on later, also when two need each other in turn.
 TEST(MofDirectory, OrderOfFilesDoesNotMatter) {
-  const TemporaryTree tree;
+  const MofTree tree;
   tree.write("a.mof", "class A1 {}; class A2 : b1 {}; class A3 : B2 {};");
   tree.write("b.mof", "class B1 : A1 {}; class B2 : A2 {};");
   tree.write("c.mof", "class C { [Mine] uint8 P; };");
@@ -32,7 +32,7 @@ TEST(MofDirectory, OrderOfFilesDoesNotMatter) {
 }
 
 TEST(MofDirectory, LongChainsInReverseOrder) {
-  const TemporaryTree tree;
+  const MofTree tree;
   for (int i = 0; i < 500; ++i) {
     const std::string name = std::to_string(1000 + i);
     tree.write(name + ".mof", "class C" + name + " : C" + std::to_string(1001 + i) + " {};");
@@ -44,7 +44,7 @@ TEST(MofDirectory, LongChainsInReverseOrder) {
 }
 
 TEST(MofDirectory, EachFileHasItsOwnDiagnosticInOrder) {
-  const TemporaryTree tree;
+  const MofTree tree;
   tree.write("a.mof", "class A : Never {};\nclass B {};");
   tree.write("b.mof", "class C { uint9 x; };");
   tree.write("bad-name/c.mof", "class D {};");
@@ -69,7 +69,7 @@ TEST(MofDirectory, EachFileHasItsOwnDiagnosticInOrder) {
 }
 
 TEST(MofDirectory, FolderThatCannotBeReadIsADiagnostic) {
-  const TemporaryTree tree;
+  const MofTree tree;
   tree.write("a.mof", "");
   Mof mof;
   EXPECT_FALSE(mof.reader.readDirectory(tree.path("none"), kNamespace));

@@ -2,12 +2,10 @@
 
 #include "cimhost/mof/MofReader.h"
 #include "tests/cimhost/repository/ClassText.h"
+#include "tests/support/TemporaryTree.h"
 
 #include <gtest/gtest.h>
 
-#include <cstdlib>
-#include <filesystem>
-#include <fstream>
 #include <string>
 
 namespace cimhost_test {
@@ -47,29 +45,20 @@ struct Mof {
   }
 };
 
-/// A directory that lives as long as the object.
-class TemporaryTree {
+/// A directory for MOF files.
+class MofTree {
  public:
-  TemporaryTree() {
-    std::string pattern = (std::filesystem::temp_directory_path() / "mofXXXXXX").string();
-    if (mkdtemp(pattern.data()) == nullptr) throw std::runtime_error("mkdtemp");
-    root_ = pattern;
-  }
-  ~TemporaryTree() { std::filesystem::remove_all(root_); }
-  TemporaryTree(const TemporaryTree&) = delete;
-  TemporaryTree& operator=(const TemporaryTree&) = delete;
+  MofTree() { std::filesystem::create_directory(path()); }
 
   std::string path(const std::string& relative = "") const {
-    return relative.empty() ? root_.string() : (root_ / relative).string();
+    return (tree_.root() / "mof" / relative).lexically_normal().string();
   }
-
   void write(const std::string& relative, const std::string& content) const {
-    std::filesystem::create_directories((root_ / relative).parent_path());
-    std::ofstream(root_ / relative, std::ios::binary) << content;
+    TemporaryTree::write(path(relative), content);
   }
 
  private:
-  std::filesystem::path root_;
+  TemporaryTree tree_;
 };
 
 }  // namespace cimhost_test

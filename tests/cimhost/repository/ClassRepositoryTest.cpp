@@ -29,149 +29,94 @@ std::string errorOf(Action action) {
   return "none";
 }
 
-template <class Case>
-std::string caseName(const testing::TestParamInfo<Case>& test) {
-  return test.param.name;
+// What a class looks like at the end of a chain of declarations.
+TEST(ClassRepository, Inheritance) {
+  const struct {
+    const char* mof;
+    const char* cimClass;
+    const char* expected;
+  } cases[] = {
+      // Inherited features first, then the class's own.
+      {"class A { uint8 A1; uint8 A2 = 5; }; class B : a { uint8 B1; }; class C : B { uint8 C1; };",
+       "C", "C : B\nuint8 A1 (A^)\nuint8 A2 = 5 (A^)\nuint8 B1 (B^)\nuint8 C1 (C)\n"},
+      // An overriding feature stands where it is declared, with the old origin.
+      {"class A { uint8 X = 1; uint8 Y; uint8 Z; };"
+       "class B : A { uint8 N; uint8 y = 3; uint8 X; };",
+       "B", "B : A\nuint8 Z (A^)\nuint8 N (B)\nuint8 y = 3 (A)\nuint8 X (A)\n"},
+      {"class A { uint8 X; }; class B : A { uint8 X = 1; };"
+       "class C : B { uint8 X = 2; }; class D : C {};",
+       "D", "D : C\nuint8 X = 2 (A^)\n"},
+      {"class A { uint8 M([In] string s); uint8 N(); };"
+       "class B : A { uint8 O(); uint8 m([Out] string S, uint8 t); }; class C : B {};",
+       "C",
+       "C : B\nuint8 N() (A^)\nuint8 O() (B^)\n"
+       "uint8 m([Out^=TRUE In^=TRUE] string S, uint8 t) (A^)\n"},
+      {"class A { A REF P; }; class B : A { B REF P; };", "B", "B : A\nreference to B P (A)\n"},
+      // Restricted qualifiers stay behind.
+      {"[Abstract, Description(\"d\"), Version(\"1\"), Deprecated {\"x\"}] class A {"
+       " [Experimental, Key] uint8 K; [Deprecated] uint8 M([Experimental, In] uint8 p); };"
+       "class B : A {};",
+       "B", "[Description^=d] B : A\n[Key^=TRUE] uint8 K (A^)\nuint8 M([In^=TRUE] uint8 p) (A^)\n"},
+      // An overriding feature keeps the qualifiers that it does not give.
+      {"class A { [Key, Description(\"a\"), MaxLen(3)] string K; };"
+       "class B : A { [Override(\"A.k\"), MaxLen(5)] string K; };"
+       "class C : B { [Description(\"c\")] string K; };",
+       "C", "C : B\n[Description=c MaxLen^=5 Key^=TRUE] string K (A)\n"},
+      // A fixed value may be repeated.
+      {"[Association] class A { [Key] A REF K; };"
+       "[Association(true)] class B : A { [Key(TRUE)] A REF K; };",
+       "B", "[Association=TRUE] B : A\n[Key=TRUE] reference to A K (A)\n"},
+      // That a class is an association is inherited, for scopes too.
+      {"[Association] class A {}; [Aggregation] class B : A {};", "B",
+       "[Aggregation=TRUE Association^=TRUE] B : A\n"},
+      {"class A { [Key(false)] uint8 P; uint8 Q; };", "A",
+       "A\n[Key=FALSE] uint8 P (A)\nuint8 Q (A)\n"},
+  };
+  for (const auto& row : cases) {
+    Mof mof;
+    mof.read(row.mof);
+    EXPECT_EQ(mof.classAsText(row.cimClass), row.expected);
+  }
 }
-
-/// What a class looks like at the end of a chain of declarations.
-struct InheritanceCase {
-  const char* name;
-  const char* mof;
-  const char* cimClass;
-  const char* expected;
-};
-
-class Inheritance : public testing::TestWithParam<InheritanceCase> {};
-
-TEST_P(Inheritance, Resolves) {
-  Mof mof;
-  mof.read(GetParam().mof);
-  EXPECT_EQ(mof.classAsText(GetParam().cimClass), GetParam().expected);
-}
-
-INSTANTIATE_TEST_SUITE_P(
-    Features, Inheritance,
-    testing::Values(
-        InheritanceCase{"InheritedFirstThenOwn",
-                        "class A { uint8 A1; uint8 A2 = 5; }; class B : a { uint8 B1; };"
-                        "class C : B { uint8 C1; };",
-                        "C",
-                        "C : B\nuint8 A1 (A^)\nuint8 A2 = 5 (A^)\nuint8 B1 (B^)\nuint8 C1 (C)\n"},
-        InheritanceCase{"OverriddenAtItsPlaceWithTheOldOrigin",
-                        "class A { uint8 X = 1; uint8 Y; uint8 Z; };"
-                        "class B : A { uint8 N; uint8 y = 3; uint8 X; };",
-                        "B", "B : A\nuint8 Z (A^)\nuint8 N (B)\nuint8 y = 3 (A)\nuint8 X (A)\n"},
-        InheritanceCase{"OverriddenTwiceAndInherited",
-                        "class A { uint8 X; }; class B : A { uint8 X = 1; };"
-                        "class C : B { uint8 X = 2; }; class D : C {};",
-                        "D", "D : C\nuint8 X = 2 (A^)\n"},
-        InheritanceCase{"Methods",
-                        "class A { uint8 M([In] string s); uint8 N(); };"
-                        "class B : A { uint8 O(); uint8 m([Out] string S, uint8 t); };"
-                        "class C : B {};",
-                        "C",
-                        "C : B\nuint8 N() (A^)\nuint8 O() (B^)\n"
-                        "uint8 m([Out^=TRUE In^=TRUE] string S, uint8 t) (A^)\n"},
-        InheritanceCase{"References", "class A { A REF P; }; class B : A { B REF P; };", "B",
-                        "B : A\nreference to B P (A)\n"}),
-    caseName<InheritanceCase>);
-
-INSTANTIATE_TEST_SUITE_P(
-    Qualifiers, Inheritance,
-    testing::Values(
-        InheritanceCase{
-            "RestrictedStay",
-            "[Abstract, Description(\"d\"), Version(\"1\"), Deprecated {\"x\"}] class A {"
-            " [Experimental, Key] uint8 K; [Deprecated] uint8 M([Experimental, In] uint8 "
-            "p); };"
-            "class B : A {};",
-            "B",
-            "[Description^=d] B : A\n[Key^=TRUE] uint8 K (A^)\n"
-            "uint8 M([In^=TRUE] uint8 p) (A^)\n"},
-        InheritanceCase{"OverridingFeatureKeepsTheOthers",
-                        "class A { [Key, Description(\"a\"), MaxLen(3)] string K; };"
-                        "class B : A { [Override(\"A.k\"), MaxLen(5)] string K; };"
-                        "class C : B { [Description(\"c\")] string K; };",
-                        "C", "C : B\n[Description=c MaxLen^=5 Key^=TRUE] string K (A)\n"},
-        InheritanceCase{"SameFixedValueMayBeRepeated",
-                        "[Association] class A { [Key] A REF K; };"
-                        "[Association(true)] class B : A { [Key(TRUE)] A REF K; };",
-                        "B", "[Association=TRUE] B : A\n[Key=TRUE] reference to A K (A)\n"},
-        InheritanceCase{"AssociationScopeIsInherited",
-                        "[Association] class A {}; [Aggregation] class B : A {};", "B",
-                        "[Aggregation=TRUE Association^=TRUE] B : A\n"},
-        InheritanceCase{"FalseKeyIsNoKey", "class A { [Key(false)] uint8 P; uint8 Q; };", "A",
-                        "A\n[Key=FALSE] uint8 P (A)\nuint8 Q (A)\n"}),
-    caseName<InheritanceCase>);
 
 const char* const kModel =
     "[Description(\"a\")] class A { [Key] uint8 K; uint8 P; uint8 M([In] uint8 p); };\n"
     "class B : A { [Write] uint8 Q; uint8 p; [Static] uint8 N(); };\n";
 
-struct Filter {
-  const char* name;
-  bool localOnly, qualifiers, origins;
-  std::vector<const char*> list;  // {"*"}: the null list.
-  const char* expected;
-};
-
-class GetClass : public testing::TestWithParam<Filter> {};
-
-TEST_P(GetClass, Filters) {
-  Mof mof;
-  ASSERT_TRUE(mof.read(kModel));
-  Array<CIMName> listed;
-  for (const char* name : GetParam().list) {
-    if (*name != '*') listed.append(CIMName(name));
-  }
-  const bool all = !GetParam().list.empty() && *GetParam().list[0] == '*';
-  const CIMPropertyList list = all ? CIMPropertyList() : CIMPropertyList(listed);
-  const CIMClass b = mof.repository.getClass("Root/Test", "b", GetParam().localOnly,
-                                             GetParam().qualifiers, GetParam().origins, list);
-  EXPECT_EQ(classText(b), GetParam().expected);
+CIMPropertyList listOf(std::initializer_list<const char*> names) {
+  Array<CIMName> list;
+  for (const char* name : names) list.append(CIMName(name));
+  return CIMPropertyList(list);
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    Flags, GetClass,
-    testing::Values(
-        Filter{"Everything",
-               false,
-               true,
-               true,
-               {"*"},
-               "[Description^=a] B : A\n[Key^=TRUE] uint8 K (A^)\n[Write=TRUE] uint8 Q (B)\n"
-               "uint8 p (A)\nuint8 M([In^=TRUE] uint8 p) (A^)\n[Static=TRUE] uint8 N() (B)\n"},
-        Filter{"LocalOnly",
-               true,
-               true,
-               true,
-               {"*"},
-               "[Description^=a] B : A\n[Write=TRUE] uint8 Q (B)\nuint8 p (A)\n"
-               "[Static=TRUE] uint8 N() (B)\n"},
-        Filter{"NoQualifiers",
-               false,
-               false,
-               true,
-               {"*"},
-               "B : A\nuint8 K (A^)\nuint8 Q (B)\nuint8 p (A)\nuint8 M(uint8 p) (A^)\n"
-               "uint8 N() (B)\n"},
-        Filter{"NoOrigins",
-               true,
-               false,
-               false,
-               {"*"},
-               "B : A\nuint8 Q ()\nuint8 p ()\nuint8 N() ()\n"},
-        Filter{"Listed",
-               false,
-               false,
-               true,
-               {"P", "k", "Other"},
-               "B : A\nuint8 K (A^)\nuint8 p (A)\nuint8 M(uint8 p) (A^)\nuint8 N() (B)\n"},
-        Filter{
-            "ListedAndLocal", true, false, true, {"P", "k"}, "B : A\nuint8 p (A)\nuint8 N() (B)\n"},
-        Filter{"EmptyList", true, false, true, {}, "B : A\nuint8 N() (B)\n"}),
-    caseName<Filter>);
+TEST(ClassRepository, Filters) {
+  const struct {
+    bool localOnly, qualifiers, origins;
+    CIMPropertyList list;
+    const char* expected;
+  } cases[] = {
+      {false, true, true, CIMPropertyList(),
+       "[Description^=a] B : A\n[Key^=TRUE] uint8 K (A^)\n[Write=TRUE] uint8 Q (B)\n"
+       "uint8 p (A)\nuint8 M([In^=TRUE] uint8 p) (A^)\n[Static=TRUE] uint8 N() (B)\n"},
+      {true, true, true, CIMPropertyList(),
+       "[Description^=a] B : A\n[Write=TRUE] uint8 Q (B)\nuint8 p (A)\n"
+       "[Static=TRUE] uint8 N() (B)\n"},
+      {false, false, true, CIMPropertyList(),
+       "B : A\nuint8 K (A^)\nuint8 Q (B)\nuint8 p (A)\nuint8 M(uint8 p) (A^)\nuint8 N() (B)\n"},
+      {true, false, false, CIMPropertyList(), "B : A\nuint8 Q ()\nuint8 p ()\nuint8 N() ()\n"},
+      {false, false, true, listOf({"P", "k", "Other"}),
+       "B : A\nuint8 K (A^)\nuint8 p (A)\nuint8 M(uint8 p) (A^)\nuint8 N() (B)\n"},
+      {true, false, true, listOf({"P", "k"}), "B : A\nuint8 p (A)\nuint8 N() (B)\n"},
+      {true, false, true, listOf({}), "B : A\nuint8 N() (B)\n"},
+  };
+  Mof mof;
+  ASSERT_TRUE(mof.read(kModel));
+  for (const auto& row : cases) {
+    EXPECT_EQ(classText(mof.repository.getClass("Root/Test", "b", row.localOnly, row.qualifiers,
+                                                row.origins, row.list)),
+              row.expected);
+  }
+}
 
 TEST(ClassRepository, EveryFetchedClassIsAnother) {
   Mof mof;

@@ -26,14 +26,14 @@ std::string Reply::result() const {
   if (start == std::string::npos) return body;
   std::string text;
   for (const char each : body.substr(start, end - start)) {
-    if (each != '\n') text += each;
+    if (each != '\n') text += each == '"' ? '\'' : each;
   }
   return text.substr(text.find('>') + 1);
 }
 
 std::string inMessage(const std::string& call) {
-  return "<?xml version=\"1.0\" encoding=\"utf-8\" ?>\n"
-         "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><MESSAGE ID=\"42\" PROTOCOLVERSION=\"1.0\">"
+  return "<?xml version='1.0' encoding='utf-8' ?>\n"
+         "<CIM CIMVERSION='2.0' DTDVERSION='2.0'><MESSAGE ID='42' PROTOCOLVERSION='1.0'>"
          "<SIMPLEREQ>" +
          call + "</SIMPLEREQ></MESSAGE></CIM>\n";
 }
@@ -41,7 +41,7 @@ std::string inMessage(const std::string& call) {
 namespace {
 
 constexpr const char* kNamespacePath =
-    "<LOCALNAMESPACEPATH><NAMESPACE NAME=\"root\"/><NAMESPACE NAME=\"test\"/></LOCALNAMESPACEPATH>";
+    "<LOCALNAMESPACEPATH><NAMESPACE NAME='root'/><NAMESPACE NAME='test'/></LOCALNAMESPACEPATH>";
 
 Request makeRequest(const std::string& method, const std::string& object, const std::string& call) {
   Request request;
@@ -53,24 +53,30 @@ Request makeRequest(const std::string& method, const std::string& object, const 
   return request;
 }
 
-std::string parameter(const std::string& name, const std::string& element) {
-  return "<IPARAMVALUE NAME=\"" + name + "\">" + element + "</IPARAMVALUE>";
-}
-
 }  // namespace
 
 Request intrinsic(const std::string& operation, const std::string& parameters) {
   return makeRequest(
       operation, "root%2Ftest",
-      "<IMETHODCALL NAME=\"" + operation + "\">" + kNamespacePath + parameters + "</IMETHODCALL>");
+      "<IMETHODCALL NAME='" + operation + "'>" + kNamespacePath + parameters + "</IMETHODCALL>");
 }
 
-Request extrinsic(const std::string& method, const std::string& parameters) {
-  return makeRequest(method, "root%2Ftest%3ATest_Disk.Name=\"a\"",
-                     "<METHODCALL NAME=\"" + method + "\"><LOCALINSTANCEPATH>" + kNamespacePath +
-                         "<INSTANCENAME CLASSNAME=\"Test_Disk\"><KEYBINDING NAME=\"Name\">"
-                         "<KEYVALUE>a</KEYVALUE></KEYBINDING></INSTANCENAME></LOCALINSTANCEPATH>" +
-                         parameters + "</METHODCALL>");
+Request extrinsic(const std::string& method, const std::string& parameters,
+                  const std::string& className) {
+  return makeRequest(method, "root%2Ftest%3A" + className + ".Name=\"a\"",
+                     "<METHODCALL NAME='" + method + "'><LOCALINSTANCEPATH>" + kNamespacePath +
+                         instanceElement(className, "a") + "</LOCALINSTANCEPATH>" + parameters +
+                         "</METHODCALL>");
+}
+
+std::string instanceElement(const std::string& className, const std::string& key) {
+  return "<INSTANCENAME CLASSNAME='" + className +
+         "'><KEYBINDING NAME='Name'><KEYVALUE VALUETYPE='string'>" + key +
+         "</KEYVALUE></KEYBINDING></INSTANCENAME>";
+}
+
+std::string parameter(const std::string& name, const std::string& element) {
+  return "<IPARAMVALUE NAME='" + name + "'>" + element + "</IPARAMVALUE>";
 }
 
 std::string value(const std::string& name, const std::string& text) {
@@ -78,14 +84,12 @@ std::string value(const std::string& name, const std::string& text) {
 }
 
 std::string className(const std::string& name, const std::string& text) {
-  return parameter(name, "<CLASSNAME NAME=\"" + text + "\"/>");
+  return parameter(name, "<CLASSNAME NAME='" + text + "'/>");
 }
 
 std::string instanceName(const std::string& name, const std::string& className,
                          const std::string& key) {
-  return parameter(name, "<INSTANCENAME CLASSNAME=\"" + className +
-                             "\"><KEYBINDING NAME=\"Name\"><KEYVALUE VALUETYPE=\"string\">" + key +
-                             "</KEYVALUE></KEYBINDING></INSTANCENAME>");
+  return parameter(name, instanceElement(className, key));
 }
 
 Reply CimXmlTest::answer(const Request& request, std::size_t readsPieces) {
@@ -98,10 +102,6 @@ Reply CimXmlTest::answer(const Request& request, std::size_t readsPieces) {
 
 std::string CimXmlTest::ask(const std::string& operation, const std::string& parameters) {
   return answer(intrinsic(operation, parameters)).result();
-}
-
-std::string CimXmlTest::invoke(const std::string& method, const std::string& parameters) {
-  return answer(extrinsic(method, parameters)).result();
 }
 
 }  // namespace cimhost::test

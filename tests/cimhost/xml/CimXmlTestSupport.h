@@ -35,7 +35,8 @@ struct Reply : ReplyStream {
   bool write(std::string_view bytes) override;
   void abort() override { aborted = true; }
 
-  /// What stands in the response element, without line ends: results or ERROR.
+  /// What stands in the response element, results or ERROR, without line ends and with ' for ":
+  /// so expectations need no escapes. A whole reply is compared once, as it is.
   std::string result() const;
 };
 
@@ -45,13 +46,18 @@ std::string inMessage(const std::string& call);
 /// An operation on root/test with the headers that belong to it.
 Request intrinsic(const std::string& operation, const std::string& parameters);
 
-/// A method of Test_Disk.Name="a".
-Request extrinsic(const std::string& method, const std::string& parameters);
+/// A method of the object with the string key Name="a" of a class.
+Request extrinsic(const std::string& method, const std::string& parameters,
+                  const std::string& className = "Test_Disk");
 
-/// <IPARAMVALUE> with a VALUE, a CLASSNAME, or an INSTANCENAME with the string key Name.
+/// <INSTANCENAME> with the string key Name.
+std::string instanceElement(const std::string& className, const std::string& key);
+
+/// <IPARAMVALUE> with any element, a VALUE, a CLASSNAME, or an INSTANCENAME as above.
+std::string parameter(const std::string& name, const std::string& element);
 std::string value(const std::string& name, const std::string& text);
 std::string className(const std::string& name, const std::string& text);
-std::string instanceName(const std::string& parameter, const std::string& className,
+std::string instanceName(const std::string& name, const std::string& className,
                          const std::string& key);
 
 /// The test provider's classes behind the service.
@@ -60,7 +66,6 @@ class CimXmlTest : public testing::Test {
   Reply answer(const Request& request, std::size_t readsPieces = 1000);
   /// The result of an operation.
   std::string ask(const std::string& operation, const std::string& parameters);
-  std::string invoke(const std::string& method, const std::string& parameters);
 
   TestHost host;
   CimXmlService service{host.operations, host.repository};

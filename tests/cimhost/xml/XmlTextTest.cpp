@@ -53,19 +53,6 @@ TEST(XmlText, LongTextsAreWhole) {
   EXPECT_EQ(out.view(), "<" + expected);
 }
 
-TEST(XmlText, KeysThatAreNoPathsAreTexts) {
-  CIMObjectPath path(String(), CIMNamespaceName(), CIMName("A"));
-  Array<CIMKeyBinding> keys;
-  keys.append(CIMKeyBinding(CIMName("k"), CIMValue(CIMObjectPath("B.x=1"))));
-  path.setKeyBindings(keys);
-  XmlBuffer out;
-  appendInstanceName(out, path);
-  EXPECT_EQ(out.view(),
-            "<INSTANCENAME CLASSNAME=\"A\"><KEYBINDING NAME=\"k\"><VALUE.REFERENCE><INSTANCENAME "
-            "CLASSNAME=\"B\"><KEYBINDING NAME=\"x\"><KEYVALUE VALUETYPE=\"numeric\">1</KEYVALUE>"
-            "</KEYBINDING></INSTANCENAME></VALUE.REFERENCE></KEYBINDING></INSTANCENAME>");
-}
-
 // A chain of instances that refer to each other does not exhaust the stack.
 TEST(XmlText, EmbeddedInstancesAreCutOff) {
   CIMInstance inner(CIMName("A"));
