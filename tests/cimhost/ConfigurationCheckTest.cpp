@@ -33,11 +33,9 @@ TEST(ConfigurationCheck, ProblemsPointAtTheCharacter) {
 }
 
 TEST(ConfigurationCheck, AFloodOfProblemsIsBounded) {
-  std::istringstream stream(std::string(100000, '\n') + std::string(5000, 'x') + "\n" + [] {
-    std::string lines;
-    for (int i = 0; i < 5000; ++i) lines += "x\n";
-    return lines;
-  }());
+  std::string text = std::string(100000, '\n') + std::string(5000, 'x') + "\n";
+  for (int i = 0; i < 5000; ++i) text += "x\n";
+  std::istringstream stream(text);
   EXPECT_EQ(cimhost::checkConfiguration(stream, "c.ini").size(), 100u);
 }
 

@@ -21,46 +21,40 @@ TEST(PathArgument, WellFormedPaths) {
   EXPECT_FALSE(parseNamespaceOrClass("root/host:A").getClassName().isNull());
 }
 
-struct MalformedCase {
-  const char* name;
-  Pegasus::CIMObjectPath (*parse)(const std::string&);
-  const char* text;
-  int column;
-  const char* reason;
-};
-
-class Malformed : public testing::TestWithParam<MalformedCase> {};
-
-TEST_P(Malformed, IsReportedWithItsColumn) {
-  try {
-    GetParam().parse(GetParam().text);
-    FAIL() << "accepted";
-  } catch (const PathArgumentError& error) {
-    EXPECT_EQ(error.column(), GetParam().column);
-    EXPECT_THAT(error.what(), HasSubstr(GetParam().reason));
+TEST(PathArgument, MalformedOnesAreReportedWithTheirColumn) {
+  const struct {
+    Pegasus::CIMObjectPath (*parse)(const std::string&);
+    const char* text;
+    int column;
+    const char* reason;
+  } cases[] = {
+      {parseInstancePath, "root:A.a=1,b=\"x", 12, "missing quote"},
+      {parseInstancePath, "root:A.a=", 8, "invalid number"},
+      {parseInstancePath, "root:A.a=\"x,y\",b", 16, "equal sign"},
+      {parseInstancePath, "root:1A.a=1", 6, "class name 1A"},
+      {parseInstancePath, "root:A", 7, "no keys"},
+      {parseInstancePath, "A.k=\"x:y\"", 1, "no namespace"},  // the colon is the value's
+      {parseClassPath, "ro ot:A", 1, "namespace"},
+      {parseClassPath, "A", 1, "no namespace"},
+      {parseClassPath, "//h/root:A", 1, "host"},
+      {parseClassPath, "root:A.a=1", 7, "no keys"},
+      {parseClassPath, "", 1, "no namespace"},
+      {parseClassPath, "root:", 6, "class name"},
+      {parseClassPath, "root:\x1b[2J", 6, "class name \\x1b[2J"},
+      {parseClassPath, "root:\xff", 6, "UTF-8"},
+      {parseNamespaceOrClass, "", 1, "namespace"},
+  };
+  for (const auto& row : cases) {
+    SCOPED_TRACE(row.text);
+    try {
+      row.parse(row.text);
+      ADD_FAILURE() << "accepted";
+    } catch (const PathArgumentError& error) {
+      EXPECT_EQ(error.column(), row.column);
+      EXPECT_THAT(error.what(), HasSubstr(row.reason));
+    }
   }
 }
-
-INSTANTIATE_TEST_SUITE_P(
-    Paths, Malformed,
-    testing::Values(
-        MalformedCase{"OpenQuote", parseInstancePath, "root:A.a=1,b=\"x", 12, "missing quote"},
-        MalformedCase{"NoValue", parseInstancePath, "root:A.a=", 8, "invalid number"},
-        MalformedCase{"NoEqualSign", parseInstancePath, "root:A.a=\"x,y\",b", 16, "equal sign"},
-        MalformedCase{"BadClass", parseInstancePath, "root:1A.a=1", 6, "class name 1A"},
-        MalformedCase{"BadNamespace", parseClassPath, "ro ot:A", 1, "namespace"},
-        MalformedCase{"NoNamespace", parseClassPath, "A", 1, "no namespace"},
-        MalformedCase{"Host", parseClassPath, "//h/root:A", 1, "host"},
-        MalformedCase{"KeysOnClass", parseClassPath, "root:A.a=1", 7, "no keys"},
-        MalformedCase{"NoKeys", parseInstancePath, "root:A", 7, "no keys"},
-        MalformedCase{"Empty", parseClassPath, "", 1, "no namespace"},
-        MalformedCase{"BareNamespace", parseClassPath, "root/host", 1, "no namespace"},
-        MalformedCase{"ColonInValue", parseInstancePath, "A.k=\"x:y\"", 1, "no namespace"},
-        MalformedCase{"NoClass", parseClassPath, "root:", 6, "class name"},
-        MalformedCase{"EmptyNamespace", parseNamespaceOrClass, "", 1, "namespace"},
-        MalformedCase{"ControlCharacter", parseClassPath, "root:\x1b[2J", 6, "class name \\x1b[2J"},
-        MalformedCase{"NotUtf8", parseClassPath, "root:\xff", 6, "UTF-8"}),
-    [](const auto& row) { return std::string(row.param.name); });
 
 TEST(PathArgument, TheWholeMessage) {
   try {

@@ -6,8 +6,6 @@
 
 #include <dlfcn.h>
 
-#include <fstream>
-
 namespace {
 
 using cimhost::HostError;
@@ -48,9 +46,6 @@ TEST_F(ProviderLibraryTest, LoadsUsesAndUnloadsAgainAndAgain) {
   for (int round = 0; round < 2; ++round) {
     library_.load(TEST_PROVIDER_FILE, "CommonProvider", handle_);
     EXPECT_TRUE(library_.isLoaded());
-    EXPECT_NE(library_.instances(), nullptr);
-    EXPECT_NE(library_.associations(), nullptr);
-    EXPECT_NE(library_.methods(), nullptr);
     library_.unload();
     EXPECT_EQ(library_.instances(), nullptr);
     EXPECT_EQ(library_.associations(), nullptr);
@@ -60,21 +55,29 @@ TEST_F(ProviderLibraryTest, LoadsUsesAndUnloadsAgainAndAgain) {
   EXPECT_EQ(events(), "create;initialize;terminate;create;initialize;terminate;");
 }
 
+// What was initialized in vain is terminated.
 TEST_F(ProviderLibraryTest, FailuresNameTheFileAndTheReason) {
-  EXPECT_THAT(loadError("/no/such/library.so", "CommonProvider"),
-              HasSubstr("cannot load the provider library: /no/such/library.so"));
-  EXPECT_THAT(loadError(NO_PROVIDER_FILE, "CommonProvider"),
-              HasSubstr("no entry point PegasusCreateProvider"));
-  EXPECT_THAT(loadError(TEST_PROVIDER_FILE, "Unknown"), HasSubstr("no provider named Unknown"));
-  EXPECT_THAT(loadError(TEST_PROVIDER_FILE, "ThrowsInCreate"), HasSubstr("no memory for you"));
-  EXPECT_EQ(events(), "create;create;");
-}
-
-TEST_F(ProviderLibraryTest, AFailedInitializeIsTerminated) {
-  EXPECT_THAT(loadError(TEST_PROVIDER_FILE, "ThrowsInInitialize"),
-              HasSubstr("provider initialization failed: no luck"));
-  EXPECT_THAT(loadError(TEST_PROVIDER_FILE, "ThrowsIntInInitialize"), HasSubstr("Unknown error."));
-  EXPECT_EQ(events(), "create;initialize;terminate;create;initialize;terminate;");
+  const struct {
+    const char* file;
+    const char* provider;
+    const char* reason;
+    const char* events;
+  } cases[] = {
+      {"/no/such/library.so", "CommonProvider",
+       "cannot load the provider library: /no/such/library.so", ""},
+      {NO_PROVIDER_FILE, "CommonProvider", "no entry point PegasusCreateProvider", ""},
+      {TEST_PROVIDER_FILE, "Unknown", "no provider named Unknown", "create;"},
+      {TEST_PROVIDER_FILE, "ThrowsInCreate", "no memory for you", "create;"},
+      {TEST_PROVIDER_FILE, "ThrowsInInitialize", "provider initialization failed: no luck",
+       "create;initialize;terminate;"},
+      {TEST_PROVIDER_FILE, "ThrowsIntInInitialize", "Unknown error.",
+       "create;initialize;terminate;"},
+  };
+  for (const auto& row : cases) {
+    unsetenv("TEST_PROVIDER_EVENTS");
+    EXPECT_THAT(loadError(row.file, row.provider), HasSubstr(row.reason));
+    EXPECT_EQ(events(), row.events) << row.provider;
+  }
 }
 
 TEST_F(ProviderLibraryTest, AFailedTerminateStillCloses) {

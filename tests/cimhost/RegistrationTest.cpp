@@ -42,13 +42,6 @@ std::string text(const ProviderCapability& capability) {
   return result;
 }
 
-struct Case {
-  const char* name;
-  std::vector<Definition> definitions;
-  std::vector<const char*> capabilities;
-  std::size_t warnings;
-};
-
 // Class A is declared in root/x and root/y, nothing else is.
 TEST(Registration, OneCapabilityForEachClassAndSetOfProviderTypes) {
   ClassRepository repository;
@@ -56,38 +49,36 @@ TEST(Registration, OneCapabilityForEachClassAndSetOfProviderTypes) {
     repository.addNamespace(Pegasus::CIMNamespaceName(space));
     repository.addClass(Pegasus::CIMNamespaceName(space), Pegasus::CIMClass(Pegasus::CIMName("A")));
   }
-  const Case cases[] = {
+  const struct {
+    const char* name;
+    std::vector<Definition> definitions;
+    std::vector<const char*> capabilities;
+    std::size_t warnings = 0;
+  } cases[] = {
       {"sorted, whatever the order of the files",
        {{"root/b", "b", kPlain}, {"root/a", "B", kPlain}, {"root/a", "A", kPlain}},
-       {"A: A in root/a", "b: b in root/a root/b"},
-       0},
+       {"A: A in root/a", "b: b in root/a root/b"}},
       {"defined again, in other letter case",
        {{"root/a", "A", kPlain}, {"ROOT/A", "a", kPlain}},
-       {"A: A in root/a"},
-       0},
+       {"A: A in root/a"}},
       {"methods in one namespace of three",
        {{"root/a", "A", kPlain}, {"root/b", "A", kMethods}, {"root/c", "A", kPlain}},
-       {"A: A in root/a root/c", "root/b:A: A in root/b; methods"},
-       0},
+       {"A: A in root/a root/c", "root/b:A: A in root/b; methods"}},
       {"class and association at once",
        {{"root/a", "L", kMethods}, {"root/a", "L", kAssociation}},
-       {"L: L in root/a; association; methods"},
-       0},
+       {"L: L in root/a; association; methods"}},
       {"without a namespace: where it is declared",
        {{"", "A", kMethods}},
-       {"A: A in root/x root/y; methods"},
-       0},
+       {"A: A in root/x root/y; methods"}},
       {"with and without",
        {{"", "A", kPlain}, {"root/z", "A", kPlain}},
-       {"A: A in root/x root/y root/z"},
-       0},
+       {"A: A in root/x root/y root/z"}},
       {"without a namespace and nowhere declared",
        {{"", "B", kPlain}, {"root/a", "C", kPlain}},
        {"C: C in root/a"},
        1},
-      {"nothing", {}, {}, 0},
   };
-  for (const Case& row : cases) {
+  for (const auto& row : cases) {
     SCOPED_TRACE(row.name);
     ServedClasses all;
     for (const Definition& each : row.definitions) all.add(served(each));

@@ -62,4 +62,12 @@ class TestHost {
 
 inline const Pegasus::CIMNamespaceName kNamespace("root/test");
 
+/// The object with the key Name="a" of a class.
+Pegasus::CIMObjectPath pathOf(const std::string& className);
+
+Pegasus::CIMPropertyList listOf(const std::vector<const char*>& names);
+
+/// The code and the message: "2 not for you"; "0 " for success.
+std::string textOf(const OperationStatus& status);
+
 }  // namespace cimhost::test

@@ -7,18 +7,12 @@
 #include <Pegasus/Common/CIMMethod.h>
 #include <Pegasus/Common/CIMParameter.h>
 
-#include <gmock/gmock.h>
+#include <gtest/gtest.h>
 
 namespace {
 
 using namespace cimhost;
 using namespace Pegasus;
-
-struct ValueCase {
-  DeclaredType type;
-  const char* text;      // null: no "="
-  const char* expected;  // MOF; with "!" in front: the message
-};
 
 std::string resultOf(const DeclaredType& type,
                      const std::vector<std::optional<std::string>>& texts) {
@@ -32,96 +26,75 @@ std::string resultOf(const DeclaredType& type,
   }
 }
 
+// How the largest and smallest numbers of each type come back is tested with CIM-XML.
 TEST(ValueArgument, TextsBecomeWhatIsDeclared) {
+  using Texts = std::vector<std::optional<std::string>>;
   const DeclaredType strings{CIMTYPE_STRING, true, 0};
   const DeclaredType numbers{CIMTYPE_UINT8, true, 0};
-  const ValueCase cases[] = {
-      {{CIMTYPE_BOOLEAN}, "True", "TRUE"},
-      {{CIMTYPE_BOOLEAN}, "FALSE", "FALSE"},
-      {{CIMTYPE_BOOLEAN}, "1", "!\"1\" is neither true nor false"},
-      {{CIMTYPE_UINT8}, "255", "255"},
-      {{CIMTYPE_UINT8}, "0xfF", "255"},
-      {{CIMTYPE_UINT8}, "010", "10"},  // not octal
-      {{CIMTYPE_UINT8}, "-0", "0"},
-      {{CIMTYPE_UINT8}, "256", "!\"256\" is out of range, 0 to 255"},
-      {{CIMTYPE_UINT8}, "-1", "!\"-1\" is out of range, 0 to 255"},
-      {{CIMTYPE_UINT8}, "", "!\"\" is not an integer"},
-      {{CIMTYPE_UINT8}, "0x", "!\"0x\" is not an integer"},
-      {{CIMTYPE_UINT8}, "+-1", "!\"+-1\" is not an integer"},
-      {{CIMTYPE_UINT8}, "1 ", "!\"1 \" is not an integer"},
-      {{CIMTYPE_UINT8}, "1.0", "!\"1.0\" is not an integer"},
-      {{CIMTYPE_SINT8}, "-128", "-128"},
-      {{CIMTYPE_SINT8}, "128", "!\"128\" is out of range, -128 to 127"},
-      {{CIMTYPE_UINT16}, "+65535", "65535"},
-      {{CIMTYPE_SINT16}, "-0x8000", "-32768"},
-      {{CIMTYPE_UINT32}, "4294967296", "!\"4294967296\" is out of range, 0 to 4294967295"},
-      {{CIMTYPE_SINT32}, "-2147483648", "-2147483648"},
-      {{CIMTYPE_UINT64}, "18446744073709551615", "18446744073709551615"},
+  const struct {
+    DeclaredType type;
+    Texts texts;
+    const char* expected;  // MOF; with "!" in front: the message
+  } cases[] = {
+      {{CIMTYPE_BOOLEAN}, {"True"}, "TRUE"},
+      {{CIMTYPE_BOOLEAN}, {"1"}, "!\"1\" is neither true nor false"},
+      {{CIMTYPE_UINT8}, {"0xfF"}, "255"},
+      {{CIMTYPE_UINT8}, {"010"}, "10"},  // not octal
+      {{CIMTYPE_UINT8}, {"-0"}, "0"},
+      {{CIMTYPE_UINT8}, {"256"}, "!\"256\" is out of range, 0 to 255"},
+      {{CIMTYPE_UINT8}, {"-1"}, "!\"-1\" is out of range, 0 to 255"},
+      {{CIMTYPE_UINT8}, {""}, "!\"\" is not an integer"},
+      {{CIMTYPE_UINT8}, {"0x"}, "!\"0x\" is not an integer"},
+      {{CIMTYPE_UINT8}, {"+-1"}, "!\"+-1\" is not an integer"},
+      {{CIMTYPE_UINT8}, {"1 "}, "!\"1 \" is not an integer"},
+      {{CIMTYPE_SINT8}, {"128"}, "!\"128\" is out of range, -128 to 127"},
+      {{CIMTYPE_UINT16}, {"+65535"}, "65535"},
+      {{CIMTYPE_SINT16}, {"-0x8000"}, "-32768"},
       {{CIMTYPE_UINT64},
-       "18446744073709551616",
+       {"18446744073709551616"},
        "!\"18446744073709551616\" is out of range, 0 to 18446744073709551615"},
-      {{CIMTYPE_SINT64}, "-9223372036854775808", "-9223372036854775808"},
       {{CIMTYPE_SINT64},
-       "9223372036854775808",
-       "!\"9223372036854775808\" is out of range, -9223372036854775808 to 9223372036854775807"},
-      {{CIMTYPE_REAL32}, "0.1", "0.1"},
-      {{CIMTYPE_REAL32}, "1e39", "!\"1e39\" is out of range"},
-      {{CIMTYPE_REAL64}, "+1e39", "1.0e+39"},
-      {{CIMTYPE_REAL64}, "-5", "-5.0"},
-      {{CIMTYPE_REAL64}, "1,5", "!\"1,5\" is not a number"},
-      {{CIMTYPE_REAL64}, "+-5", "!\"+-5\" is not a number"},
-      {{CIMTYPE_CHAR16}, "\u20ac", "'\u20ac'"},
-      {{CIMTYPE_CHAR16}, "", "!\"\" is not one character of 16 bits"},
-      {{CIMTYPE_CHAR16}, "\U0001F600", "!\"\U0001F600\" is not one character of 16 bits"},
-      {{CIMTYPE_STRING}, "", "\"\""},
-      {{CIMTYPE_STRING}, "a,\\,b=[]", "\"a,\\\\,b=[]\""},  // as it is
-      {{CIMTYPE_STRING}, "\x1b[m\xff", "!\"\\x1b[m\\xff\" is not valid UTF-8"},
-      {{CIMTYPE_DATETIME}, "20260101120000.000000+060", "\"20260101120000.000000+060\""},
+       {"-9223372036854775809"},
+       "!\"-9223372036854775809\" is out of range, -9223372036854775808 to 9223372036854775807"},
+      {{CIMTYPE_REAL32}, {"1e39"}, "!\"1e39\" is out of range"},
+      {{CIMTYPE_REAL64}, {"+1e39"}, "1.0e+39"},
+      {{CIMTYPE_REAL64}, {"1,5"}, "!\"1,5\" is not a number"},
+      {{CIMTYPE_REAL64}, {"+-5"}, "!\"+-5\" is not a number"},
+      {{CIMTYPE_CHAR16}, {""}, "!\"\" is not one character of 16 bits"},
+      {{CIMTYPE_CHAR16}, {"\U0001F600"}, "!\"\U0001F600\" is not one character of 16 bits"},
+      {{CIMTYPE_STRING}, {""}, "\"\""},
+      {{CIMTYPE_STRING}, {"a,\\,b=[]"}, "\"a,\\\\,b=[]\""},  // as it is
+      {{CIMTYPE_STRING}, {"\x1b[m\xff"}, "!\"\\x1b[m\\xff\" is not valid UTF-8"},
       {{CIMTYPE_DATETIME},
-       "2026-01-01",
+       {"2026-01-01"},
        "!\"2026-01-01\" is not a datetime of 25 characters, as in 20260131235959.000000+060"},
-      {{CIMTYPE_REFERENCE}, "root/a:B.k=\"x,y\"", "\"root/a:B.k=\\\"x,y\\\"\""},
-      {{CIMTYPE_REFERENCE}, "no path", "!\"no path\" is not an object path"},
-      {{CIMTYPE_INSTANCE}, "x", "!values of this type cannot be given here"},
-      {{CIMTYPE_UINT8}, nullptr, "NULL"},
-      {strings, nullptr, "NULL"},
-      {strings, "[]", "{}"},
-      {strings, "", "{\"\"}"},
-      {strings, "\\[]", "{\"[]\"}"},
-      {strings, "[a,b]",
+      {{CIMTYPE_REFERENCE}, {"root/a:B.k=\"x,y\""}, "\"root/a:B.k=\\\"x,y\\\"\""},
+      {{CIMTYPE_REFERENCE}, {"no path"}, "!\"no path\" is not an object path"},
+      {{CIMTYPE_INSTANCE}, {"x"}, "!values of this type cannot be given here"},
+      {{CIMTYPE_UINT8}, {std::nullopt}, "NULL"},
+      {{CIMTYPE_STRING}, {"a", "b"}, "!more than one value given"},
+      {strings, {std::nullopt}, "NULL"},
+      {strings, {"[]"}, "{}"},
+      {strings, {""}, "{\"\"}"},
+      {strings, {"\\[]"}, "{\"[]\"}"},
+      {strings,
+       {"[a,b]"},
        "!\"[a,b]\" is not a list: write a,b without brackets, or \\[ for a bracket"},
-      {strings, "a,b]", "{\"a\", \"b]\"}"},
-      {strings, ",", "{\"\", \"\"}"},
-      {strings, "a\\,b,c\\\\,d\\e\\", "{\"a,b\", \"c\\\\\", \"d\\\\e\\\\\"}"},
-      {numbers, "1,2", "{1, 2}"},
-      {numbers, "1,", "!\"\" is not an integer"},
-      {numbers, "1,300", "!\"300\" is out of range, 0 to 255"},
-      {{CIMTYPE_UINT8, true, 3}, "1,2", "!3 elements expected, found 2"},
-      {{CIMTYPE_UINT8, true, 2}, "1,2", "{1, 2}"},
-      {{CIMTYPE_BOOLEAN, true, 0}, "true,FALSE", "{TRUE, FALSE}"},
-      {{CIMTYPE_DATETIME, true, 0}, "00000001000000.000000:000", "{\"00000001000000.000000:000\"}"},
-      {{CIMTYPE_REFERENCE, true, 0}, "B.k=1\\,l=2,C", "{\"B.k=1,l=2\", \"C\"}"},
+      {strings, {"a,b]"}, "{\"a\", \"b]\"}"},
+      {strings, {","}, "{\"\", \"\"}"},
+      {strings, {"a\\,b,c\\\\,d\\e\\"}, "{\"a,b\", \"c\\\\\", \"d\\\\e\\\\\"}"},
+      {strings, {"a", "b,c", "[]"}, "{\"a\", \"b\", \"c\"}"},
+      {strings, {"a", std::nullopt}, "!null and a value are both given"},
+      {numbers, {"1,"}, "!\"\" is not an integer"},
+      {{CIMTYPE_UINT8, true, 3}, {"1,2"}, "!3 elements expected, found 2"},
+      {{CIMTYPE_UINT8, true, 2}, {"1,2"}, "{1, 2}"},
+      {{CIMTYPE_REFERENCE, true, 0}, {"B.k=1\\,l=2,C"}, "{\"B.k=1,l=2\", \"C\"}"},
   };
-  for (const ValueCase& row : cases) {
-    SCOPED_TRACE(row.type.toString() + " " + (row.text != nullptr ? row.text : "null"));
-    std::optional<std::string> text;
-    if (row.text != nullptr) text = row.text;
-    EXPECT_EQ(resultOf(row.type, {text}), row.expected);
-  }
-}
-
-TEST(ValueArgument, SeveralTextsForOneName) {
-  const DeclaredType strings{CIMTYPE_STRING, true, 0};
-  EXPECT_EQ(resultOf(strings, {"a", "b,c", "[]"}), "{\"a\", \"b\", \"c\"}");
-  EXPECT_EQ(resultOf(strings, {"a", std::nullopt}), "!null and a value are both given");
-  EXPECT_EQ(resultOf({CIMTYPE_STRING}, {"a", "b"}), "!more than one value given");
-  EXPECT_EQ(resultOf({CIMTYPE_STRING}, {std::nullopt, std::nullopt}),
-            "!null and a value are both given");
+  for (const auto& row : cases) EXPECT_EQ(resultOf(row.type, row.texts), row.expected);
 }
 
 CIMClass makeDeclaration() {
   CIMClass declaration(CIMName("Test_Disk"));
-  declaration.addProperty(CIMProperty(CIMName("Name"), CIMValue(CIMTYPE_STRING, false)));
   declaration.addProperty(CIMProperty(CIMName("Size"), CIMValue(CIMTYPE_UINT8, false)));
   declaration.addProperty(CIMProperty(CIMName("Flags"), CIMValue(CIMTYPE_UINT8, true, 2), 2));
   declaration.addProperty(
@@ -173,16 +146,13 @@ TEST(RequestArguments, OnlyWhatIsGivenIsSent) {
             "};\n");
   EXPECT_EQ(invoked("format", {"Disks=Test_Disk", "label="}),
             "Format Label=\"\" Disks={\"Test_Disk\"}");
-  EXPECT_THAT(modified({"Flags"}), testing::HasSubstr("  Flags = NULL;\n"));
   EXPECT_EQ(invoked("FORMAT", {}), "Format");
 }
 
 TEST(RequestArguments, WhatDoesNotFitIsNamed) {
   EXPECT_EQ(modified({"Size=big"}), "property Size (uint8): \"big\" is not an integer");
   EXPECT_EQ(modified({"Flags=1"}), "property Flags (uint8[2]): 2 elements expected, found 1");
-  EXPECT_EQ(modified({"Flags=1,x"}), "property Flags (uint8[2]): \"x\" is not an integer");
   EXPECT_EQ(modified({"Nope=1"}), "class Test_Disk has no property \"Nope\"");
-  EXPECT_EQ(modified({"=1"}), "class Test_Disk has no property \"\"");
   EXPECT_EQ(modified({"b\xff\n=1"}), "class Test_Disk has no property \"b\\xff\\n\"");
   EXPECT_EQ(invoked("Nope", {}), "class Test_Disk has no method \"Nope\"");
   EXPECT_EQ(invoked("Format", {"Size=1"}), "method Format has no parameter \"Size\"");
