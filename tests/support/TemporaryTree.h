@@ -51,7 +51,7 @@ class TemporaryTree {
   std::string log() const { return read(logs() / "CommonProvider.log"); }
 
   static void write(const std::filesystem::path& file, const std::string& text) {
-    std::filesystem::create_directories(file.parent_path());
+    if (file.has_parent_path()) std::filesystem::create_directories(file.parent_path());
     std::ofstream stream(file, std::ios::binary);
     stream << text;
     if (!stream.flush()) throw std::runtime_error("cannot write " + file.string());
