@@ -38,14 +38,26 @@ CIMInstance InstanceShaper::shape(const CIMInstance& delivered) {
   const bool filtered = isFiltered(delivered, properties);
   CIMObjectPath path = delivered.getPath();
   const bool placed = completePath(path, nameSpace_, hostName_);
-  if (!filtered && !placed) return delivered;
+  if (!filtered && !placed && !selection_.includeClassOrigin) return delivered;
 
   CIMInstance shaped = delivered.clone();
   if (filtered) {
     shaped.instanceFilter(selection_.includeQualifiers, selection_.includeClassOrigin, properties);
   }
   if (placed) shaped.setPath(path);
+  if (selection_.includeClassOrigin) addOrigins(shaped);
   return shaped;
+}
+
+void InstanceShaper::addOrigins(CIMInstance& instance) const {
+  if (!repository_.hasClass(nameSpace_, instance.getClassName())) return;
+  const CIMClass declaration = wholeClass(repository_, nameSpace_, instance.getClassName());
+  for (Uint32 i = 0; i < instance.getPropertyCount(); ++i) {
+    CIMProperty property = instance.getProperty(i);
+    const Uint32 position = declaration.findProperty(property.getName());
+    if (!property.getClassOrigin().isNull() || position == PEG_NOT_FOUND) continue;
+    property.setClassOrigin(CIMConstClass(declaration).getProperty(position).getClassOrigin());
+  }
 }
 
 const CIMPropertyList& InstanceShaper::propertiesOf(const CIMName& className) {

@@ -25,10 +25,10 @@ bool completePath(Pegasus::CIMObjectPath& path, const Pegasus::CIMNamespaceName&
 
 /// Makes of an instance that a provider delivered the one that a client gets.
 ///
-/// Providers may ignore the selection, so it is applied to what they deliver, and a path without a
-/// namespace gets the request's, one without a host the given one, if any. The delivered object is
-/// never changed: it is handed on when nothing is to be done, and cloned otherwise. For one
-/// request, on one thread.
+/// Providers may ignore the selection, so it is applied to what they deliver: class origins that
+/// are missing come from the declaration, qualifiers do not. A path without a namespace gets the
+/// request's, one without a host the given one, if any. The delivered object is never changed: it
+/// is handed on when nothing is to be done, and cloned otherwise. For one request, on one thread.
 class InstanceShaper {
  public:
   /// `repository` must outlive the shaper.
@@ -40,6 +40,7 @@ class InstanceShaper {
 
  private:
   const Pegasus::CIMPropertyList& propertiesOf(const Pegasus::CIMName& className);
+  void addOrigins(Pegasus::CIMInstance& instance) const;
   Pegasus::CIMPropertyList selectProperties(const Pegasus::CIMName& className) const;
   bool isFiltered(const Pegasus::CIMInstance& instance,
                   const Pegasus::CIMPropertyList& properties) const;

@@ -153,8 +153,7 @@ OperationStatus deleteInstance(const Work& work) {
 
 // The declaration of a property of an instance's class.
 CIMProperty declaredProperty(const Work& work, const CIMName& className, const CIMName& name) {
-  if (work.call.repository.hasNamespace(work.nameSpace()) &&
-      !work.call.repository.hasClass(work.nameSpace(), className)) {
+  if (!work.call.repository.hasClass(work.nameSpace(), className)) {
     throw CIMException(CIM_ERR_INVALID_CLASS, className.getString());
   }
   CIMClass declaration = work.call.repository.getClass(work.nameSpace(), className, false, true,
@@ -354,6 +353,10 @@ const OperationRow* findOperation(const std::string& name) {
 OperationStatus runIntrinsic(const CimCall& call) {
   const OperationRow* const row = findOperation(call.message.method());
   if (row == nullptr) throw CIMException(CIM_ERR_NOT_SUPPORTED, fromUtf8(call.message.method()));
+  // Of several errors DSP0200 wants this one rather than those of parameters.
+  if (!call.repository.hasNamespace(call.nameSpace)) {
+    throw CIMException(CIM_ERR_INVALID_NAMESPACE, call.nameSpace.getString());
+  }
   if (row->withResult) call.writer.wrapResults();
   ReplySink sink(call.writer, row->form);
   const CallParameters parameters(call.message.call(), row->parameters);

@@ -14,6 +14,8 @@ using namespace Pegasus;
 namespace {
 
 constexpr int kMaximumNesting = 8;
+// A path within a path is a quoted text: each level doubles the quotes of the one below.
+constexpr Uint32 kMaximumReference = 65536;
 
 CIMName nameOf(const XmlElement& element, std::string_view attribute) {
   return CIMName(fromUtf8(element.attribute(attribute)));
@@ -68,7 +70,9 @@ CIMKeyBinding readKey(const XmlElement& binding) {
   const XmlElement& value = binding.onlyChild();
   const CIMName name = nameOf(binding, "NAME");
   if (value.is("VALUE.REFERENCE")) {
-    return CIMKeyBinding(name, readObjectPath(value).toString(), CIMKeyBinding::REFERENCE);
+    const String path = readObjectPath(value).toString();
+    if (path.size() > kMaximumReference) throw ValueArgumentError("the path in a key is too long");
+    return CIMKeyBinding(name, path, CIMKeyBinding::REFERENCE);
   }
   const CIMKeyBinding::Type type = keyTypeOf(value);
   checkKey(value.text, type);

@@ -143,9 +143,9 @@ TEST(Operations, SelectionIsAppliedToWhatAProviderDelivers) {
     InstanceSelection selection;    // deep, local only, qualifiers, origin, list
     std::vector<std::string> last;  // of the last instance, always of Test_BigDisk
   } cases[] = {
-      {"Test_Base", {true, false, true, true, {}}, {"Name+qualifiers+origin", "Size"}},
+      {"Test_Base", {true, false, true, true, {}}, {"Name+qualifiers+origin", "Size+origin"}},
       {"Test_Base", {true, false, true, false, {}}, {"Name+qualifiers", "Size"}},
-      {"Test_Base", {true, false, false, true, {}}, {"Name+origin", "Size"}},
+      {"Test_Base", {true, false, false, true, {}}, {"Name+origin", "Size+origin"}},
       {"Test_Base", {false, false, false, false, {}}, {"Name"}},
       {"Test_BigDisk", {false, false, false, false, {}}, {"Name", "Size"}},
       {"Test_BigDisk", {true, true, false, false, {}}, {"Size"}},

@@ -190,8 +190,8 @@ TEST_F(CimXmlTest, Errors) {
 }
 
 TEST_F(CimXmlTest, Namespaces) {
-  const auto with = [&](const std::string& name) {
-    Request request = intrinsic("EnumerateClassNames", "");
+  const auto with = [&](const std::string& name, const char* operation = "EnumerateClassNames") {
+    Request request = intrinsic(operation, "");
     request.headers["CIMObject"] = name;
     const std::string before = "<NAMESPACE NAME='root'/><NAMESPACE NAME='test'/>";
     request.text.replace(request.text.find(before), before.size(),
@@ -201,6 +201,7 @@ TEST_F(CimXmlTest, Namespaces) {
   EXPECT_EQ(with("root/nope"), error(3, "root/nope"));
   EXPECT_EQ(with("root//test"), error(3, "root//test"));
   EXPECT_THAT(with("ROOT/test"), StartsWith("<IRETURNVALUE><CLASSNAME"));  // in one element
+  EXPECT_EQ(with("root/nope", "GetClass"), error(3, "root/nope"));  // before the missing class
 }
 
 TEST_F(CimXmlTest, UserReachesTheProvider) {

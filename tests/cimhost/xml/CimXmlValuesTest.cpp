@@ -156,6 +156,16 @@ std::string nestedInstances(int depth) {
   return text;
 }
 
+// Each level doubles the quotes of the text that the key becomes.
+std::string nestedKeys(int depth) {
+  std::string key = "<KEYVALUE>\"\"</KEYVALUE>";
+  for (int i = 0; i < depth; ++i) {
+    key = "<VALUE.REFERENCE><INSTANCENAME CLASSNAME='A'><KEYBINDING NAME='k'>" + key +
+          "</KEYBINDING></INSTANCENAME></VALUE.REFERENCE>";
+  }
+  return "<PROPERTY.REFERENCE NAME='P'>" + key + "</PROPERTY.REFERENCE>";
+}
+
 TEST_F(KeptProperty, DepthOfEmbeddedInstances) {
   expectKept(nestedInstances(8), nestedInstances(8));
   EXPECT_THAT(modify(nestedInstances(9)), StartsWith("<ERROR CODE='4'"));
@@ -174,7 +184,8 @@ TEST_F(KeptProperty, WrongValuesAreRefused) {
         std::string("<PROPERTY NAME='1' TYPE='string'/>"),
         std::string("<PROPERTY NAME='P' TYPE='string'/><PROPERTY NAME='p' TYPE='uint8'/>"),
         reference("<INSTANCENAME CLASSNAME='A'><KEYBINDING NAME='k'><KEYVALUE "
-                  "VALUETYPE='numeric'>x</KEYVALUE></KEYBINDING></INSTANCENAME>")}) {
+                  "VALUETYPE='numeric'>x</KEYVALUE></KEYBINDING></INSTANCENAME>"),
+        nestedKeys(17)}) {
     EXPECT_THAT(modify(wrong),
                 StartsWith("<ERROR CODE='4' DESCRIPTION='parameter ModifiedInstance: "))
         << wrong;
