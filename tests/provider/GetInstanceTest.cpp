@@ -6,18 +6,9 @@ using namespace Pegasus;
 
 namespace {
 
-struct PathCase {
-  const char* path;
-  const char* found;  ///< The text of the instance's P, "" for none.
-};
-
-std::ostream& operator<<(std::ostream& out, const PathCase& given) {
-  return out << given.path;
-}
-
-class GetInstance : public ProviderTest, public testing::WithParamInterface<PathCase> {
+class GetInstance : public ProviderTest {
  protected:
-  void startItems() {
+  void SetUp() override {
     setTable(state->left, {"a", "B", "B"});
     setTable(state->right, {"first", "second", "third"});
     state->numbers[0] = 1;
@@ -29,35 +20,30 @@ class GetInstance : public ProviderTest, public testing::WithParamInterface<Path
   }
 };
 
-TEST_P(GetInstance, DeliversTheFirstMatch) {
-  startItems();
-  RecordingHandler handler = get(pathOf(GetParam().path));
-  ASSERT_FALSE(handler.events.empty());
-  EXPECT_EQ(handler.events.front(), "processing");
-  EXPECT_EQ(handler.events.back(), "complete");
-  EXPECT_EQ(handler.events.size() - 2, handler.instances.size());
-  std::string found;
-  for (Uint32 i = 0; i < handler.instances.size(); ++i) {
-    found += textOf(handler.instances[i].getProperty(2).getValue().toString());
+TEST_F(GetInstance, DeliversTheFirstMatch) {
+  const std::pair<const char*, const char*> cases[] = {
+      {"root/t:T_Item.Name=\"a\",Id=1", "first"},
+      {"root/t:T_Item.Id=0x1,Name=\"a\"", "first"},
+      {"//h/root/x:t_item.NAME=\"a\",ID=1", "first"},
+      {"root/t:T_Item.Name=\"B\",Id=0", "second"},
+      {"root/t:T_Item.Name=\"A\",Id=1", ""},
+      {"root/t:T_Item.Name=\"a\",Id=\"1\"", ""},
+      {"root/t:T_Item.Name=\"a\"", ""},
+      {"root/t:T_Item.Name=\"a\",Id=1,More=1", ""},
+      {"root/t:T_Item", ""},
+      {"root/t:T_Nothing.Name=\"a\",Id=1", ""}};
+  for (const auto& [path, found] : cases) {
+    RecordingHandler handler = get(pathOf(path));
+    const size_t instances = handler.instances.size();
+    EXPECT_EQ(instances, *found == '\0' ? 0u : 1u) << path;
+    ASSERT_EQ(handler.events.size(), instances + 2) << path;
+    EXPECT_EQ(handler.events.front(), "processing");
+    EXPECT_EQ(handler.events.back(), "complete");
+    EXPECT_THAT(handler.events[instances], HasSubstr(found));
   }
-  EXPECT_EQ(found, GetParam().found);
 }
 
-INSTANTIATE_TEST_SUITE_P(Paths, GetInstance,
-                         testing::Values(PathCase{"root/t:T_Item.Name=\"a\",Id=1", "first"},
-                                         PathCase{"root/t:T_Item.Id=0x1,Name=\"a\"", "first"},
-                                         PathCase{"root/t:t_item.NAME=\"a\",ID=1", "first"},
-                                         PathCase{"//h/root/x:T_Item.Name=\"a\",Id=1", "first"},
-                                         PathCase{"root/t:T_Item.Name=\"B\",Id=0", "second"},
-                                         PathCase{"root/t:T_Item.Name=\"A\",Id=1", ""},
-                                         PathCase{"root/t:T_Item.Name=\"a\",Id=\"1\"", ""},
-                                         PathCase{"root/t:T_Item.Name=\"a\"", ""},
-                                         PathCase{"root/t:T_Item.Name=\"a\",Id=1,More=1", ""},
-                                         PathCase{"root/t:T_Item", ""},
-                                         PathCase{"root/t:T_Nothing.Name=\"a\",Id=1", ""}));
-
 TEST_F(GetInstance, NamesAreThePathsOfTheEnumeration) {
-  startItems();
   RecordingHandler names;
   provider->enumerateInstanceNames(context, pathOf("root/t:T_Item"), names);
   EXPECT_THAT(names.events, ElementsAre("processing", "root/t:T_Item.Id=1,Name=\"a\"",
@@ -69,7 +55,6 @@ TEST_F(GetInstance, NamesAreThePathsOfTheEnumeration) {
 }
 
 TEST_F(GetInstance, ErrorsOfTheHandlerPass) {
-  startItems();
   struct Strict : RecordingHandler {
     void complete() override { throw CIMException(CIM_ERR_FAILED, String("Too few")); }
   } strict;
@@ -78,78 +63,39 @@ TEST_F(GetInstance, ErrorsOfTheHandlerPass) {
                CIMException);
 }
 
-struct Binding {
-  const char* name;
-  const char* value;
-  CIMKeyBinding::Type type;
-};
-
-struct BindingsCase {
-  const char* name;
-  std::vector<Binding> a, b;
-  bool equal;
-};
-
-std::ostream& operator<<(std::ostream& out, const BindingsCase& given) {
-  return out << given.name;
-}
-
-Array<CIMKeyBinding> bindingsOf(const std::vector<Binding>& bindings) {
-  Array<CIMKeyBinding> result;
-  for (const Binding& binding : bindings) {
-    result.append(CIMKeyBinding(CIMName(binding.name), String(binding.value), binding.type));
+TEST(CompareBindings, BothWays) {
+  const struct {
+    const char *a, *b;  // Paths with these bindings.
+    bool equal;
+  } cases[] = {
+      {"T", "T", true},
+      {"T", "T.A=1", false},
+      {"T.Key=\"x\"", "T.kEY=\"x\"", true},
+      {"T.A=\"x\"", "T.A=\"X\"", false},
+      {"T.A=\"x\"", "T.B=\"x\"", false},
+      {"T.A=\"1\"", "T.A=1", false},
+      {"T.A=16", "T.A=0x10", true},
+      {"T.A=1,B=2", "T.A=1,B=3", false},
+      // References to another place and class, to another key, within a reference.
+      {"T.A=\"//h/root/a:C.k=1\"", "T.A=\"root/b:D.K=1\"", true},
+      {"T.A=\"C.k=1\"", "T.A=\"C.k=2\"", false},
+      {R"(T.A="C.r=\"x:D.k=1\"")", R"(T.A="C.r=\"y:E.k=1\"")", true},
+  };
+  for (const auto& c : cases) {
+    const Array<CIMKeyBinding> a = pathOf(c.a).getKeyBindings();
+    const Array<CIMKeyBinding> b = pathOf(c.b).getKeyBindings();
+    EXPECT_EQ(Vaneth::compareBindings(a, b), c.equal) << c.a << " " << c.b;
+    EXPECT_EQ(Vaneth::compareBindings(b, a), c.equal) << c.a << " " << c.b;
   }
-  return result;
-}
-
-class CompareBindings : public testing::TestWithParam<BindingsCase> {};
-
-TEST_P(CompareBindings, BothWays) {
-  const Array<CIMKeyBinding> a = bindingsOf(GetParam().a);
-  const Array<CIMKeyBinding> b = bindingsOf(GetParam().b);
-  EXPECT_EQ(Vaneth::compareBindings(a, b), GetParam().equal);
-  EXPECT_EQ(Vaneth::compareBindings(b, a), GetParam().equal);
-}
-
-constexpr auto kString = CIMKeyBinding::STRING;
-constexpr auto kNumeric = CIMKeyBinding::NUMERIC;
-constexpr auto kReference = CIMKeyBinding::REFERENCE;
-
-INSTANTIATE_TEST_SUITE_P(
-    Lists, CompareBindings,
-    testing::Values(
-        BindingsCase{"BothEmpty", {}, {}, true},
-        BindingsCase{"OneEmpty", {}, {{"A", "1", kNumeric}}, false},
-        BindingsCase{"NameCase", {{"Key", "x", kString}}, {{"kEY", "x", kString}}, true},
-        BindingsCase{"ValueCase", {{"A", "x", kString}}, {{"A", "X", kString}}, false},
-        BindingsCase{"OtherName", {{"A", "x", kString}}, {{"B", "x", kString}}, false},
-        BindingsCase{"OtherType", {{"A", "1", kString}}, {{"A", "1", kNumeric}}, false},
-        BindingsCase{"NumbersByValue", {{"A", "16", kNumeric}}, {{"A", "0x10", kNumeric}}, true},
-        BindingsCase{"AnotherOrder",
-                     {{"A", "1", kNumeric}, {"B", "2", kNumeric}},
-                     {{"B", "2", kNumeric}, {"A", "1", kNumeric}},
-                     false},
-        BindingsCase{"SecondDiffers",
-                     {{"A", "1", kNumeric}, {"B", "2", kNumeric}},
-                     {{"A", "1", kNumeric}, {"B", "3", kNumeric}},
-                     false},
-        BindingsCase{"ReferenceToAnotherPlaceAndClass",
-                     {{"A", "//h/root/a:C.k=1", kReference}},
-                     {{"A", "root/b:D.K=1", kReference}},
-                     true},
-        BindingsCase{"ReferenceToAnotherKey",
-                     {{"A", "C.k=1", kReference}},
-                     {{"A", "C.k=2", kReference}},
-                     false},
-        BindingsCase{"ReferenceInReference",
-                     {{"A", "C.r=\"x:D.k=1\"", kReference}},
-                     {{"A", "C.r=\"y:E.k=1\"", kReference}},
-                     true}),
-    kByName);
-
-TEST(CompareBindingsError, ReferenceThatIsNoPath) {
-  const Array<CIMKeyBinding> bad = bindingsOf({{"A", "no path", kReference}});
-  EXPECT_THROW(Vaneth::compareBindings(bad, bad), MalformedObjectNameException);
+  // The order counts: paths sort theirs.
+  Array<CIMKeyBinding> turned;
+  for (const char* name : {"B", "A"}) {
+    turned.append(CIMKeyBinding(CIMName(name), String("1"), CIMKeyBinding::NUMERIC));
+  }
+  EXPECT_FALSE(Vaneth::compareBindings(turned, pathOf("T.A=1,B=1").getKeyBindings()));
+  const Array<CIMKeyBinding> noPath(
+      1, CIMKeyBinding(CIMName("A"), String("no path"), CIMKeyBinding::REFERENCE));
+  EXPECT_THROW(Vaneth::compareBindings(noPath, noPath), MalformedObjectNameException);
 }
 
 }  // namespace

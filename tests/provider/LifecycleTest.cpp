@@ -70,15 +70,6 @@ TEST_F(Lifecycle, ReadsEveryEntryWithXmlAnywhereInItsName) {
   provider->terminate();
 }
 
-TEST_F(Lifecycle, WithoutDefinitionFilesEveryClassIsUnknown) {
-  CIMInstanceProvider* provider = start();
-  RecordingHandler handler;
-  provider->enumerateInstances(context, pathOf("root/t:T_Item"), false, false, CIMPropertyList(),
-                               handler);
-  EXPECT_THAT(handler.events, ElementsAre());
-  provider->terminate();
-}
-
 TEST_F(Lifecycle, TerminateClosesLibrariesAndASecondLifeStartsAnew) {
   host.add(makeClass("T_Item", {declared("Name", CIMTYPE_STRING, Key::kYes)}));
   host.add(makeClass("T_Other", {}));

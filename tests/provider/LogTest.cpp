@@ -7,75 +7,82 @@ using namespace Pegasus;
 
 namespace {
 
+struct Line {
+  int level;  ///< It is written at this level and above.
+  const char* text;
+};
+
 struct LogCase {
   const char* name;
   void (*operation)(Vaneth::CommonProvider& provider);
-  int level;  ///< The texts are written at this level and not below.
-  std::vector<const char*> texts;
+  std::vector<Line> lines;  ///< In the order of the log.
 };
 
 std::ostream& operator<<(std::ostream& out, const LogCase& given) {
   return out << given.name;
 }
 
-class Log : public LinkTest, public testing::WithParamInterface<LogCase> {};
-
-TEST_P(Log, HasTheTextsInOrderAtTheirLevel) {
-  const LogCase& given = GetParam();
-  setTable(state->right, {"20260101120000.000000+060"});
-  setTable(state->left, {"a"});
-  CIMClass full =
-      makeClass("T_Full", {declared("Other", CIMTYPE_STRING), declared("When", CIMTYPE_DATETIME),
-                           declared("Name", CIMTYPE_STRING, Key::kYes)});
-  CIMMethod method(CIMName("Run"), CIMTYPE_SINT32);
-  method.addQualifier(CIMQualifier(CIMName("static"), CIMValue(Boolean(false))));
-  full.addMethod(method);
-  host.add(full);
-  start(classes() +
-        definedClass("T_Full", constant("int", "1"),
-                     property("When", call("rightText", "getSi")) +
-                         property("Name", constant("indexstring", "n"), call("setText", "setSi")) +
-                         "<method name=\"Run\">" + call("run", "execCi") + "</method>") +
-        association("T_Link", pairOf("T_Item", "Name", "T_Volume", "Owner", "<true/>")));
-  {
-    LogLevel below(given.level - 1);
-    given.operation(*provider);
+class Log : public LinkTest, public testing::WithParamInterface<LogCase> {
+ protected:
+  void SetUp() override {
+    LinkTest::SetUp();
+    setTable(state->right, {"20260101120000.000000+060"});
+    setTable(state->left, {"a"});
+    CIMClass full =
+        makeClass("T_Full", {declared("Other", CIMTYPE_STRING), declared("When", CIMTYPE_DATETIME),
+                             declared("Name", CIMTYPE_STRING, Key::kYes)});
+    CIMMethod method(CIMName("Run"), CIMTYPE_SINT32);
+    method.addQualifier(CIMQualifier(CIMName("static"), CIMValue(Boolean(false))));
+    full.addMethod(method);
+    host.add(full);
+    start(classes() +
+          definedClass("T_Full", constant("int", "1"),
+                       property("When", call("rightText", "getSi")) +
+                           property("Name", constant("indexstring", "n")) +
+                           "<method name=\"Run\">" + call("run", "execCi") + "</method>") +
+          association("T_Link", pairOf("T_Item", "Name", "T_Volume", "Owner", "<true/>")));
   }
-  for (const char* text : given.texts) EXPECT_THAT(tree.log(), Not(HasSubstr(text)));
-  std::filesystem::remove(tree.logs() / "CommonProvider.log");
-  LogLevel level(given.level);
-  given.operation(*provider);
-  const std::string log = tree.log();
-  size_t from = 0;
-  for (const char* text : given.texts) {
-    const size_t found = log.find(text, from);
-    ASSERT_NE(found, std::string::npos) << text << "is not where it should be in\n" << log;
-    from = found + std::char_traits<char>::length(text);
+};
+
+TEST_P(Log, HasTheLinesOfItsLevelInOrder) {
+  for (int level = 6; level <= 9; ++level) {
+    std::filesystem::remove(tree.logs() / "CommonProvider.log");
+    const LogLevel set(level);
+    GetParam().operation(*provider);
+    const std::string log = tree.log();
+    size_t from = 0;
+    for (const auto& [atLevel, text] : GetParam().lines) {
+      const size_t found = log.find(text, from);
+      EXPECT_EQ(found != std::string::npos, level >= atLevel) << level << " " << text << log;
+      if (found != std::string::npos) from = found + std::char_traits<char>::length(text);
+    }
   }
 }
 
-template <const char* const& kPath>
-void enumerateOf(Vaneth::CommonProvider& provider) {
+void enumerateOf(Vaneth::CommonProvider& provider, const char* path) {
   RecordingHandler handler;
-  provider.enumerateInstances(OperationContext(), pathOf(kPath), false, false, CIMPropertyList(),
+  provider.enumerateInstances(OperationContext(), pathOf(path), false, false, CIMPropertyList(),
                               handler);
 }
 
-constexpr const char* kFull = "root/t:T_Full";
-constexpr const char* kLink = "root/t:T_Link";
+void enumerateFull(Vaneth::CommonProvider& provider) {
+  enumerateOf(provider, "root/t:T_Full");
+}
+
+void enumerateLink(Vaneth::CommonProvider& provider) {
+  enumerateOf(provider, "root/t:T_Link");
+}
 
 void modifyFull(Vaneth::CommonProvider& provider) {
-  CIMInstance sent(CIMName("T_Full"));
-  sent.addProperty(CIMProperty(CIMName("Name"), CIMValue(String("x"))));
   RecordingHandler handler;
-  provider.modifyInstance(OperationContext(), pathOf("root/t:T_Full.Name=\"n 0\""), sent, false,
-                          CIMPropertyList(), handler);
+  provider.modifyInstance(OperationContext(), pathOf("root/t:T_Full.Name=\"n 0\""),
+                          CIMInstance(CIMName("T_Full")), false, CIMPropertyList(), handler);
 }
 
 void invokeFull(Vaneth::CommonProvider& provider) {
   RecordingHandler handler;
-  provider.invokeMethod(OperationContext(), pathOf(kFull), CIMName("Run"), Array<CIMParamValue>(),
-                        handler);
+  provider.invokeMethod(OperationContext(), pathOf("root/t:T_Full"), CIMName("Run"),
+                        Array<CIMParamValue>(), handler);
 }
 
 void namesOfItem(Vaneth::CommonProvider& provider) {
@@ -87,71 +94,57 @@ void namesOfItem(Vaneth::CommonProvider& provider) {
 INSTANTIATE_TEST_SUITE_P(
     Operations, Log,
     testing::Values(
-        LogCase{"Enumerate8",
-                enumerateOf<kFull>,
-                8,
-                {"CommonProvider:enumerateInstances T_Full Entry\n",
-                 "CommonProvider:ProviderDefClass found\n"}},
-        LogCase{
-            "Enumerate9",
-            enumerateOf<kFull>,
-            9,
-            {"CommonProvider: for each instance 0\n", "getClass - ns:root/t, classname:T_Full\n",
-             "number of properties is 3\n", "CommonProvider: for each property 0\n",
-             "CommonProvider: end of a property process Other\n",
-             "CommonProvider: for each property 1\n",
-             "CommonProvider: ProviderDefProperty found When\n",
-             "DATE TIME: 20260101120000.000000+060\n",
-             "CommonProvider: end of a property process When\n",
-             "CommonProvider: for each property 2\n",
-             "CommonProvider: ProviderDefProperty found Name\n",
-             "Adding String property value:n 0\n",
-             "CommonProvider: end of a property process Name\n",
-             "delever instances: root/t:T_Full.Name=\"n 0\"\n",
-             "CommonProvider:End of ProviderDefClass process\n"}},
-        LogCase{"Association7",
-                enumerateOf<kLink>,
-                7,
-                {"enumerateInstances in CommonProvider:enumerateInstances T_Volume Entry\n"}},
-        LogCase{
-            "Association8",
-            enumerateOf<kLink>,
-            8,
-            {"getPropertyValues: Property - Owner\n", "getPropertyValue : Class Owner, Value a\n",
-             "getPropertyValues: Property - Name\n", "getPropertyValue : Class Name, Value a\n"}},
-        LogCase{"Association9",
-                enumerateOf<kLink>,
-                9,
-                {"CommonProvider:End of ProviderDefClass process\n",
-                 "CommonProvider:ProviderDefAssociation found\n", "Source Instances T_Item: 1\n",
-                 "Source Instances T_Volume: 2\n",
-                 "delever instances: root/t:T_Link.Item=", "delever instances: root/t:T_Link.Item=",
-                 "CommonProvider:End of ProviderDefAssociation process\n"}},
-        LogCase{"Modify8", modifyFull, 8, {"CommonProvider:modifyInstances T_Full Entry\n"}},
-        LogCase{"Modify9",
+        LogCase{"Enumerate",
+                enumerateFull,
+                {{8, "CommonProvider:enumerateInstances T_Full Entry\n"},
+                 {8, "CommonProvider:ProviderDefClass found\n"},
+                 {9, "CommonProvider: for each instance 0\n"},
+                 {9, "getClass - ns:root/t, classname:T_Full\n"},
+                 {9, "number of properties is 3\n"},
+                 {9, "CommonProvider: for each property 0\n"},
+                 {9, "CommonProvider: end of a property process Other\n"},
+                 {9, "CommonProvider: ProviderDefProperty found When\n"},
+                 {9, "DATE TIME: 20260101120000.000000+060\n"},
+                 {9, "CommonProvider: for each property 2\n"},
+                 {9, "Adding String property value:n 0\n"},
+                 {9, "CommonProvider: end of a property process Name\n"},
+                 {9, "delever instances: root/t:T_Full.Name=\"n 0\"\n"},
+                 {9, "CommonProvider:End of ProviderDefClass process\n"}}},
+        LogCase{"Association",
+                enumerateLink,
+                {{9, "CommonProvider:End of ProviderDefClass process\n"},
+                 {9, "CommonProvider:ProviderDefAssociation found\n"},
+                 {9, "Source Instances T_Item: 1\n"},
+                 {7, "enumerateInstances in CommonProvider:enumerateInstances T_Volume Entry\n"},
+                 {9, "Source Instances T_Volume: 2\n"},
+                 {8, "getPropertyValues: Property - Owner\n"},
+                 {8, "getPropertyValue : Class Owner, Value a\n"},
+                 {8, "getPropertyValues: Property - Name\n"},
+                 {8, "getPropertyValue : Class Name, Value a\n"},
+                 {9, "delever instances: root/t:T_Link.Item="},
+                 {9, "CommonProvider:End of ProviderDefAssociation process\n"}}},
+        LogCase{"Modify",
                 modifyFull,
-                9,
-                {"CommonProvider:End of ProviderDefClass process\n",
-                 "getClass - ns:root/t, classname:T_Full\n", "number of properties is 3\n",
-                 "CommonProvider: for each property 2\n",
-                 "CommonProvider: ProviderDefProperty found Name\n"}},
-        LogCase{"Method8",
+                {{8, "CommonProvider:modifyInstances T_Full Entry\n"},
+                 {9, "getClass - ns:root/t, classname:T_Full\n"},
+                 {9, "number of properties is 3\n"},
+                 {9, "CommonProvider: for each property 2\n"},
+                 {9, "CommonProvider: ProviderDefProperty found Name\n"}}},
+        LogCase{"Method",
                 invokeFull,
-                8,
-                {"CommonProvider:invokeMethod T_Full Entry\n",
-                 "CommonProvider:ProviderDefClass found\n"}},
-        LogCase{"Method9", invokeFull, 9, {"getClass - ns:root/t, classname:T_Full\n"}},
-        LogCase{"Names7",
-                namesOfItem,
-                7,
-                {"associatorNames : object: T_Item.Name=\"a\", association : T_Link, result : ",
-                 "EnumerateInstances in associatorNames : object: T_Volume"}},
-        LogCase{"Names8",
-                namesOfItem,
-                8,
-                {"ProviderDefAssociation found\n", "Result class is : T_Volume",
-                 "Source instances enumerated\n", "Target instances enumerated\n",
-                 "Number of associated instance is : 2\n"}}),
+                {{8, "CommonProvider:invokeMethod T_Full Entry\n"},
+                 {8, "CommonProvider:ProviderDefClass found\n"},
+                 {9, "getClass - ns:root/t, classname:T_Full\n"}}},
+        LogCase{
+            "Names",
+            namesOfItem,
+            {{7, "associatorNames : object: T_Item.Name=\"a\", association : T_Link, result : "},
+             {8, "ProviderDefAssociation found\n"},
+             {8, "Result class is : T_Volume"},
+             {8, "Source instances enumerated\n"},
+             {7, "EnumerateInstances in associatorNames : object: T_Volume"},
+             {8, "Target instances enumerated\n"},
+             {8, "Number of associated instance is : 2\n"}}}),
     kByName);
 
 using MapLog = Log;

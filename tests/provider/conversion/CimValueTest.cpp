@@ -71,24 +71,14 @@ const Numbers kNumbers = {65, -1};
 
 INSTANTIATE_TEST_SUITE_P(
     Arrays, CimValueOf,
-    testing::Values(
-        ConversionCase{CIMTYPE_BOOLEAN, kNumbers, "TRUE TRUE "},
-        ConversionCase{CIMTYPE_UINT8, kNumbers, "65 255 "},
-        ConversionCase{CIMTYPE_SINT8, kNumbers, "65 -1 "},
-        ConversionCase{CIMTYPE_UINT16, kNumbers, "65 65535 "},
-        ConversionCase{CIMTYPE_SINT16, kNumbers, "65 -1 "},
-        ConversionCase{CIMTYPE_UINT32, kNumbers, "65 4294967295 "},
-        ConversionCase{CIMTYPE_SINT32, kNumbers, "65 -1 "},
-        ConversionCase{CIMTYPE_UINT64, kNumbers, "65 18446744073709551615 "},
-        ConversionCase{CIMTYPE_SINT64, kNumbers, "65 -1 "},
-        ConversionCase{CIMTYPE_REAL32, kNumbers, "6.5000000000000000e+01 -1.0000000000000000e+00 "},
-        ConversionCase{CIMTYPE_REAL64, kNumbers, "6.5000000000000000e+01 -1.0000000000000000e+00 "},
-        // U+FFFF is no character.
-        ConversionCase{CIMTYPE_CHAR16, kNumbers, "A \xef\xbf\xbd "},
-        ConversionCase{CIMTYPE_STRING, Texts{"a b", "", "c"}, "a b  c "},
-        ConversionCase{CIMTYPE_DATETIME,
-                       Texts{"20260101120000.000000+060", "00000001000000.000000:000"},
-                       "20260101120000.000000+060 00000001000000.000000:000 "}));
+    testing::Values(ConversionCase{CIMTYPE_BOOLEAN, kNumbers, "TRUE TRUE "},
+                    ConversionCase{CIMTYPE_UINT64, kNumbers, "65 18446744073709551615 "},
+                    // U+FFFF is no character.
+                    ConversionCase{CIMTYPE_CHAR16, kNumbers, "A \xef\xbf\xbd "},
+                    ConversionCase{CIMTYPE_STRING, Texts{"a b", "", "c"}, "a b  c "},
+                    ConversionCase{CIMTYPE_DATETIME,
+                                   Texts{"20260101120000.000000+060", "00000001000000.000000:000"},
+                                   "20260101120000.000000+060 00000001000000.000000:000 "}));
 
 TEST(CimValueRefusals, TextsOfNoSuchValue) {
   EXPECT_THROW(Vaneth::toCimValue("today", CIMTYPE_DATETIME, false), Exception);

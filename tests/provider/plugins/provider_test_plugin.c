@@ -10,7 +10,6 @@ CP_FUNCTION(getI, rightCount);
 CP_FUNCTION(getSi, leftText);
 CP_FUNCTION(getSi, rightText);
 CP_FUNCTION(getIi, number);
-CP_FUNCTION(getLi, wide);
 CP_FUNCTION(getAIi, numbers);
 CP_FUNCTION(getASi, texts);
 CP_FUNCTION(setIi, setNumber);
@@ -51,12 +50,6 @@ int rightText(void* out, int index) {
 int number(int index) {
   countCall();
   return state.numbers[index];
-}
-
-long wide(int index) {
-  (void)index;
-  countCall();
-  return state.wide;
 }
 
 int numbers(void* out, int index) {

@@ -15,7 +15,6 @@ struct TestPluginState {
   struct TestTable right;
   int numbers[TEST_ITEMS]; /* of number() by index; also the elements of numbers() */
   int numbersCount;
-  long wide;
   int calls;                    /* of getters, instance counts apart */
   char record[4 * TEST_BUFFER]; /* one line for each setter and method call */
   char output[TEST_BUFFER];     /* the output list of run() */
