@@ -36,22 +36,6 @@ TEST_F(Registry, NotesAMissOnStandardOutputAtLevel9) {
   EXPECT_EQ(tree_.log(), "");
 }
 
-TEST_F(Registry, ReleaseClosesTheLibrariesAndEmptiesTheLists) {
-  for (int round = 0; round < 2; ++round) {
-    EXPECT_EQ(function("alltypes", "getI", "getI").get().getType(), 0);
-    EXPECT_EQ(function("lifecycle", "getStarts", "getI").get().getType(), 0);
-    EXPECT_TRUE(isOpen("alltypes"));
-    EXPECT_TRUE(isOpen("lifecycle"));
-    releaseFunctions();
-    EXPECT_EQ(getFunction("getI"), nullptr);
-    EXPECT_TRUE(isOpen("alltypes"));
-    releaseModules();
-    EXPECT_EQ(getModule("alltypes"), nullptr);
-    EXPECT_FALSE(isOpen("alltypes"));
-    EXPECT_FALSE(isOpen("lifecycle"));
-  }
-}
-
 TEST_F(Registry, ReplacesModulesFromAPositionOn) {
   ProviderDefModule* from = &module("a");
   ProviderDefModule* to = &module("b");
