@@ -11,7 +11,6 @@
 #include "tests/examples/hostinfo/HostinfoLibrary.h"
 
 using testing::ElementsAre;
-using testing::IsEmpty;
 using testing::SizeIs;
 
 namespace {
@@ -95,45 +94,29 @@ TEST(FileSystems, AMountPointThatIsNoUtf8IsMeasuredUnderItsRealName) {
   EXPECT_GT(library.longInteger("hostFileSystemSizeKiB", 0), 0);
 }
 
-struct IgnoredCase {
-  const char* name;
-  std::string mounts;
-};
-
-class IgnoredMounts : public testing::TestWithParam<IgnoredCase> {};
-
-TEST_P(IgnoredMounts, DoNotHideTheOthers) {
-  FakeHost host;
-  host.writeMounts(GetParam().mounts + "good / ext4 rw 0 0\n");
-  HostinfoLibrary library;
-  EXPECT_THAT(library.textsOfAll("hostFileSystemCount", "hostFileSystemDevice"),
-              ElementsAre("good"));
+std::string repeated(const std::string& text, int times) {
+  std::string result;
+  for (int i = 0; i < times; ++i) result += text;
+  return result;
 }
 
-const std::string kDeepPath = [] {
-  std::string path;
-  for (int i = 0; i < 600; ++i) path += "/.";  // "/" for the kernel, too long for a buffer
-  return path;
-}();
-
-INSTANTIATE_TEST_SUITE_P(
-    Lines, IgnoredMounts,
-    testing::Values(IgnoredCase{"NoBlocks", "proc /proc proc rw 0 0\n"},
-                    IgnoredCase{"Automounter", "map /tmp autofs rw 0 0\n"},
-                    IgnoredCase{"NotThere", "x /no/such/directory ext4 rw 0 0\n"},
-                    IgnoredCase{"EmptyLine", "\n"}, IgnoredCase{"DeviceOnly", "/dev/x\n"},
-                    IgnoredCase{"NoOptions", "/dev/x /tmp ext4\n"},
-                    IgnoredCase{"OnlyBlanks", "        \n"},
-                    IgnoredCase{"NulByte", std::string("/dev/x\0 /tmp ext4 rw\n", 21)},
-                    IgnoredCase{"NameTooLong", "/dev/x " + kDeepPath + " ext4 rw 0 0\n"},
-                    IgnoredCase{"LineTooLong",
-                                "/dev/x /tmp ext4 " + std::string(70000, 'o') + " 0 0\n"}),
-    [](const auto& testCase) { return testCase.param.name; });
-
-TEST(FileSystems, AnUnfinishedLastLineDoesNotCount) {
+TEST(FileSystems, LinesThatAreNoneDoNotHideTheOthers) {
+  const std::string ignored[] = {"proc /proc proc rw 0 0\n",  // no blocks
+                                 "map /tmp autofs rw 0 0\n", "x /no/such/directory ext4 rw 0 0\n",
+                                 "\n", "        \n", "/dev/x\n", "/dev/x /tmp ext4\n",
+                                 std::string("/dev/x\0 /tmp ext4 rw\n", 21),
+                                 // "/" for the kernel, too long for a buffer
+                                 "/dev/x " + repeated("/.", 600) + " ext4 rw 0 0\n",
+                                 "/dev/x /tmp ext4 " + std::string(70000, 'o') + " 0 0\n"};
   FakeHost host;
-  host.writeMounts("good / ext4 rw 0 0\ncut /tmp ext4 r");
   HostinfoLibrary library;
+  for (const std::string& line : ignored) {
+    host.writeMounts(line + "good / ext4 rw 0 0\n");
+    EXPECT_THAT(library.textsOfAll("hostFileSystemCount", "hostFileSystemDevice"),
+                ElementsAre("good"))
+        << line.substr(0, 80);
+  }
+  host.writeMounts("good / ext4 rw 0 0\ncut /tmp ext4 r");  // unfinished
   EXPECT_EQ(library.count("hostFileSystemCount"), 1);
 }
 
@@ -143,52 +126,36 @@ TEST(FileSystems, NoMountTableMeansNoInstance) {
   EXPECT_EQ(library.count("hostFileSystemCount"), 0);
 }
 
-struct CleanCase {
-  const char* name;
-  std::string inFile, told;
-};
-
-class CleanText : public testing::TestWithParam<CleanCase> {};
-
-TEST_P(CleanText, IsUtf8ThatXmlCanCarry) {
+TEST(FileSystems, TextIsUtf8ThatXmlCanCarry) {
+  const std::string bad = "\xEF\xBF\xBD";  // U+FFFD
+  const std::pair<std::string, std::string> cases[] = {
+      {"\\040\\134040\\", " \\040\\"},
+      {"\\04\\08x\\400\\000", "\\04\\08x\\400\\000"},  // no escapes
+      {"\xC3\xA9\xE2\x82\xAC\xF0\x9F\x98\x80", "\xC3\xA9\xE2\x82\xAC\xF0\x9F\x98\x80"},
+      {"\\303\\251", "\xC3\xA9"},
+      {"\xC3", bad},
+      {"\xE2\x82z", bad + bad + "z"},
+      {"\x80z", bad + "z"},
+      {"\xC0\xAF", bad + bad},  // overlong
+      {"\xE0\x80\xAF", bad + bad + bad},
+      {"\xED\xA0\x80", bad + bad + bad},  // half a character
+      {"\xF4\x90\x80\x80", bad + bad + bad + bad},
+      {"a\\001b\\011c", "a" + bad + "b\tc"},
+      {"\xEF\xBF\xBF", bad + bad + bad},
+      {"%n%s%99999d", "%n%s%99999d"},
+      {std::string(5000, 'x'), std::string(1023, 'x')},
+      // Cut between characters; growing when it is cleaned.
+      {"x" + repeated("\xE2\x82\xAC", 400), "x" + repeated("\xE2\x82\xAC", 340)},
+      {std::string(1023, '\xFF'), repeated(bad, 341)},
+  };
   FakeHost host;
-  host.writeMounts(GetParam().inFile + " / ext4 rw 0 0\n");
   HostinfoLibrary library;
-  ASSERT_EQ(library.count("hostFileSystemCount"), 1);
-  EXPECT_EQ(library.text("hostFileSystemDevice", 0), GetParam().told);
+  for (const auto& [inFile, told] : cases) {
+    host.writeMounts(inFile + " / ext4 rw 0 0\n");
+    ASSERT_EQ(library.count("hostFileSystemCount"), 1);
+    EXPECT_EQ(library.text("hostFileSystemDevice", 0), told);
+  }
 }
-
-const std::string kBad = "\xEF\xBF\xBD";  // U+FFFD
-
-std::string repeated(const std::string& text, int times) {
-  std::string result;
-  for (int i = 0; i < times; ++i) result += text;
-  return result;
-}
-
-INSTANTIATE_TEST_SUITE_P(
-    Devices, CleanText,
-    testing::Values(CleanCase{"Escapes", "\\040\\134040\\", " \\040\\"},
-                    CleanCase{"NoEscape", "\\04\\08x\\400\\000", "\\04\\08x\\400\\000"},
-                    CleanCase{"TwoToFourBytes", "\xC3\xA9\xE2\x82\xAC\xF0\x9F\x98\x80",
-                              "\xC3\xA9\xE2\x82\xAC\xF0\x9F\x98\x80"},
-                    CleanCase{"EscapedUtf8", "\\303\\251", "\xC3\xA9"},
-                    CleanCase{"LoneLead", "\xC3", kBad},
-                    CleanCase{"LeadThenText", "\xE2\x82z", kBad + kBad + "z"},
-                    CleanCase{"LoneContinuation", "\x80z", kBad + "z"},
-                    CleanCase{"Overlong", "\xC0\xAF", kBad + kBad},
-                    CleanCase{"OverlongThree", "\xE0\x80\xAF", kBad + kBad + kBad},
-                    CleanCase{"Surrogate", "\xED\xA0\x80", kBad + kBad + kBad},
-                    CleanCase{"BeyondUnicode", "\xF4\x90\x80\x80", kBad + kBad + kBad + kBad},
-                    CleanCase{"ControlCharacter", "a\\001b\\011c", "a" + kBad + "b\tc"},
-                    CleanCase{"NotACharacter", "\xEF\xBF\xBF", kBad + kBad + kBad},
-                    CleanCase{"PercentSigns", "%n%s%99999d", "%n%s%99999d"},
-                    CleanCase{"CutAtTheBuffer", std::string(5000, 'x'), std::string(1023, 'x')},
-                    CleanCase{"CutBetweenCharacters", "x" + repeated("\xE2\x82\xAC", 400),
-                              "x" + repeated("\xE2\x82\xAC", 340)},
-                    CleanCase{"GrowingWhenCleaned", std::string(1023, '\xFF'),
-                              repeated(kBad, 341)}),
-    [](const auto& testCase) { return testCase.param.name; });
 
 class MountOptions : public testing::Test {
  protected:
@@ -232,10 +199,7 @@ TEST_F(MountOptions, OneThatDoesNotFitLeavesRoomForTheOthers) {
 TEST_F(MountOptions, AreUnescapedAfterTheSplit) {
   EXPECT_THAT(textsFor("a\\054b,,c\\040d,ro\\040"), ElementsAre("a,b", "c d", "ro "));
   EXPECT_EQ(library_.integer("hostFileSystemReadOnly", 0), 0);
-}
-
-TEST_F(MountOptions, AnEmptyFieldIsAnEmptyArray) {
-  EXPECT_THAT(textsFor(""), IsEmpty());
+  EXPECT_THAT(textsFor(""), ElementsAre());
 }
 
 }  // namespace
