@@ -83,11 +83,6 @@ INSTANTIATE_TEST_SUITE_P(
         TextCase{"LongLine", "run/bad.xml",
                  "<plugin><module name='m'/>" + repeated(" ", 5000) + "\u00e9<oops/>",
                  "\n  " + repeated(" ", 60) + "\u00e9<oops/>\n  " + repeated(" ", 60) + "^"},
-        TextCase{"NoDefinition", "run/bad.xml", "<?xml version='1.0'?>\n<plugin/>",
-                 "bad.xml:1:1: "},
-        TextCase{"ClassBehindAssociation", "run/bad.xml",
-                 "<plugin>\n<association name='A'></association>\n  <class name='B'/></plugin>",
-                 "bad.xml:3:3: "},
         TextCase{"DeepNesting", "run/bad.xml",
                  "<plugin><module name='m'>" +
                      repeated("<functioncall><function name='f'/><argument type='element'>", 20000),

@@ -340,19 +340,3 @@ TEST_F(Wbemcli, ShowsItsPasswordOnceItTrustsTheCertificate) {
     EXPECT_EQ(result.err, failure(std::string("Http Exception: ") + message)) << user;
   }
 }
-
-TEST_F(Wbemcli, SeesThisMachine) {
-  serve(HOMES "/hostinfo", "root/host");
-  for (const std::string name : {"Host_NetworkPort", "Host_IPEndpoint", "Host_PortEndpoint"}) {
-    const ProgramResult names =
-        runProgram({CIMHOST, "--home", HOMES "/hostinfo", "names", "root/host:" + name});
-    std::string seen = run("ein :" + name).out;
-    EXPECT_EQ(std::count(seen.begin(), seen.end(), '\n'),
-              std::count(names.out.begin(), names.out.end(), '\n'))
-        << seen << names.out;
-  }
-  std::string mtu;
-  std::getline(std::ifstream("/sys/class/net/lo/mtu"), mtu);
-  EXPECT_EQ(run("gi ':Host_NetworkPort.Name=\"lo\"' MTU").out,
-            "S/Host_NetworkPort.Name=\"lo\" MTU=" + mtu + "\n");
-}
