@@ -104,14 +104,4 @@ TEST(Array, BooleansLieSideBySide) {
   EXPECT_TRUE(data[0] && data[1] && !data[2]);
 }
 
-template <class A>
-auto hasBegin(int) -> decltype(std::declval<A&>().begin(), true);
-template <class A>
-int hasBegin(...);
-
-TEST(Array, ConvertsNoMoreThanTheServersApi) {
-  static_assert(!std::is_constructible_v<Array<Uint32>, std::initializer_list<Uint32>>);
-  static_assert(std::is_same_v<decltype(hasBegin<Array<Uint32>>(0)), int>);
-}
-
 }  // namespace

@@ -2,7 +2,6 @@
 #include <gtest/gtest.h>
 
 #include <string>
-#include <type_traits>
 
 #include "PegasusText.h"
 
@@ -66,12 +65,6 @@ TEST(CIMNamespaceName, RefusesIllegalNames) {
               std::string("invalid CIM namespace name: ") + name);
     EXPECT_FALSE(CIMNamespaceName::legal(name));
   }
-}
-
-TEST(CIMName, ConvertsNoMoreThanTheServersApi) {
-  static_assert(std::is_convertible_v<const char*, CIMName>);
-  static_assert(!std::is_assignable_v<CIMName&, const char*>, "ambiguous");
-  static_assert(!std::is_assignable_v<CIMNamespaceName&, const char*>, "ambiguous");
 }
 
 }  // namespace

@@ -2,6 +2,7 @@
 #include <Pegasus/Common/CIMClass.h>
 #include <gtest/gtest.h>
 
+#include <array>
 #include <memory>
 #include <random>
 #include <string>
@@ -11,113 +12,71 @@ using namespace Pegasus;
 
 namespace {
 
-struct ModelQualifier {
-  Uint32 value;
-  std::string name;
-};
-using QualifierPtr = std::shared_ptr<ModelQualifier>;
+/// The model of a class: the numbers of the qualifiers of its four elements, which are the
+/// properties x and y, the method m and its parameter a.
+using Numbers = std::vector<std::shared_ptr<Uint32>>;
+using Model = std::array<Numbers, 4>;
 
-/// A property, a method or a parameter: a number (where there is one), qualifiers and parts.
-struct ModelElement {
-  Uint32 value = 0;
-  std::vector<QualifierPtr> qualifiers;
-  std::vector<std::shared_ptr<ModelElement>> parts;
-};
-using ElementPtr = std::shared_ptr<ModelElement>;
+struct Class {
+  CIMClass object{CIMName("A")};
+  Model model;
 
-ElementPtr deepCopy(const ElementPtr& source) {
-  auto copy = std::make_shared<ModelElement>();
-  copy->value = source->value;
-  for (const auto& q : source->qualifiers) {
-    copy->qualifiers.push_back(std::make_shared<ModelQualifier>(*q));
-  }
-  for (const auto& part : source->parts) copy->parts.push_back(deepCopy(part));
-  return copy;
-}
-
-struct ModelClass {
-  std::vector<ElementPtr> properties, methods;
-
-  ModelClass clone() const {
-    ModelClass copy;
-    for (const auto& p : properties) copy.properties.push_back(deepCopy(p));
-    for (const auto& m : methods) copy.methods.push_back(deepCopy(m));
+  Class clone() const {
+    Class copy{object.clone(), model};
+    for (Numbers& numbers : copy.model) {
+      for (auto& number : numbers) number = std::make_shared<Uint32>(*number);
+    }
     return copy;
   }
 };
 
-template <class Object, class Model>
-struct Pair {
-  Object object;
-  Model model;
+struct Qualifier {
+  CIMQualifier object;
+  std::shared_ptr<Uint32> model;
 };
 
-void print(std::string& out, const CIMConstQualifier& q) {
-  const CString name = q.getName().getString().getCString();
-  Uint32 value = 0;
-  q.getValue().get(value);
-  out += "[" + std::string(name) + std::to_string(value) + "]";
+template <class Handle>
+Uint32 numberOf(const Handle& qualifier) {
+  Uint32 number = 0;
+  qualifier.getValue().get(number);
+  return number;
 }
 
-template <class Reader>
-void printQualifiers(std::string& out, const Reader& owner) {
-  for (Uint32 i = 0; i < owner.getQualifierCount(); ++i) print(out, owner.getQualifier(i));
-}
-
-std::string print(const CIMConstClass& cls) {
-  std::string out;
-  for (Uint32 i = 0; i < cls.getPropertyCount(); ++i) {
-    const CIMConstProperty p = cls.getProperty(i);
-    Uint32 value = 0;
-    p.getValue().get(value);
-    out += " p" + std::to_string(value);
-    printQualifiers(out, p);
+template <class Element>
+void expectNumbers(const Element& element, const Numbers& numbers) {
+  ASSERT_EQ(element.getQualifierCount(), numbers.size());
+  for (Uint32 i = 0; i < numbers.size(); ++i) {
+    ASSERT_EQ(numberOf(element.getQualifier(i)), *numbers[i]);
   }
-  for (Uint32 i = 0; i < cls.getMethodCount(); ++i) {
-    const CIMConstMethod m = cls.getMethod(i);
-    out += " m";
-    printQualifiers(out, m);
-    for (Uint32 j = 0; j < m.getParameterCount(); ++j) {
-      out += " a";
-      printQualifiers(out, m.getParameter(j));
-    }
-  }
-  return out;
-}
-
-void print(std::string& out, const char* prefix, const ElementPtr& element) {
-  out += prefix;
-  for (const auto& q : element->qualifiers) {
-    out += "[" + q->name + std::to_string(q->value) + "]";
-  }
-  for (const auto& part : element->parts) print(out, " a", part);
-}
-
-std::string print(const ModelClass& cls) {
-  std::string out;
-  for (const auto& p : cls.properties) print(out, (" p" + std::to_string(p->value)).c_str(), p);
-  for (const auto& m : cls.methods) print(out, " m", m);
-  return out;
 }
 
 class Walk {
  public:
-  explicit Walk(unsigned seed) : random_(seed) { classes_.push_back(freshClass()); }
+  explicit Walk(unsigned seed) : random_(seed) {
+    Class first;
+    CIMMethod method(CIMName("m"), CIMTYPE_UINT32);
+    method.addParameter(CIMParameter(CIMName("a"), CIMTYPE_UINT32));
+    first.object.addProperty(CIMProperty(CIMName("x"), Uint32(0)));
+    first.object.addProperty(CIMProperty(CIMName("y"), Uint32(0)));
+    first.object.addMethod(method);
+    classes_.push_back(first);
+    for (int i = 0; i < 12; ++i) addQualifier();
+  }
 
   void step() {
-    switch (below(9)) {
+    switch (below(8)) {
       case 0:
-        if (classes_.size() < 6) cloneClass();
+        if (classes_.size() < 6) classes_.push_back(anyOf(classes_).clone());
         break;
       case 1:
-        if (classes_.size() > 2) classes_.erase(classes_.begin() + below(classes_.size()));
+        if (classes_.size() > 2) dropAny(classes_);
         break;
       case 2:
       case 3:
         takeHandle();
         break;
       case 4:
-        if (!held_.empty()) held_.erase(held_.begin() + below(held_.size()));
+        if (!held_.empty()) dropAny(held_);
         break;
       case 5:
         addQualifier();
@@ -125,134 +84,85 @@ class Walk {
       case 6:
         removeQualifier();
         break;
-      case 7:
-        setPropertyValue();
-        break;
       default:
-        changeThroughHandle();
+        if (!held_.empty()) {
+          Qualifier& changed = anyOf(held_);
+          *changed.model = ++last_;
+          changed.object.setValue(last_);
+        }
     }
   }
 
   void check() const {
-    for (const auto& c : classes_) ASSERT_EQ(print(CIMConstClass(c.object)), print(c.model));
-    for (const auto& h : held_) {
-      std::string actual;
-      print(actual, h.object);
-      ASSERT_EQ(actual, "[" + h.model->name + std::to_string(h.model->value) + "]");
+    for (const Class& each : classes_) {
+      const CIMConstClass object(each.object);
+      const CIMConstMethod method = object.getMethod(0);
+      expectNumbers(object.getProperty(0), each.model[0]);
+      expectNumbers(object.getProperty(1), each.model[1]);
+      expectNumbers(method, each.model[2]);
+      expectNumbers(method.getParameter(0), each.model[3]);
     }
+    for (const Qualifier& each : held_) ASSERT_EQ(numberOf(each.object), *each.model);
   }
 
  private:
-  using Class = Pair<CIMClass, ModelClass>;
-  using Qualifier = Pair<CIMQualifier, QualifierPtr>;
+  std::size_t below(std::size_t n) { return random_() % n; }
 
-  int below(std::size_t n) { return static_cast<int>(random_() % n); }
-
-  Qualifier freshQualifier() {
-    const std::string name = "q" + std::to_string(++names_) + "_";
-    return {CIMQualifier(CIMName(name.c_str()), Uint32(1)),
-            std::make_shared<ModelQualifier>(ModelQualifier{1, name})};
+  template <class T>
+  T& anyOf(std::vector<T>& list) {
+    return list[below(list.size())];
+  }
+  template <class T>
+  void dropAny(std::vector<T>& list) {
+    list.erase(list.begin() + static_cast<std::ptrdiff_t>(below(list.size())));
   }
 
-  template <class Object>
-  void decorate(Object& object, ModelElement& model) {
-    for (int i = 0; i < 3; ++i) {
-      const Qualifier q = freshQualifier();
-      object.addQualifier(q.object);
-      model.qualifiers.push_back(q.model);
-    }
-  }
-
-  Class freshClass() {
-    Class c{CIMClass(CIMName("A")), {}};
-    for (const char* name : {"x", "y"}) {
-      CIMProperty p(CIMName(name), Uint32(0));
-      c.model.properties.push_back(std::make_shared<ModelElement>());
-      decorate(p, *c.model.properties.back());
-      c.object.addProperty(p);
-    }
-    CIMMethod m(CIMName("m"), CIMTYPE_UINT32);
-    auto method = std::make_shared<ModelElement>();
-    decorate(m, *method);
-    CIMParameter a(CIMName("a"), CIMTYPE_UINT32);
-    method->parts.push_back(std::make_shared<ModelElement>());
-    decorate(a, *method->parts.back());
-    m.addParameter(a);
-    c.object.addMethod(m);
-    c.model.methods.push_back(method);
-    return c;
-  }
-
-  Class& anyClass() { return classes_[static_cast<std::size_t>(below(classes_.size()))]; }
-
-  /// Calls `use` with something that has qualifiers, and its model.
+  /// Calls `use` with any element of any class and the numbers of its qualifiers.
   template <class Use>
-  void withElement(Class& c, Use use) {
-    const int which = below(4);
-    if (which < 2) {
-      CIMProperty p = c.object.getProperty(static_cast<Uint32>(which));
-      use(p, *c.model.properties[static_cast<std::size_t>(which)]);
-    } else if (which == 2) {
-      CIMMethod m = c.object.getMethod(0);
-      use(m, *c.model.methods[0]);
-    } else {
-      CIMParameter a = c.object.getMethod(0).getParameter(0);
-      use(a, *c.model.methods[0]->parts[0]);
-    }
-  }
-
-  void cloneClass() {
-    const Class& source = anyClass();
-    Class copy{source.object.clone(), source.model.clone()};
-    classes_.push_back(copy);
+  void withElement(Use use) {
+    Class& any = anyOf(classes_);
+    const std::size_t which = below(4);
+    CIMMethod method = any.object.getMethod(0);
+    CIMParameter parameter = method.getParameter(0);
+    CIMProperty property = any.object.getProperty(static_cast<Uint32>(which % 2));
+    if (which < 2) use(property, any.model[which]);
+    if (which == 2) use(method, any.model[which]);
+    if (which == 3) use(parameter, any.model[which]);
   }
 
   void takeHandle() {
-    withElement(anyClass(), [this](auto& object, ModelElement& model) {
-      if (model.qualifiers.empty()) return;
-      const int i = below(model.qualifiers.size());
-      held_.push_back({object.getQualifier(static_cast<Uint32>(i)),
-                       model.qualifiers[static_cast<std::size_t>(i)]});
+    withElement([this](auto& element, Numbers& numbers) {
+      if (numbers.empty()) return;
+      const std::size_t i = below(numbers.size());
+      held_.push_back({element.getQualifier(static_cast<Uint32>(i)), numbers[i]});
     });
   }
 
+  // Half of them are qualifiers that lie elsewhere already.
   void addQualifier() {
-    // Half of them are qualifiers that lie elsewhere already.
-    const Qualifier q = !held_.empty() && below(2)
-                            ? held_[static_cast<std::size_t>(below(held_.size()))]
-                            : freshQualifier();
-    withElement(anyClass(), [&](auto& object, ModelElement& model) {
-      if (object.findQualifier(q.object.getName()) != PEG_NOT_FOUND) return;
-      object.addQualifier(q.object);
-      model.qualifiers.push_back(q.model);
+    const bool shared = !held_.empty() && below(2) == 0;
+    const CIMName name(("q" + std::to_string(++last_) + "_").c_str());
+    const Qualifier added =
+        shared ? anyOf(held_)
+               : Qualifier{CIMQualifier(name, last_), std::make_shared<Uint32>(last_)};
+    withElement([&](auto& element, Numbers& numbers) {
+      if (element.findQualifier(added.object.getName()) != PEG_NOT_FOUND) return;
+      element.addQualifier(added.object);
+      numbers.push_back(added.model);
     });
   }
 
   void removeQualifier() {
-    withElement(anyClass(), [this](auto& object, ModelElement& model) {
-      if (model.qualifiers.empty()) return;
-      const int i = below(model.qualifiers.size());
-      object.removeQualifier(static_cast<Uint32>(i));
-      model.qualifiers.erase(model.qualifiers.begin() + i);
+    withElement([this](auto& element, Numbers& numbers) {
+      if (numbers.empty()) return;
+      const std::size_t i = below(numbers.size());
+      element.removeQualifier(static_cast<Uint32>(i));
+      numbers.erase(numbers.begin() + static_cast<std::ptrdiff_t>(i));
     });
   }
 
-  void setPropertyValue() {
-    Class& c = anyClass();
-    const Uint32 value = ++names_;
-    c.object.getProperty(1).setValue(value);
-    c.model.properties[1]->value = value;
-  }
-
-  void changeThroughHandle() {
-    if (held_.empty()) return;
-    Qualifier& q = held_[static_cast<std::size_t>(below(held_.size()))];
-    q.model->value = ++names_;
-    q.object.setValue(q.model->value);
-  }
-
   std::mt19937 random_;
-  Uint32 names_ = 0;
+  Uint32 last_ = 0;
   std::vector<Class> classes_;
   std::vector<Qualifier> held_;
 };
@@ -264,7 +174,7 @@ TEST(CloneModel, EveryObjectSeesItsOwnChangesOnly) {
     for (int i = 0; i < 400; ++i) {
       walk.step();
       walk.check();
-      if (HasFatalFailure()) return;
+      if (testing::Test::HasFatalFailure()) return;
     }
   }
 }

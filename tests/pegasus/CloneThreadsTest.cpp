@@ -12,8 +12,6 @@ using namespace Pegasus;
 
 namespace {
 
-constexpr int kRounds = 400;
-
 CIMClass makeClass() {
   CIMClass cls(CIMName("A"));
   for (int i = 0; i < 5; ++i) {
@@ -46,7 +44,7 @@ bool changeClone(CIMClass cls, Uint32 number) {
 }
 
 TEST(CloneThreads, ClonesAreIndependentFromTheFirst) {
-  for (int round = 0; round < kRounds / 10; ++round) {
+  for (int round = 0; round < 40; ++round) {
     // Fresh, so that the threads race for the very first clone.
     const CIMClass shared = makeClass();
     std::atomic<int> good{0};
@@ -64,20 +62,6 @@ TEST(CloneThreads, ClonesAreIndependentFromTheFirst) {
     EXPECT_EQ(good, 60);
     EXPECT_TRUE(shared.identical(makeClass()));
   }
-}
-
-TEST(CloneThreads, TwoClonesShareNothingThatChanges) {
-  const CIMClass original = makeClass();
-  for (int round = 0; round < kRounds; ++round) {
-    CIMClass mine = original.clone();
-    CIMClass theirs = mine.clone();
-    bool theirsGood = false;
-    std::thread thread([&] { theirsGood = changeClone(std::move(theirs), 2); });
-    const bool mineGood = changeClone(std::move(mine), 1);
-    thread.join();
-    EXPECT_TRUE(mineGood && theirsGood);
-  }
-  EXPECT_TRUE(original.identical(makeClass()));
 }
 
 }  // namespace

@@ -1,10 +1,7 @@
 // What must not compile, so that sources which build here also build against a CIM server.
 #include <Pegasus/Common/CIMClass.h>
-#include <Pegasus/Common/CIMParamValue.h>
-#include <Pegasus/Common/CIMValue.h>
 #include <gtest/gtest.h>
 
-#include <string>
 #include <type_traits>
 #include <utility>
 
@@ -14,31 +11,6 @@ namespace {
 
 template <class From, class To>
 constexpr bool kConverts = std::is_convertible_v<From, To>;
-
-template <class T, class = void>
-constexpr bool kGets = false;
-template <class T>
-constexpr bool kGets<T, std::void_t<decltype(std::declval<CIMValue&>().get(std::declval<T&>()))>> =
-    true;
-
-TEST(Portability, ConversionsAreThoseOfTheServersApi) {
-  EXPECT_FALSE((std::is_constructible_v<CIMValue, long>));
-  EXPECT_FALSE((std::is_constructible_v<CIMValue, unsigned long>));
-  EXPECT_FALSE((std::is_constructible_v<CIMValue, std::string>));
-  EXPECT_FALSE(kGets<long>);
-  EXPECT_FALSE(kGets<std::string>);
-  EXPECT_TRUE(kGets<Sint64>);
-  EXPECT_TRUE((kConverts<Array<CIMInstance>, CIMValue>));
-
-  EXPECT_FALSE((kConverts<CIMObject, CIMInstance>));
-  EXPECT_FALSE((kConverts<CIMObject, CIMClass>));
-  EXPECT_TRUE((std::is_constructible_v<CIMInstance, CIMObject>));
-  EXPECT_TRUE((std::is_constructible_v<CIMClass, CIMObject>));
-  EXPECT_TRUE((kConverts<CIMInstance, CIMObject>));
-  EXPECT_TRUE((kConverts<CIMClass, CIMObject>));
-  EXPECT_TRUE((kConverts<CIMName, CIMInstance>));
-  EXPECT_FALSE((kConverts<String, CIMInstance>));
-}
 
 template <class X, class ConstX>
 void expectOneWay() {

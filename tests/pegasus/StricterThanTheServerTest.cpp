@@ -48,12 +48,6 @@ TEST(StricterString, AppendsPartsOfItself) {
   EXPECT_EQ(text(str.subString(str.size() - 3)), "aaa");
 }
 
-TEST(StricterString, RemovesNothingPastTheEnd) {
-  String str("abc");
-  EXPECT_THROW(str.remove(4), IndexOutOfBoundsException);
-  EXPECT_EQ(text(str), "abc");
-}
-
 TEST(StricterString, PrintsTextOfAnyLength) {
   String str("x");
   str.appendPrintf("=%d %s", 5, std::string(2000, 'y').c_str());
