@@ -1,4 +1,6 @@
-// Malformed text and the whole message that it gives: the error, then the elements around it.
+// Malformed text and the whole message that it gives: the error, then the elements around it. More
+// errors, without the elements, stand in the table of docs/definition-files.md, which is tested
+// too.
 
 #include <gtest/gtest.h>
 
@@ -34,7 +36,6 @@ auto within(const std::string& before, const std::string& context, std::vector<E
 const std::string kCall = "\nfunctioncall:\n";
 const std::string kInModule = "\nmodule:m\n";
 const std::vector<ErrorCase> kModuleErrors = {
-    {"OtherElement", "<class/>", "the end of module element missing before: class"},
     {"Text", " some text <b>", "the end of module element missing before: some text"},
     {"NoCallContent", "<functioncall/></module>",
      "function elememt is missing before: module" + kCall},
@@ -44,7 +45,6 @@ ERRORS(Module, within("<plugin><module name='m'>", kInModule, kModuleErrors));
 const std::string kInit = "<plugin><module name='m'><functioncall>";
 const std::string kFunction = "<function name='f' type='getI'/>";
 const std::vector<ErrorCase> kCallErrors = {
-    {"ArgumentFirst", "<argument type='index'/>", "function elememt is missing before: argument"},
     {"Text", kFunction + "5", "Unexpected elememt before: 5"},
     {"FunctionEnd", "<function name='f' type='getI'><argument/>",
      "end of the function element missing before: argument\nfunction:f\n"},
@@ -54,7 +54,6 @@ ERRORS(Call, within(kInit, kCall + kInModule, kCallErrors));
 
 const std::string kElement = "<argument type='element'>";
 const std::vector<ErrorCase> kArgumentErrors = {
-    {"Kind", "<argument type='inout'/>", "invalid attribute: inout"},
     {"NoKind", "<argument/>", "invalid attribute: "},
     {"OtherElement", kElement + "<string>", "Unexpected element in the function element: string"},
     {"NoElement", "<argument type='element'/></functioncall>",
@@ -65,8 +64,6 @@ const std::vector<ErrorCase> kArgumentErrors = {
      "the end of argument element missing before: 1"},
     {"ConstantEnd", kElement + "<constant type='int'>1<b/>",
      "the end of constant element missing before: b"},
-    {"QueryEnd", kElement + "<cimproperty>A.B<b/>",
-     "the end of cimproperty element missing before: b"},
     {"NestedCall", kElement + "<functioncall><function name='g'/><argument type='x'/>",
      "invalid attribute: x\nargument:\n" + kCall}};
 ERRORS(Argument, within(kInit + kFunction, "\nargument:\n" + kCall + kInModule, kArgumentErrors));
@@ -76,13 +73,10 @@ const std::string kNoInstances = "instance elememt is missing in class element b
 const std::string kNoCount =
     "constant or functioncall elememt is missing in class element before: ";
 const std::vector<ErrorCase> kClassErrors = {
-    {"PropertyFirst", "<property name='P'>", kNoInstances + "property"},
     {"EndOfFile", "", kNoInstances},
-    {"InstancesText", "<instances>3</instances>", kNoCount + "3"},
     {"NoInstancesContent", "<instances/><property name='P'>", kNoCount + "property"},
     {"InstancesEnd", "<instances><constant type='int'>1</constant>2",
      "end of the instances element is missing before: 2"},
-    {"OtherChild", kOneInstance + "<association>", "Unexpected elememt: association"},
     {"MethodWithConstant", kOneInstance + "<method name='M'><constant type='int'>",
      "functioncall element is missing before: constant\nmethod:M\n"},
     {"MethodEnd",
@@ -98,16 +92,12 @@ const std::string kNoValue =
     "constant or functioncall elememt is missing in property element before: ";
 const std::vector<ErrorCase> kPropertyErrors = {
     {"NoGet", "<set>", "get element is missing before: set"},
-    {"SetInGet", "<get><set>", kNoValue + "set"},
     {"NoGetContent", "<get/></property>", kNoValue + "property"},
     {"TextInSet", kGet + "<set>1", kNoValue + "1"},
-    {"GetEnd", "<get>" + kConstant + "<set>", "end of the get element is missing before: set"},
     {"TwoConversions", "<get>" + kConstant + "<conversion type='valuemap'/><conversion/>",
      "end of the get element is missing before: conversion"},
     {"SetEnd", kGet + "<set>" + kConstant + "<conversion/>",
-     "end of the set element is missing before: conversion"},
-    {"ConversionAfterSet", kGet + "<set>" + kConstant + "</set><conversion type='valuemap'/>",
-     "end of the property element is missing before: conversion"}};
+     "end of the set element is missing before: conversion"}};
 ERRORS(Property,
        within(kClassBody + "<property name='P'>", "\nproperty:P\n" + kInClass, kPropertyErrors));
 
@@ -117,23 +107,15 @@ const std::string kPair = "<classname name='X'/><classname name='Y'/>";
 const std::vector<ErrorCase> kAssociationErrors = {
     {"OneClass", "<classname name='X'/></association>",
      "classname element is missing before : association"},
-    {"ConditionAfterOneClass", "<classname name='X'/><condition>",
-     "classname element is missing before : condition"},
-    {"ThreeClasses", kPair + "<classname/>", "condition element is missing before : classname"},
     {"NoCondition", kPair + "</association>", "condition element is missing before : association"},
-    {"OtherElement", "<class name='C'>", "Unexpected element: class"},
-    {"OtherInClassname", "<classname name='X'><property/>", "Unexpected element: property"},
     {"EndOfFile", kPair + "<condition><true/></condition>", "Unexpected element: "}};
 ERRORS(Association, within(kAssociation, kInAssociation, kAssociationErrors));
 
 const std::string kInCondition = "\ncondition:\n";
 const std::string kUnexpected = "Unexpected element in condition: ";
 const std::vector<ErrorCase> kConditionErrors = {
-    {"Operator", "<equals>", kUnexpected + "equals"},
     {"NoOperator", "</condition>", kUnexpected + "condition"},
-    {"ElementForOperand", "<equal><argument/>", kUnexpected + "argument"},
     {"OneOperand", "<partof>0</partof>", kUnexpected + "partof"},
-    {"OtherClosing", "<include>0 1</equal>", kUnexpected + "equal"},
     {"OneSubCondition", "<and><condition><true/></condition></and>",
      kUnexpected + "and" + kInCondition},
     {"Nested", "<or><condition><and><condition><xor>",
