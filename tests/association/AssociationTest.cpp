@@ -11,8 +11,6 @@
 
 namespace {
 
-using testing::ElementsAre;
-using testing::IsEmpty;
 using Values = ProviderDefAssociation::Values;
 
 std::string group(const std::string& first, const std::string& second, const std::string& content) {
@@ -137,7 +135,6 @@ INSTANTIATE_TEST_SUITE_P(
                  {0},
                  {{7}},
                  {1}},
-        LinkCase{"NoInstances", group("A", "None", "<true/>"), "A", "None", 0, {}, {{}}, {}},
         LinkCase{
             "NegativeNumber", group("A", "Broken", "<true/>"), "A", "Broken", 0, {}, {{}}, {}}),
     kCaseName);
@@ -171,17 +168,6 @@ TEST_F(Associations, TheOtherClassIsThatOfTheFirstPairWithTheName) {
   EXPECT_EQ(built.getPair("s"), "S");
   EXPECT_EQ(built.getPair("Q"), "");
   EXPECT_EQ(built.getPair(""), "");
-}
-
-TEST_F(Associations, ClassPropertiesAreThoseOfTheFirstEntry) {
-  const auto built = element<ProviderDefAssociation>(
-      "<association><classname name='X'/><classname name='Y'><propertyname name='p'/>"
-      "<propertyname name='q'/></classname><condition><true/></condition>"
-      "<classname name='x'><propertyname name='r'/></classname><classname name='y'/>"
-      "<condition><true/></condition></association>");
-  EXPECT_THAT(built.getClassProperties("x"), IsEmpty());
-  EXPECT_THAT(built.getClassProperties("y"), ElementsAre("p", "q"));
-  EXPECT_THAT(built.getClassProperties(""), IsEmpty());
 }
 
 TEST_F(Associations, AreFoundByNameAndByTheClassesOfEachPair) {
