@@ -1,24 +1,12 @@
 // The byte tables of docs/plugins.md, laid before the code that writes and reads such buffers.
 
-#include <gmock/gmock.h>
-#include <unistd.h>
-
-#include <filesystem>
 #include <fstream>
-#include <iterator>
-#include <memory>
 #include <regex>
 #include <sstream>
 
-#include "engine/ProviderDefFunction.h"
-#include "engine/ProviderDefModule.h"
-
-using testing::ElementsAre;
-using testing::SizeIs;
+#include "tests/engine/RecorderTest.h"
 
 namespace {
-
-using Values = std::vector<ProviderDefValue>;
 
 // One line of a table, " 8  61 62 63 00   a b c NUL", put at its place.
 void addLine(const std::string& line, std::string& bytes) {
@@ -51,59 +39,33 @@ std::vector<std::string> byteTables() {
   return result;
 }
 
-class ByteTables : public testing::Test {
+class ByteTables : public RecorderTest {
  protected:
-  ByteTables() { module_.reset(new ProviderDefModule(text_.data(), size(), &consumed_)); }
-
-  int size() const { return static_cast<int>(text_.size()); }
-
   // What an execC function delivers that writes these bytes.
-  Values outputs(const std::string& bytes) {
-    const auto file =
-        std::filesystem::temp_directory_path() / ("bytes-" + std::to_string(getpid()) + ".bin");
-    std::ofstream(file, std::ios::binary) << bytes;
+  std::string outputs(const std::string& bytes) {
+    answer(bytes);
     Values result;
-    ProviderDefFunction function("bytesOfFile", functionTypeCode("execCw"), module_.get());
-    EXPECT_EQ(function.exec(ProviderDefValue(file.string()), Values(), result),
-              static_cast<int>(bytes.size()));
-    std::filesystem::remove(file);
-    return result;
+    function("execC").exec(Values(), result);
+    return valueText(result);
   }
 
-  const std::string text_ = "<module name='" BYTES_PLUGIN "'/>";
-  int consumed_ = 0;
-  std::unique_ptr<ProviderDefModule> module_;
   const std::vector<std::string> tables_ = byteTables();
-  const ProviderDefFunction function_{"f", functionTypeCode("getI"), nullptr};
 };
 
-TEST_F(ByteTables, ShowWhatAPluginReads) {
-  ASSERT_THAT(tables_, SizeIs(6));
+TEST_F(ByteTables, ShowWhatPluginsReadAndWrite) {
+  ASSERT_EQ(tables_.size(), 6u);
+  const ProviderDefFunction packer("f", functionTypeCode("getI"), nullptr);
   CallBuffer text, texts;
-  char* end = function_.packS(text.begin(), text.end(), "abc");
+  char* end = packer.packS(text.begin(), text.end(), "abc");
   EXPECT_EQ(std::string(text.begin(), end), tables_[0]);
-  end = function_.packAS(texts.begin(), texts.end(), {"a", "bc"});
+  end = packer.packAS(texts.begin(), texts.end(), {"a", "bc"});
   EXPECT_EQ(std::string(texts.begin(), end), tables_[1]);
-}
-
-TEST_F(ByteTables, ShowArraysThatArrive) {
-  ASSERT_THAT(tables_, SizeIs(6));
-  EXPECT_THAT(function_.makeAI(tables_[2].data(), nullptr, tables_[2].data() + tables_[2].size()),
-              ElementsAre(7, -1));
-  EXPECT_THAT(function_.makeAS(tables_[3].data(), nullptr, tables_[3].data() + tables_[3].size()),
-              ElementsAre("rw", "sync"));
-}
-
-TEST_F(ByteTables, ShowListsThatArrive) {
-  ASSERT_THAT(tables_, SizeIs(6));
-  const Values both = outputs(tables_[4]);
-  ASSERT_THAT(both, SizeIs(2));
-  EXPECT_EQ(both[0].getStringValue(), "ok");
-  EXPECT_EQ(both[1].getType(), ProviderDefValue::kInteger);
-  EXPECT_EQ(both[1].getIntValue(), 5);
-  const Values one = outputs(tables_[5]);
-  ASSERT_THAT(one, SizeIs(1));
-  EXPECT_EQ(one[0].getStringValue(), "ok");
+  answer(tables_[2]);
+  EXPECT_EQ(valueText(function("getAI").get()), "2 {7, -1}");
+  answer(tables_[3]);
+  EXPECT_EQ(valueText(function("getAS").get()), "3 {rw, sync}");
+  EXPECT_EQ(outputs(tables_[4]), "1 ok; 0 5; ");
+  EXPECT_EQ(outputs(tables_[5]), "1 ok; ");
 }
 
 }  // namespace

@@ -2,20 +2,19 @@
 
 #include <gmock/gmock.h>
 
-#include <fstream>
-#include <iterator>
 #include <regex>
 
 #include "definition/DefinitionFile.h"
 #include "definition/ProviderDefXMLError.h"
 #include "engine/Registry.h"
+#include "tests/support/TemporaryTree.h"
 
 namespace {
 
 std::string fileText(const std::string& name) {
-  std::ifstream file(std::string(PROJECT_FOLDER) + "/" + name);
-  EXPECT_TRUE(file.good()) << name;
-  return {std::istreambuf_iterator<char>(file), {}};
+  const std::string text = TemporaryTree::read(std::string(PROJECT_FOLDER) + "/" + name);
+  EXPECT_FALSE(text.empty()) << name;
+  return text;
 }
 
 struct Quotation {
