@@ -1,31 +1,22 @@
 /* A plug-in that keeps a number for each of three instances and tolerates any number of threads. */
-#include <pthread.h>
 #include <stdio.h>
 
 #include "commonprovider/plugin.h"
 
 enum { kInstances = 3 };
 
-static pthread_mutex_t lock = PTHREAD_MUTEX_INITIALIZER;
 static int inits;
 static int numbers[kInstances];
 
 CP_FUNCTION(getI, threads_init);
 int threads_init(void) {
-  pthread_mutex_lock(&lock);
-  ++inits;
-  pthread_mutex_unlock(&lock);
-  return 0;
+  return __atomic_add_fetch(&inits, 1, __ATOMIC_SEQ_CST);
 }
 
 /* How often the initialisation call ran. */
 CP_FUNCTION(getI, threads_inits);
 int threads_inits(void) {
-  int count;
-  pthread_mutex_lock(&lock);
-  count = inits;
-  pthread_mutex_unlock(&lock);
-  return count;
+  return __atomic_load_n(&inits, __ATOMIC_SEQ_CST);
 }
 
 CP_FUNCTION(getI, threads_count);
@@ -40,18 +31,12 @@ int threads_name(void* out, int index) {
 
 CP_FUNCTION(getIi, threads_get);
 int threads_get(int index) {
-  int number;
-  pthread_mutex_lock(&lock);
-  number = numbers[index];
-  pthread_mutex_unlock(&lock);
-  return number;
+  return __atomic_load_n(&numbers[index], __ATOMIC_SEQ_CST);
 }
 
 CP_FUNCTION(setIi, threads_set);
 int threads_set(int value, int index) {
-  pthread_mutex_lock(&lock);
-  numbers[index] = value;
-  pthread_mutex_unlock(&lock);
+  __atomic_store_n(&numbers[index], value, __ATOMIC_SEQ_CST);
   return 0;
 }
 
