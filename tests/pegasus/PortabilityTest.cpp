@@ -33,15 +33,4 @@ TEST(Portability, ConstVariantsOnlyRead) {
   expectOneWay<CIMObject, CIMConstObject>();
 }
 
-TEST(Portability, AConstContainerYieldsConstElements) {
-  EXPECT_TRUE((std::is_same_v<decltype(std::declval<const CIMInstance&>().getProperty(0)),
-                              CIMConstProperty>));
-  EXPECT_TRUE((std::is_same_v<decltype(std::declval<CIMInstance&>().getProperty(0)), CIMProperty>));
-  EXPECT_TRUE(
-      (std::is_same_v<decltype(std::declval<CIMConstClass&>().getMethod(0)), CIMConstMethod>));
-  EXPECT_TRUE((std::is_same_v<decltype(std::declval<CIMMethod&>().getParameter(0)), CIMParameter>));
-  EXPECT_TRUE((std::is_same_v<decltype(std::declval<CIMConstProperty&>().getQualifier(0)),
-                              CIMConstQualifier>));
-}
-
 }  // namespace

@@ -205,9 +205,6 @@ TEST(String, Prints) {
   std::ostringstream out;
   out << String("a\xC3\xA9\xE2\x82\xAC");
   EXPECT_EQ(out.str(), "a\xE9\\x20AC");
-  String str("x");
-  str.appendPrintf("=%d %s", 5, "y");
-  EXPECT_EQ(text(str), "x=5 y");
 }
 
 TEST(String, HoldsLongText) {
