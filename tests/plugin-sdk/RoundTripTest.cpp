@@ -53,14 +53,7 @@ TEST_P(RoundTrip, ListsOfEveryShapeComeBack) {
 }
 
 TEST_P(RoundTrip, WhatDoesNotFitAListEndsIt) {
-  const auto text = [](size_t size) { return std::string(size, 'x'); };
-  for (const Values& fits :
-       {Values{text(1011)}, Values{text(1003), 5}, Values{Ints(125, 9)}, Values{Texts{text(979)}},
-        Values{7, Texts{text(971)}}, Values{text(491), Texts{text(479)}}}) {
-    EXPECT_EQ(exec("echo", fits), valueText(fits) + "-> 0");
-    EXPECT_EQ(exec("echoWhole", fits), valueText(fits) + "-> 0");
-  }
-  const Values over{7, Texts{text(972)}, 8};
+  const Values over{7, Texts{std::string(972, 'x')}, 8};
   EXPECT_EQ(exec("echoWhole", over), "0 7; -> 4") << "8 is not the second parameter";
   EXPECT_EQ(exec("echo", over), "0 7; 3 {}; 0 8; -> 0") << "only the element is left out";
 }
