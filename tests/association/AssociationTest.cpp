@@ -31,115 +31,58 @@ std::string classText(const std::string& name, int instances) {
 const std::string kSame = "<equal>0 0</equal>";
 const std::string kSameAsNext = "<equal>0 1</equal>";
 
-struct LinkCase {
-  const char* name;
-  std::string groups;
-  const char *source, *target;
-  int index;
-  Values sourceValues;
-  std::vector<Values> targetValues;
-  std::vector<int> linked;
-};
-
-class Link : public Registered, public testing::WithParamInterface<LinkCase> {};
+class Associations : public Registered {};
 
 // Two has two instances, None has none and Broken a negative number; other classes are unknown.
-TEST_P(Link, GivesTheTargetsByIndex) {
-  const LinkCase& c = GetParam();
+TEST_F(Associations, GiveTheTargetsByIndex) {
+  const struct {
+    std::string groups;
+    const char *source, *target;
+    Values sourceValues;
+    std::vector<Values> targetValues;
+    std::vector<int> linked;
+  } cases[] = {
+      {group("A", "B", "<true/>"), "A", "C", {}, {{}}, {}},
+      {group("A", "B", "<true/>"), "A", "A", {}, {{}}, {}},
+      {group("A", "B", kSameAsNext),
+       "a",
+       "b",
+       {"x", "y"},
+       {{"x", "y"}, {"y", "x"}, {"z", "x"}},
+       {1, 2}},
+      // The pair's first class stays side 1: it is the target here.
+      {group("B", "A", kSameAsNext),
+       "A",
+       "B",
+       {"x", "y"},
+       {{"x", "y"}, {"y", "x"}, {"y", "y"}},
+       {1, 2}},
+      {group("A", "a", kSameAsNext), "A", "A", {"x", "y"}, {{"x", "y"}, {"y", "x"}}, {1}},
+      // By pair first, then by index; nothing is sorted or made unique.
+      {group("A", "B", kSame) + group("B", "A", "<true/>"), "A", "B", {5}, {{4}, {5}}, {1, 0, 1}},
+      {group("A", "C", "<true/>") + group("A", "B", "<false/>") + group("A", "B", "<true/>"),
+       "A",
+       "B",
+       {},
+       {{}},
+       {0}},
+      {"", "A", "B", {}, {{}}, {}},
+      {group("A", "B", "<true/>"), "A", "B", {}, {{}, {}, {}}, {0, 1, 2}},
+      {group("A", "Two", "<true/>"), "A", "two", {}, {{}, {}, {}}, {0, 1}},
+      {group("A", "Two", "<equal>0 0</equal>"), "A", "Two", {0}, {{7}}, {1}},
+      {group("A", "Broken", "<true/>"), "A", "Broken", {}, {{}}, {}},
+  };
   ASSERT_EQ(errorOfReading(kModule + classText("Two", 2) + classText("None", 0) +
                            classText("Broken", -5)),
             "");
-  const auto built = element<ProviderDefAssociation>(association("A", c.groups));
-  StdoutCapture quiet;
-  const auto linked =
-      built.getAssociation(c.source, c.index, c.sourceValues, c.target, c.targetValues);
-  quiet.text();
-  EXPECT_EQ(linked, c.linked);
+  for (const auto& c : cases) {
+    const auto built = element<ProviderDefAssociation>(association("A", c.groups));
+    StdoutCapture quiet;
+    const auto linked = built.getAssociation(c.source, 0, c.sourceValues, c.target, c.targetValues);
+    quiet.text();
+    EXPECT_EQ(linked, c.linked) << c.groups;
+  }
 }
-
-INSTANTIATE_TEST_SUITE_P(
-    Orientation, Link,
-    testing::Values(
-        LinkCase{"NoPair", group("A", "B", "<true/>"), "A", "C", 0, {}, {{}}, {}},
-        LinkCase{"SameClassTwiceIsNoPair", group("A", "B", "<true/>"), "A", "A", 0, {}, {{}}, {}},
-        LinkCase{"Forward",
-                 group("A", "B", kSameAsNext),
-                 "a",
-                 "b",
-                 0,
-                 {"x", "y"},
-                 {{"x", "y"}, {"y", "x"}, {"z", "x"}},
-                 {1, 2}},
-        // The pair's first class stays side 1: it is the target here.
-        LinkCase{"Reverse",
-                 group("B", "A", kSameAsNext),
-                 "A",
-                 "B",
-                 0,
-                 {"x", "y"},
-                 {{"x", "y"}, {"y", "x"}, {"y", "y"}},
-                 {1, 2}},
-        LinkCase{"EqualNamesAreForward",
-                 group("A", "a", kSameAsNext),
-                 "A",
-                 "A",
-                 0,
-                 {"x", "y"},
-                 {{"x", "y"}, {"y", "x"}},
-                 {1}},
-        // By pair first, then by index; nothing is sorted or made unique.
-        LinkCase{"TwoPairs",
-                 group("A", "B", kSame) + group("B", "A", "<true/>"),
-                 "A",
-                 "B",
-                 0,
-                 {5},
-                 {{4}, {5}},
-                 {1, 0, 1}},
-        LinkCase{
-            "OtherPairsAreLeftOut",
-            group("A", "C", "<true/>") + group("A", "B", "<false/>") + group("A", "B", "<true/>"),
-            "A",
-            "B",
-            0,
-            {},
-            {{}},
-            {0}},
-        LinkCase{"NoGroup", "", "A", "B", 0, {}, {{}}, {}}),
-    kCaseName);
-
-INSTANTIATE_TEST_SUITE_P(
-    Count, Link,
-    testing::Values(
-        LinkCase{"UnknownTargetCountsItsValues",
-                 group("A", "B", "<true/>"),
-                 "A",
-                 "B",
-                 0,
-                 {},
-                 {{}, {}, {}},
-                 {0, 1, 2}},
-        LinkCase{"KnownTargetCountsItself",
-                 group("A", "Two", "<true/>"),
-                 "A",
-                 "two",
-                 0,
-                 {},
-                 {{}, {}, {}},
-                 {0, 1}},
-        LinkCase{"MissingValuesAreEmpty",
-                 group("A", "Two", "<equal>0 0</equal>"),
-                 "A",
-                 "Two",
-                 0,
-                 {0},
-                 {{7}},
-                 {1}},
-        LinkCase{
-            "NegativeNumber", group("A", "Broken", "<true/>"), "A", "Broken", 0, {}, {{}}, {}}),
-    kCaseName);
-
-class Associations : public Registered {};
 
 TEST_F(Associations, TheWholeTraceGoesToStandardOutput) {
   const auto built = element<ProviderDefAssociation>(association(
