@@ -4,6 +4,8 @@
 
 #include <sys/socket.h>
 
+#include <utility>
+
 namespace cimhost {
 
 void ClientConnection::begin(std::shared_ptr<Exchange> exchange, Clock::time_point deadline) {
@@ -13,11 +15,21 @@ void ClientConnection::begin(std::shared_ptr<Exchange> exchange, Clock::time_poi
   exchange_.swap(previous);
   deadline_ = deadline;
   warned_ = false;
+  endSeen_ = false;
+}
+
+// The library learns of events, not of states: an end that arrives together with the bytes before
+// it goes unseen. Seen twice, because bytes may be on their way through the library.
+bool ClientConnection::isAbandoned() {
+  if (exchange_ != nullptr && exchange_->isSubmitted()) return false;
+  char byte = 0;
+  const bool ended = recv(socket_, &byte, 1, MSG_PEEK | MSG_DONTWAIT) == 0;
+  return std::exchange(endSeen_, ended) && ended;
 }
 
 void ClientConnection::expire(Clock::time_point now, Clock::duration grace) {
   const std::lock_guard<std::mutex> lock(mutex_);
-  if (now < deadline_) return;
+  if (now < deadline_ && !isAbandoned()) return;
   if (exchange_ == nullptr || warned_ || !exchange_->cut("took too long")) {
     shutdown(socket_, SHUT_RDWR);
   }

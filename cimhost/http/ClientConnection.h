@@ -75,10 +75,13 @@ class ClientConnection {
   void begin(std::shared_ptr<Exchange> exchange, Clock::time_point deadline);
   /// When the deadline has passed: ends the request with status 503 or, when it is not complete or
   /// was given `grace` already, the connection.
+  /// Ends the connection as well when the client has left in the middle of a request.
   void expire(Clock::time_point now, Clock::duration grace);
   void cut();
 
  private:
+  bool isAbandoned();
+
   int socket_;
   std::string address_;
   std::string group_;
@@ -87,6 +90,7 @@ class ClientConnection {
   std::shared_ptr<Exchange> exchange_;
   Clock::time_point deadline_ = Clock::time_point::max();
   bool warned_ = false;
+  bool endSeen_ = false;
 };
 
 }  // namespace cimhost

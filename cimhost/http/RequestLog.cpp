@@ -4,12 +4,15 @@
 #include "cimhost/output/DisplayText.h"
 
 #include <fcntl.h>
+#include <limits.h>
+#include <poll.h>
 #include <unistd.h>
 
 #include <algorithm>
 #include <cerrno>
 #include <cstring>
 #include <ctime>
+#include <string_view>
 #include <utility>
 
 namespace cimhost {
@@ -103,13 +106,16 @@ void RequestLog::reopen() {
 void RequestLog::append(std::string line) {
   line += '\n';
   const std::lock_guard<std::mutex> lock(mutex_);
-  const char* next = line.data();
-  const char* const end = next + line.size();
-  while (next < end) {
-    const ssize_t written = ::write(descriptor_, next, static_cast<std::size_t>(end - next));
+  std::string_view rest = line;
+  while (!rest.empty()) {
+    pollfd entry{descriptor_, POLLOUT, 0};
+    if (poll(&entry, 1, 0) == 0) return;
+    // A pipe that is ready takes as much without a wait.
+    const ssize_t written =
+        ::write(descriptor_, rest.data(), std::min<std::size_t>(rest.size(), PIPE_BUF));
     if (written < 0 && errno == EINTR) continue;
     if (written <= 0) return;
-    next += written;
+    rest.remove_prefix(static_cast<std::size_t>(written));
   }
 }
 

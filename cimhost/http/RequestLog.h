@@ -25,8 +25,9 @@ struct RequestRecord {
 /// quotes with escapes. `-` is an empty one.
 std::string toLogLine(const RequestRecord& record, std::chrono::system_clock::time_point time);
 
-/// Writes lines to a file, each with one system call, or to standard error. May be used from
-/// several threads. Lines that cannot be written are lost.
+/// Writes lines to a file or to standard error, each with one system call unless it is very long.
+/// May be used from several threads. Lines that cannot be written at once are lost: nobody waits
+/// for the reader of a pipe.
 class RequestLog {
  public:
   /// Appends to `file`; empty: standard error. Throws HostError.

@@ -148,6 +148,9 @@ TEST_F(HttpServerTest, AClientThatGoesAwayEndsTheHandler) {
   const RequestRecord record = records(1).at(0);
   EXPECT_FALSE(record.complete);
   EXPECT_LT(written(), 50000000U);
+  // The end comes together with the bytes before it, long before the connection has been silent.
+  for (int i = 0; i < 20; ++i) HttpClient(port()).send("POST / HTTP/1.1\r\nHost: x\r\n");
+  EXPECT_EQ(records(21).size(), 21U);
   EXPECT_EQ(ask(post("x")).status, 200);
 }
 

@@ -5,6 +5,7 @@
 #include "cimhost/HostError.h"
 
 #include <gmock/gmock.h>
+#include <unistd.h>
 
 namespace {
 
@@ -67,6 +68,24 @@ TEST(RequestLogTest, ReopeningFollowsTheName) {
   log.reopen();
   log.write({});
   EXPECT_THROW(RequestLog(file.string()), HostError);
+}
+
+TEST(RequestLogTest, NobodyWaitsForTheReaderOfAPipe) {
+  int ends[2];
+  ASSERT_EQ(pipe(ends), 0);
+  {
+    RequestLog log("/proc/self/fd/" + std::to_string(ends[1]));
+    for (int i = 0; i < 3000; ++i) log.message("line " + std::to_string(i));
+    std::string text(1U << 20U, ' ');
+    text.resize(static_cast<std::size_t>(read(ends[0], text.data(), text.size())));
+    EXPECT_THAT(text, HasSubstr(" line 1000\n"));
+    EXPECT_EQ(text.back(), '\n');
+    log.message("again");
+    text.resize(static_cast<std::size_t>(read(ends[0], text.data(), text.size())));
+    EXPECT_THAT(text, EndsWith("Z again\n"));
+  }
+  close(ends[0]);
+  close(ends[1]);
 }
 
 }  // namespace
