@@ -11,9 +11,6 @@ using namespace Pegasus;
 
 namespace {
 
-using Step = AssociationPlan::Step;
-using Wants = bool (AssociationPlan::*)(const Step&, const CIMName&) const;
-
 // A class, which a provider may deliver as well as an instance, fails the request.
 DeliveryBuffer<CIMObject> instanceBuffer(InstanceShaper& shaper, InstanceSink& sink) {
   return DeliveryBuffer<CIMObject>([&](const CIMObject& object) {
@@ -21,35 +18,38 @@ DeliveryBuffer<CIMObject> instanceBuffer(InstanceShaper& shaper, InstanceSink& s
   });
 }
 
-// Calls call(association class, handler) for each step of the plan.
-template <class Handler, class Object, class Call>
-void follow(const AssociationPlan& plan, Wants wants, DeliveryBuffer<Object>& buffer, Call call) {
-  for (const Step& step : plan.steps()) {
+}  // namespace
+
+template <class Handler, class Request, class Object, class Call>
+void Operations::follow(const Request& request,
+                        bool (AssociationPlan::*wants)(const AssociationPlan::Step&, const CIMName&)
+                            const,
+                        DeliveryBuffer<Object> buffer, Call call) const {
+  const AssociationPlan plan = planFor(request.nameSpace, request.objectName, request.filter);
+  const CIMObjectPath path = providerPath(request.nameSpace, request.objectName);
+  for (const AssociationPlan::Step& step : plan.steps()) {
     Handler handler(
         buffer, [&](const Object& object) { return (plan.*wants)(step, object.getClassName()); });
-    callProvider(buffer, [&] { call(step.associationClass, handler); });
+    callProvider(buffer, [&] { call(path, step.associationClass, handler); });
   }
   buffer.finish();
 }
-
-}  // namespace
 
 OperationStatus Operations::associators(const OperationContext& context,
                                         const AssociatorsRequest& request,
                                         InstanceSink& sink) const {
   return runOperation([&] {
-    const AssociationPlan plan = planFor(request.nameSpace, request.objectName, request.filter);
-    const CIMObjectPath path = providerPath(request.nameSpace, request.objectName);
+    const AssociationFilter& filter = request.filter;
     const InstanceSelection& selection = request.selection;
     InstanceShaper shaper = associatedShaper(request.nameSpace, selection);
-    DeliveryBuffer<CIMObject> buffer = instanceBuffer(shaper, sink);
-    const auto call = [&](const CIMName& association, ObjectResponseHandler& handler) {
-      associationProvider().associators(context, path, association, request.filter.resultClass,
-                                        request.filter.role, request.filter.resultRole,
-                                        selection.includeQualifiers, selection.includeClassOrigin,
-                                        selection.propertyList, handler);
-    };
-    follow<AssociatedObjects>(plan, &AssociationPlan::wantsResult, buffer, call);
+    follow<AssociatedObjects>(
+        request, &AssociationPlan::wantsResult, instanceBuffer(shaper, sink),
+        [&](const CIMObjectPath& path, const CIMName& association, ObjectResponseHandler& handler) {
+          associationProvider().associators(
+              context, path, association, filter.resultClass, filter.role, filter.resultRole,
+              selection.includeQualifiers, selection.includeClassOrigin, selection.propertyList,
+              handler);
+        });
   });
 }
 
@@ -57,15 +57,14 @@ OperationStatus Operations::associatorNames(const OperationContext& context,
                                             const AssociatorNamesRequest& request,
                                             ObjectPathSink& sink) const {
   return runOperation([&] {
-    const AssociationPlan plan = planFor(request.nameSpace, request.objectName, request.filter);
-    const CIMObjectPath path = providerPath(request.nameSpace, request.objectName);
-    DeliveryBuffer<CIMObjectPath> buffer = placedPaths(request.nameSpace, sink);
-    const auto call = [&](const CIMName& association, ObjectPathResponseHandler& handler) {
-      associationProvider().associatorNames(context, path, association, request.filter.resultClass,
-                                            request.filter.role, request.filter.resultRole,
-                                            handler);
-    };
-    follow<EnumeratedPaths>(plan, &AssociationPlan::wantsResult, buffer, call);
+    const AssociationFilter& filter = request.filter;
+    follow<EnumeratedPaths>(
+        request, &AssociationPlan::wantsResult, placedPaths(request.nameSpace, sink),
+        [&](const CIMObjectPath& path, const CIMName& association,
+            ObjectPathResponseHandler& handler) {
+          associationProvider().associatorNames(context, path, association, filter.resultClass,
+                                                filter.role, filter.resultRole, handler);
+        });
   });
 }
 
@@ -74,17 +73,15 @@ OperationStatus Operations::associatorNames(const OperationContext& context,
 OperationStatus Operations::references(const OperationContext& context,
                                        const ReferencesRequest& request, InstanceSink& sink) const {
   return runOperation([&] {
-    const AssociationPlan plan = planFor(request.nameSpace, request.objectName, request.filter);
-    const CIMObjectPath path = providerPath(request.nameSpace, request.objectName);
     const InstanceSelection& selection = request.selection;
     InstanceShaper shaper = associatedShaper(request.nameSpace, selection);
-    DeliveryBuffer<CIMObject> buffer = instanceBuffer(shaper, sink);
-    const auto call = [&](const CIMName& association, ObjectResponseHandler& handler) {
-      associationProvider().references(context, path, association, request.filter.role,
-                                       selection.includeQualifiers, selection.includeClassOrigin,
-                                       selection.propertyList, handler);
-    };
-    follow<AssociatedObjects>(plan, &AssociationPlan::wantsReference, buffer, call);
+    follow<AssociatedObjects>(
+        request, &AssociationPlan::wantsReference, instanceBuffer(shaper, sink),
+        [&](const CIMObjectPath& path, const CIMName& association, ObjectResponseHandler& handler) {
+          associationProvider().references(
+              context, path, association, request.filter.role, selection.includeQualifiers,
+              selection.includeClassOrigin, selection.propertyList, handler);
+        });
   });
 }
 
@@ -92,14 +89,13 @@ OperationStatus Operations::referenceNames(const OperationContext& context,
                                            const ReferenceNamesRequest& request,
                                            ObjectPathSink& sink) const {
   return runOperation([&] {
-    const AssociationPlan plan = planFor(request.nameSpace, request.objectName, request.filter);
-    const CIMObjectPath path = providerPath(request.nameSpace, request.objectName);
-    DeliveryBuffer<CIMObjectPath> buffer = placedPaths(request.nameSpace, sink);
-    const auto call = [&](const CIMName& association, ObjectPathResponseHandler& handler) {
-      associationProvider().referenceNames(context, path, association, request.filter.role,
-                                           handler);
-    };
-    follow<EnumeratedPaths>(plan, &AssociationPlan::wantsReference, buffer, call);
+    follow<EnumeratedPaths>(request, &AssociationPlan::wantsReference,
+                            placedPaths(request.nameSpace, sink),
+                            [&](const CIMObjectPath& path, const CIMName& association,
+                                ObjectPathResponseHandler& handler) {
+                              associationProvider().referenceNames(context, path, association,
+                                                                   request.filter.role, handler);
+                            });
   });
 }
 

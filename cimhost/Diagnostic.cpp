@@ -1,5 +1,6 @@
 #include "cimhost/Diagnostic.h"
 
+#include "cimhost/Text.h"
 #include "cimhost/output/DisplayText.h"
 
 #include <algorithm>
@@ -27,10 +28,6 @@ std::string displayLines(const std::string& text) {
 std::string withBlanks(std::string text) {
   std::replace(text.begin(), text.end(), '\t', ' ');
   return text;
-}
-
-bool isContinuation(char byte) {
-  return (static_cast<unsigned char>(byte) & 0xC0) == 0x80;
 }
 
 }  // namespace

@@ -85,6 +85,13 @@ class Operations {
   AssociationPlan planFor(const Pegasus::CIMNamespaceName& nameSpace,
                           const Pegasus::CIMObjectPath& objectName,
                           const AssociationFilter& filter) const;
+  /// Calls call(the object's path for the provider, association class, handler) for each step of
+  /// the plan; what `wants` says yes to goes to the buffer.
+  template <class Handler, class Request, class Object, class Call>
+  void follow(const Request& request,
+              bool (AssociationPlan::*wants)(const AssociationPlan::Step&, const Pegasus::CIMName&)
+                  const,
+              DeliveryBuffer<Object> buffer, Call call) const;
   DeliveryBuffer<Pegasus::CIMObjectPath> placedPaths(const Pegasus::CIMNamespaceName& nameSpace,
                                                      ObjectPathSink& sink) const;
   InstanceShaper associatedShaper(const Pegasus::CIMNamespaceName& nameSpace,

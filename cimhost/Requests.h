@@ -91,17 +91,7 @@ struct AssociatorNamesRequest {
 
 /// `filter.associationClass` is what DSP0200 calls ResultClass here; `filter.resultClass` and
 /// `filter.resultRole` are not used.
-struct ReferencesRequest {
-  Pegasus::CIMNamespaceName nameSpace;
-  Pegasus::CIMObjectPath objectName;
-  AssociationFilter filter;
-  InstanceSelection selection;  ///< deepInheritance and localOnly are not used.
-};
-
-struct ReferenceNamesRequest {
-  Pegasus::CIMNamespaceName nameSpace;
-  Pegasus::CIMObjectPath objectName;
-  AssociationFilter filter;
-};
+using ReferencesRequest = AssociatorsRequest;
+using ReferenceNamesRequest = AssociatorNamesRequest;
 
 }  // namespace cimhost

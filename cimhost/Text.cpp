@@ -29,23 +29,24 @@ Lead leadOf(unsigned char byte) {
 
 }  // namespace
 
+bool isContinuation(char byte) {
+  return (static_cast<unsigned char>(byte) & 0xC0) == 0x80;
+}
+
 void appendUtf8(std::string& text, std::uint32_t codePoint) {
   const auto put = [&text](std::uint32_t byte) { text += static_cast<char>(byte); };
-  if (codePoint < 0x80) {
-    put(codePoint);
-  } else if (codePoint < 0x800) {
-    put(0xC0 | (codePoint >> 6));
-    put(0x80 | (codePoint & 0x3F));
+  if (codePoint < 0x80) return put(codePoint);
+  if (codePoint < 0x800) {
+    put(0xC0 | codePoint >> 6);
   } else if (codePoint < 0x10000) {
-    put(0xE0 | (codePoint >> 12));
-    put(0x80 | ((codePoint >> 6) & 0x3F));
-    put(0x80 | (codePoint & 0x3F));
+    put(0xE0 | codePoint >> 12);
+    put(0x80 | (codePoint >> 6 & 0x3F));
   } else {
-    put(0xF0 | (codePoint >> 18));
-    put(0x80 | ((codePoint >> 12) & 0x3F));
-    put(0x80 | ((codePoint >> 6) & 0x3F));
-    put(0x80 | (codePoint & 0x3F));
+    put(0xF0 | codePoint >> 18);
+    put(0x80 | (codePoint >> 12 & 0x3F));
+    put(0x80 | (codePoint >> 6 & 0x3F));
   }
+  put(0x80 | (codePoint & 0x3F));
 }
 
 std::string toUtf8(const Pegasus::String& text) {
@@ -80,13 +81,13 @@ std::string toValidUtf8(const std::string& text) {
   return result;
 }
 
-std::int32_t nextCodePoint(const std::string& text, std::size_t& position) {
+std::int32_t nextCodePoint(std::string_view text, std::size_t& position) {
   const Lead lead = leadOf(static_cast<unsigned char>(text[position++]));
   if (lead.followers < 0) return -1;
   std::uint32_t value = lead.bits;
   std::size_t at = position;
   for (int i = 0; i < lead.followers; ++i, ++at) {
-    if (at >= text.size() || (static_cast<unsigned char>(text[at]) & 0xC0) != 0x80) return -1;
+    if (at >= text.size() || !isContinuation(text[at])) return -1;
     value = (value << 6) | (static_cast<unsigned char>(text[at]) & 0x3Fu);
   }
   const bool surrogate = value >= 0xD800 && value <= 0xDFFF;

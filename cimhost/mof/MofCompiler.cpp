@@ -1,8 +1,9 @@
 #include "cimhost/mof/MofCompiler.h"
 
+#include "cimhost/Text.h"
 #include "cimhost/mof/MofKeywords.h"
 #include "cimhost/mof/MofValue.h"
-#include "cimhost/mof/Utf8.h"
+#include "cimhost/mof/Printable.h"
 #include "cimhost/repository/ClassDeclarationError.h"
 
 namespace cimhost {
@@ -87,7 +88,7 @@ class DeclarationBuilder {
     try {
       return action();
     } catch (const Pegasus::Exception& exception) {
-      fail(offset, shortened(utf8Text(exception.getMessage()), 200));
+      fail(offset, shortened(toUtf8(exception.getMessage()), 200));
     }
   }
 
@@ -209,17 +210,17 @@ std::size_t placeOf(const ClassDeclarationError::Part& part,
     throw MofError(source, declaration.name.offset,
                    "class " + quoted(declaration.name) + " is declared already");
   }
-  throw MofError(source, placeOf(error.part(), declaration), utf8Text(error.getMessage()));
+  throw MofError(source, placeOf(error.part(), declaration), toUtf8(error.getMessage()));
 }
 
 }  // namespace
 
 std::string mofClassKey(const CIMNamespaceName& nameSpace, const std::string& name) {
-  return asciiLowered(utf8Text(nameSpace.getString()) + ":class:" + name);
+  return asciiLowered(toUtf8(nameSpace.getString()) + ":class:" + name);
 }
 
 std::string mofQualifierKey(const CIMNamespaceName& nameSpace, const std::string& name) {
-  return asciiLowered(utf8Text(nameSpace.getString()) + ":qualifier:" + name);
+  return asciiLowered(toUtf8(nameSpace.getString()) + ":qualifier:" + name);
 }
 
 void MofCompiler::add(const MofUnit::Item& item) {
@@ -234,7 +235,7 @@ void MofCompiler::add(const MofUnit::Item& item) {
       addClass(item, *cimClass);
     }
   } catch (const Pegasus::Exception& exception) {
-    throw MofError(*item.source, name.offset, utf8Text(exception.getMessage()));
+    throw MofError(*item.source, name.offset, toUtf8(exception.getMessage()));
   }
 }
 

@@ -1,6 +1,6 @@
 #include "cimhost/mof/MofDiagnostic.h"
 
-#include "cimhost/mof/Utf8.h"
+#include "cimhost/mof/Printable.h"
 
 namespace cimhost {
 

@@ -1,5 +1,6 @@
 #include "cimhost/mof/MofDirectoryReader.h"
 
+#include "cimhost/Text.h"
 #include "cimhost/mof/MofValue.h"
 
 #include <algorithm>
@@ -64,7 +65,7 @@ void MofDirectoryReader::addFile(const std::string& path, const std::string& fol
   file.nameSpace = defaultNameSpace;
   if (folder.empty()) return;
   try {
-    file.nameSpace = Pegasus::CIMNamespaceName(toPegasusString(folder));
+    file.nameSpace = Pegasus::CIMNamespaceName(fromUtf8(folder));
   } catch (const Pegasus::Exception&) {  // A file name need not even be UTF-8.
     file.diagnostic = wholeFileDiagnostic(path, "the names of its folders are not a namespace");
   }
@@ -80,7 +81,7 @@ void MofDirectoryReader::open(File& file) {
   } catch (const std::runtime_error& error) {
     file.diagnostic = wholeFileDiagnostic(file.path, error.what());
   } catch (const Pegasus::Exception& exception) {
-    file.diagnostic = wholeFileDiagnostic(file.path, utf8Text(exception.getMessage()));
+    file.diagnostic = wholeFileDiagnostic(file.path, toUtf8(exception.getMessage()));
   }
 }
 

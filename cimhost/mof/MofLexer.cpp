@@ -1,8 +1,9 @@
 #include "cimhost/mof/MofLexer.h"
 
+#include "cimhost/Text.h"
 #include "cimhost/mof/MofKeywords.h"
 #include "cimhost/mof/MofNumber.h"
-#include "cimhost/mof/Utf8.h"
+#include "cimhost/mof/Printable.h"
 
 namespace cimhost {
 namespace {
@@ -39,7 +40,7 @@ std::string quoted(std::uint32_t character) {
     return "character U+" + hexadecimal(character, 4);
   }
   std::string text = "'";
-  appendCodePoint(text, character);
+  appendUtf8(text, character);
   return text + '\'';
 }
 
@@ -55,14 +56,14 @@ void MofLexer::fail(std::size_t offset, const std::string& message) const {
 
 // Every character that is not plain ASCII passes here, in comments too.
 std::uint32_t MofLexer::takeCharacter() {
-  const Utf8Character character = decodeUtf8(source_.text, offset_);
-  if (character.length == 0) {
-    const auto byte = static_cast<unsigned char>(source_.text[offset_]);
-    fail(offset_, "byte 0x" + hexadecimal(byte, 2) + " is not valid UTF-8");
+  const std::size_t start = offset_;
+  const std::int32_t codePoint = nextCodePoint(source_.text, offset_);
+  if (codePoint < 0) {
+    const auto byte = static_cast<unsigned char>(source_.text[start]);
+    fail(start, "byte 0x" + hexadecimal(byte, 2) + " is not valid UTF-8");
   }
-  if (character.codePoint == 0) fail(offset_, "NUL byte in the text");
-  offset_ += character.length;
-  return character.codePoint;
+  if (codePoint == 0) fail(start, "NUL byte in the text");
+  return static_cast<std::uint32_t>(codePoint);
 }
 
 void MofLexer::skipLineComment() {
@@ -205,13 +206,13 @@ void MofLexer::readString(MofToken& token) {
   ++offset_;
   std::uint32_t high = 0;  // A high surrogate that waits for its low half: \xD83D\xDE00.
   const auto flush = [&] {
-    if (high != 0) appendCodePoint(token.text, high);
+    if (high != 0) appendUtf8(token.text, high);
     high = 0;
   };
   while (atEnd() || source_.text[offset_] != '"') {
     const std::uint32_t character = readQuoted(token.offset, "string");
     if (high != 0 && character >= 0xDC00 && character <= 0xDFFF) {
-      appendCodePoint(token.text, 0x10000 + ((high - 0xD800) << 10) + (character - 0xDC00));
+      appendUtf8(token.text, 0x10000 + ((high - 0xD800) << 10) + (character - 0xDC00));
       high = 0;
       continue;
     }
@@ -219,7 +220,7 @@ void MofLexer::readString(MofToken& token) {
     if (character >= 0xD800 && character <= 0xDBFF) {
       high = character;
     } else {
-      appendCodePoint(token.text, character);
+      appendUtf8(token.text, character);
     }
   }
   flush();

@@ -1,7 +1,7 @@
 #include "cimhost/mof/MofParser.h"
 
 #include "cimhost/mof/MofKeywords.h"
-#include "cimhost/mof/Utf8.h"
+#include "cimhost/mof/Printable.h"
 
 #include <algorithm>
 

@@ -1,5 +1,6 @@
 #include "cimhost/mof/MofReader.h"
 
+#include "cimhost/Text.h"
 #include "cimhost/mof/MofCompiler.h"
 #include "cimhost/mof/MofDirectoryReader.h"
 #include "cimhost/mof/MofUnit.h"
@@ -40,7 +41,7 @@ bool MofReader::readSource(MofSourcePtr source, const Pegasus::CIMNamespaceName&
   } catch (const MofError& error) {
     diagnostics_.push_back(error.diagnostic());
   } catch (const Pegasus::Exception& exception) {
-    diagnostics_.push_back(wholeFileDiagnostic(name, utf8Text(exception.getMessage())));
+    diagnostics_.push_back(wholeFileDiagnostic(name, toUtf8(exception.getMessage())));
   }
   return false;
 }

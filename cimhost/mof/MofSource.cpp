@@ -1,6 +1,6 @@
 #include "cimhost/mof/MofSource.h"
 
-#include "cimhost/mof/Utf8.h"
+#include "cimhost/mof/Printable.h"
 
 #include <fcntl.h>
 #include <sys/stat.h>

@@ -1,8 +1,9 @@
 #include "cimhost/mof/MofUnit.h"
 
+#include "cimhost/Text.h"
 #include "cimhost/mof/MofKeywords.h"
 #include "cimhost/mof/MofValue.h"
-#include "cimhost/mof/Utf8.h"
+#include "cimhost/mof/Printable.h"
 
 #include <filesystem>
 #include <stdexcept>
@@ -26,7 +27,7 @@ std::string canonicalPath(const std::string& path) {
 }
 
 bool MofFileSet::add(const std::string& path, const Pegasus::CIMNamespaceName& nameSpace) {
-  return files_.insert(asciiLowered(utf8Text(nameSpace.getString())) + ':' + path).second;
+  return files_.insert(asciiLowered(toUtf8(nameSpace.getString())) + ':' + path).second;
 }
 
 void MofFileSet::countBytes(std::size_t size) {
@@ -100,7 +101,7 @@ void MofUnit::include(const MofPragma& pragma) {
 
 void MofUnit::changeNamespace(const MofPragma& pragma) {
   Level& level = levels_.back();
-  const Pegasus::String name = toPegasusString(pragma.parameter.text);
+  const Pegasus::String name = fromUtf8(pragma.parameter.text);
   if (!Pegasus::CIMNamespaceName::legal(name)) {
     throw MofError(*level.source, pragma.parameter.offset,
                    '\'' + shortened(pragma.parameter.text, 60) + "' is not a namespace");

@@ -1,7 +1,8 @@
 #include "cimhost/mof/MofValue.h"
 
 #include "cimhost/CimTypes.h"
-#include "cimhost/mof/Utf8.h"
+#include "cimhost/Text.h"
+#include "cimhost/mof/Printable.h"
 
 #include <limits>
 #include <type_traits>
@@ -53,7 +54,7 @@ class LiteralConverter {
       return Pegasus::Char16(literal_.unit);
     } else if constexpr (std::is_same_v<T, Pegasus::String>) {
       require(Kind::string);
-      return toPegasusString(literal_.text);
+      return fromUtf8(literal_.text);
     } else if constexpr (std::is_same_v<T, Pegasus::CIMDateTime> ||
                          std::is_same_v<T, Pegasus::CIMObjectPath>) {
       return parse<T>();
@@ -114,7 +115,7 @@ class LiteralConverter {
   T parse() const {
     require(Kind::string);
     try {
-      return T(toPegasusString(literal_.text));
+      return T(fromUtf8(literal_.text));
     } catch (const Pegasus::Exception&) {
       const bool isDateTime = std::is_same_v<T, Pegasus::CIMDateTime>;
       fail('"' + shortened(literal_.text, 60) +
@@ -172,16 +173,8 @@ CIMValue makeNullValue(const MofElement& element) {
   return CIMValue(element.type, element.isArray, element.arraySize);
 }
 
-Pegasus::String toPegasusString(const std::string& text) {
-  return Pegasus::String(text.data(), static_cast<Pegasus::Uint32>(text.size()));
-}
-
-std::string utf8Text(const Pegasus::String& text) {
-  return std::string(static_cast<const char*>(text.getCString()));
-}
-
 Pegasus::CIMName toCimName(const MofName& name) {
-  return Pegasus::CIMName(toPegasusString(name.text));
+  return Pegasus::CIMName(fromUtf8(name.text));
 }
 
 }  // namespace cimhost

@@ -21,9 +21,6 @@ Pegasus::CIMValue makeMofValue(const MofSource& source, const MofInitializer& in
 /// Null, of the element's type.
 Pegasus::CIMValue makeNullValue(const MofElement& element);
 
-/// UTF-8, surrogates as three bytes; NUL characters are kept.
-Pegasus::String toPegasusString(const std::string& text);
-std::string utf8Text(const Pegasus::String& text);
 Pegasus::CIMName toCimName(const MofName& name);
 
 }  // namespace cimhost

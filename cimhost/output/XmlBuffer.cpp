@@ -114,8 +114,7 @@ void XmlBuffer::appendText(const Pegasus::String& text) {
   }
 }
 
-void XmlBuffer::appendText(std::string_view utf8) {
-  const std::string text(utf8);
+void XmlBuffer::appendText(std::string_view text) {
   for (std::size_t position = 0; position < text.size();) {
     char* const out = room(kLongestForm);
     const std::int32_t c = nextCodePoint(text, position);

@@ -23,7 +23,7 @@ class XmlBuffer {
   /// has no form for (control characters, lone surrogates, U+FFFE and U+FFFF, bytes that are not
   /// UTF-8) becomes U+FFFD. A carriage return is kept: a reference to it is not read everywhere.
   void appendText(const Pegasus::String& text);
-  void appendText(std::string_view utf8);
+  void appendText(std::string_view text);
 
   std::string_view view() const { return {bytes_.get(), size_}; }
   std::size_t size() const { return size_; }
