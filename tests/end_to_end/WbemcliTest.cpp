@@ -299,17 +299,19 @@ TEST_F(Wbemcli, IsToldWhatCannotBeDone) {
 
 TEST_F(Wbemcli, SeesAReplyAsItIsOnTheWire) {
   const std::string out = run("-dx gi ':Cmp_Part.Name=\"part 5\"' Owner").err;
-  EXPECT_NE(out.find("From server: Content-Type: application/xml; charset=\"utf-8\"\n"
-                     "From server: CIMOperation: MethodResponse\n"
-                     "From server: Content-Length: 379\n"
-                     "From server: <?xml version=\"1.0\" encoding=\"utf-8\" ?>\n"
-                     "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\">\n"
-                     "<MESSAGE ID=\"4711\" PROTOCOLVERSION=\"1.0\">\n<SIMPLERSP>\n"
-                     "<IMETHODRESPONSE NAME=\"GetInstance\">\n<IRETURNVALUE>\n"
-                     "<INSTANCE CLASSNAME=\"Cmp_Part\"><PROPERTY NAME=\"Owner\" TYPE=\"string\">"
-                     "<VALUE>&lt;&amp;&gt;'&quot;\\</VALUE></PROPERTY></INSTANCE>\n"
-                     "</IRETURNVALUE>\n</IMETHODRESPONSE>\n</SIMPLERSP>\n</MESSAGE>\n</CIM>\n"),
-            std::string::npos)
+  EXPECT_NE(
+      out.find(
+          "From server: Content-Type: application/xml; charset=\"utf-8\"\n"
+          "From server: CIMOperation: MethodResponse\n"
+          "From server: Content-Length: 402\n"
+          "From server: <?xml version=\"1.0\" encoding=\"utf-8\" ?>\n"
+          "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\">\n"
+          "<MESSAGE ID=\"4711\" PROTOCOLVERSION=\"1.0\">\n<SIMPLERSP>\n"
+          "<IMETHODRESPONSE NAME=\"GetInstance\">\n<IRETURNVALUE>\n"
+          "<INSTANCE CLASSNAME=\"Cmp_Part\"><PROPERTY NAME=\"Owner\" TYPE=\"string\" "
+          "CLASSORIGIN=\"Cmp_Part\"><VALUE>&lt;&amp;&gt;'&quot;\\</VALUE></PROPERTY></INSTANCE>\n"
+          "</IRETURNVALUE>\n</IMETHODRESPONSE>\n</SIMPLERSP>\n</MESSAGE>\n</CIM>\n"),
+      std::string::npos)
       << out;
 }
 
