@@ -26,57 +26,45 @@ class DefinitionCheck : public Registered {
   LogLevel level_{0};
 };
 
-struct PlaceCase {
-  const char* name;
-  std::string text;
-  int line, column;
-  std::string message, source;  // the message's first line
-};
-
-class DefinitionPlace : public DefinitionCheck, public testing::WithParamInterface<PlaceCase> {};
-
-TEST_P(DefinitionPlace, PointsAtTheUnitThatWasFound) {
-  const CheckResult result = check(GetParam().text);
-  ASSERT_EQ(result.problems.size(), 1u);
-  const Problem& problem = result.problems[0];
-  EXPECT_EQ(problem.file, "a.xml");
-  EXPECT_EQ(problem.line, GetParam().line);
-  EXPECT_EQ(problem.column, GetParam().column);
-  EXPECT_EQ(problem.message.substr(0, problem.message.find('\n')), GetParam().message);
-  EXPECT_EQ(problem.source, GetParam().source);
-  EXPECT_EQ(problem.caret, std::min(problem.column, 101));
+TEST_F(DefinitionCheck, PointsAtTheUnitThatWasFound) {
+  const std::string rest =
+      ": the rest of the file is not read (module, then classes, then associations)";
+  const struct {
+    std::string text;
+    int line, column;
+    std::string message, source;  // the message's first line
+  } cases[] = {
+      {"<plugin>\n <module name='m'>\n  <class/>\n", 3, 3,
+       "the end of module element missing before: class", "  <class/>"},
+      {"<plugin><module name='m'>\r\n\t text\r\n</module>", 2, 3,
+       "the end of module element missing before: text", "\t text"},
+      {"<plugin><module name='m'><functioncall><function name='f' type='getI'/>\n"
+       "<argument type='element'>\n<functioncall><function name='g'/><argument "
+       "type='x'/>",
+       3, 35, "invalid attribute: x", "<functioncall><function name='g'/><argument type='x'/>"},
+      {kClass + "\n<instances/>\n</class>", 3, 1,
+       "constant or functioncall elememt is missing in class element before: class", "</class>"},
+      {"<plugin><module name='m'>\n", 2, 1, "the end of module element missing before: ", ""},
+      {"\n <?xml version='1.0'?>\n" + kModule, 2, 2,
+       "not a definition file: it must begin with the plugin element", " <?xml version='1.0'?>"},
+      {kModule + "\n<association></association>\n<class name='C'/></plugin>", 3, 1,
+       "unexpected class" + rest, "<class name='C'/></plugin>"},
+      {kModule + std::string(300, ' ') + "x</plugin>", 1, 327, "unexpected x" + rest,
+       std::string(100, ' ') + "x</plugin>"},
+  };
+  for (const auto& c : cases) {
+    SCOPED_TRACE(c.text);
+    const CheckResult result = check(c.text);
+    ASSERT_EQ(result.problems.size(), 1u);
+    const Problem& problem = result.problems[0];
+    EXPECT_EQ(problem.file, "a.xml");
+    EXPECT_EQ(problem.line, c.line);
+    EXPECT_EQ(problem.column, c.column);
+    EXPECT_EQ(problem.message.substr(0, problem.message.find('\n')), c.message);
+    EXPECT_EQ(problem.source, c.source);
+    EXPECT_EQ(problem.caret, std::min(problem.column, 101));
+  }
 }
-
-const std::string kRest =
-    ": the rest of the file is not read (module, then classes, then associations)";
-
-INSTANTIATE_TEST_SUITE_P(
-    Table, DefinitionPlace,
-    testing::Values(
-        PlaceCase{"Tag", "<plugin>\n <module name='m'>\n  <class/>\n", 3, 3,
-                  "the end of module element missing before: class", "  <class/>"},
-        PlaceCase{"Text", "<plugin><module name='m'>\r\n\t text\r\n</module>", 2, 3,
-                  "the end of module element missing before: text", "\t text"},
-        PlaceCase{"Attribute",
-                  "<plugin><module name='m'><functioncall><function name='f' type='getI'/>\n"
-                  "<argument type='element'>\n<functioncall><function name='g'/><argument "
-                  "type='x'/>",
-                  3, 35, "invalid attribute: x",
-                  "<functioncall><function name='g'/><argument type='x'/>"},
-        PlaceCase{"MissingContent", kClass + "\n<instances/>\n</class>", 3, 1,
-                  "constant or functioncall elememt is missing in class element before: class",
-                  "</class>"},
-        PlaceCase{"EndOfFile", "<plugin><module name='m'>\n", 2, 1,
-                  "the end of module element missing before: ", ""},
-        PlaceCase{"NoDefinitionFile", "\n <?xml version='1.0'?>\n" + kModule, 2, 2,
-                  "not a definition file: it must begin with the plugin element",
-                  " <?xml version='1.0'?>"},
-        PlaceCase{"ClassAfterAssociation",
-                  kModule + "\n<association></association>\n<class name='C'/></plugin>", 3, 1,
-                  "unexpected class" + kRest, "<class name='C'/></plugin>"},
-        PlaceCase{"LongLine", kModule + std::string(300, ' ') + "x</plugin>", 1, 327,
-                  "unexpected x" + kRest, std::string(100, ' ') + "x</plugin>"}),
-    kCaseName);
 
 TEST_F(DefinitionCheck, ListsWhatTheFilesServeAndLeavesNothingBehind) {
   const CheckResult result =
