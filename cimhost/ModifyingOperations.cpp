@@ -7,6 +7,19 @@ namespace cimhost {
 
 using namespace Pegasus;
 
+namespace {
+
+// Of an instance that a client sends: a property that its list does not name is not to be changed
+// (DSP0200, ModifyInstance), and not every provider looks at the list.
+CIMInstance listedPart(const CIMInstance& sent, const CIMPropertyList& propertyList) {
+  if (propertyList.isNull()) return sent;
+  CIMInstance listed = sent.clone();
+  listed.instanceFilter(true, true, propertyList);
+  return listed;
+}
+
+}  // namespace
+
 OperationStatus Operations::modifyInstance(const OperationContext& context,
                                            const ModifyInstanceRequest& request) const {
   return runOperation([&] {
@@ -14,8 +27,8 @@ OperationStatus Operations::modifyInstance(const OperationContext& context,
     requireServed(request.nameSpace, name.getClassName());
     EmptyHandler handler;
     instanceProvider().modifyInstance(context, providerPath(request.nameSpace, name),
-                                      request.instance, request.includeQualifiers,
-                                      request.propertyList, handler);
+                                      listedPart(request.instance, request.propertyList),
+                                      request.includeQualifiers, request.propertyList, handler);
   });
 }
 

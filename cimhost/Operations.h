@@ -37,7 +37,8 @@ class Operations {
   OperationStatus getInstance(const Pegasus::OperationContext& context,
                               const GetInstanceRequest& request, InstanceSink& sink) const;
 
-  /// Properties and their values are not checked: a provider gets the instance as it was sent.
+  /// Properties and their values are not checked: a provider gets the instance as it was sent, less
+  /// what the property list leaves out.
   OperationStatus modifyInstance(const Pegasus::OperationContext& context,
                                  const ModifyInstanceRequest& request) const;
   OperationStatus createInstance(const Pegasus::OperationContext& context,

@@ -54,7 +54,7 @@ struct EnumerateClassNamesRequest {
 
 struct ModifyInstanceRequest {
   Pegasus::CIMNamespaceName nameSpace;
-  Pegasus::CIMInstance instance;  ///< Its path names the instance; handed to the provider as it is.
+  Pegasus::CIMInstance instance;  ///< Its path names the instance; its values are not checked.
   bool includeQualifiers = true;
   Pegasus::CIMPropertyList propertyList;  ///< Null: all properties.
 };

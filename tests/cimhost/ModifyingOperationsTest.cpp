@@ -63,17 +63,25 @@ TEST_F(ModifyingOperations, EndAsOnAServer) {
   }
 }
 
+// As it was sent, but for the properties that the client does not want to change.
 TEST_F(ModifyingOperations, TheProviderGetsTheInstanceAsSent) {
-  setenv("TEST_PROVIDER_EVENTS", "", 1);
   CIMInstance instance = instanceOf("test_ECHOPATH");
   instance.addProperty(CIMProperty(CIMName("Undeclared"), CIMValue(Uint8(1))));
   instance.addProperty(CIMProperty(CIMName("Size"), CIMValue(String("not a number"))));
-  EXPECT_TRUE(
-      host.operations.modifyInstance(context, {kNamespace, instance, false, listOf({"Size"})})
-          .ok());
-  EXPECT_THAT(getenv("TEST_PROVIDER_EVENTS"),
-              testing::MatchesRegex("//[^/]+/root/test:test_ECHOPATH\\.Name=\"a\" "
-                                    "test_ECHOPATH\\.Name=\"a\" 2 Size;"));
+  const struct {
+    CIMPropertyList list;
+    const char* received;
+  } cases[] = {{{}, "2 NULL"}, {listOf({"SIZE", "Other"}), "1 SIZE, Other"}};
+  for (const auto& row : cases) {
+    setenv("TEST_PROVIDER_EVENTS", "", 1);
+    EXPECT_TRUE(
+        host.operations.modifyInstance(context, {kNamespace, instance, false, row.list}).ok());
+    EXPECT_THAT(getenv("TEST_PROVIDER_EVENTS"),
+                testing::MatchesRegex("//[^/]+/root/test:test_ECHOPATH\\.Name=\"a\" "
+                                      "test_ECHOPATH\\.Name=\"a\" " +
+                                      std::string(row.received) + ";"));
+  }
+  EXPECT_EQ(instance.getPropertyCount(), 2u);
   EXPECT_EQ(host.operations.modifyInstance(context, {kNamespace, CIMInstance(), true, {}}).code,
             CIM_ERR_FAILED);
 }
