@@ -74,6 +74,7 @@ const std::string kNoCount =
     "constant or functioncall elememt is missing in class element before: ";
 const std::vector<ErrorCase> kClassErrors = {
     {"EndOfFile", "", kNoInstances},
+    {"InstancesText", "<instances>3</instances>", kNoCount + "3"},
     {"NoInstancesContent", "<instances/><property name='P'>", kNoCount + "property"},
     {"InstancesEnd", "<instances><constant type='int'>1</constant>2",
      "end of the instances element is missing before: 2"},
