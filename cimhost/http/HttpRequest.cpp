@@ -49,22 +49,21 @@ bool startsWithCim(const std::string& name) {
 
 }  // namespace
 
-bool HttpRequest::IgnoringCase::operator()(std::string_view left, std::string_view right) const {
-  const int order = strncasecmp(left.data(), right.data(), std::min(left.size(), right.size()));
-  return order != 0 ? order < 0 : left.size() < right.size();
-}
-
 void HttpRequest::addHeader(std::string_view name, std::string_view value) {
-  headers_.emplace(name, value);
+  headers_.emplace_back(name, value);
 }
 
 const std::string* HttpRequest::find(std::string_view name) const {
-  const auto found = headers_.find(name);
-  return found == headers_.end() ? nullptr : &found->second;
+  for (const auto& [each, value] : headers_) {
+    const bool same =
+        each.size() == name.size() && strncasecmp(each.data(), name.data(), name.size()) == 0;
+    if (same) return &value;
+  }
+  return nullptr;
 }
 
 std::optional<std::string> HttpRequest::header(std::string_view name) const {
-  const std::string* value = find(prefix_ + std::string(name));
+  const std::string* value = prefix_.empty() ? find(name) : find(prefix_ + std::string(name));
   if (value == nullptr) return std::nullopt;
   return *value;
 }

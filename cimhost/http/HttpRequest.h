@@ -4,7 +4,6 @@
 #include "cimhost/xml/CimXmlService.h"
 
 #include <cstdint>
-#include <map>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -43,17 +42,12 @@ class HttpRequest final : public CimXmlRequest {
   HttpHeaders replyHeaders(const HttpHeaders& headers) const;
 
  private:
-  struct IgnoringCase {
-    using is_transparent = void;
-    bool operator()(std::string_view left, std::string_view right) const;
-  };
-
   const std::string* find(std::string_view name) const;
   std::optional<Rejection> checkMandatory();
 
   std::string method_;
   std::string version_;
-  std::map<std::string, std::string, IgnoringCase> headers_;
+  HttpHeaders headers_;
   std::string prefix_;  // "73-" of M-POST
   std::string body_;
   std::string user_;
