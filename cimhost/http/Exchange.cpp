@@ -40,17 +40,17 @@ Exchange::Exchange(ExchangeServices& services, std::shared_ptr<ClientConnection>
 
 Exchange::~Exchange() {
   releaseBody();
-  if (!health_) services_.log(record());
+  if (!health_) services_.log(takeRecord());
   const std::lock_guard<std::mutex> lock(services_.countMutex);
   --services_.count;
   services_.ended.notify_all();
 }
 
-RequestRecord Exchange::record() const {
+RequestRecord Exchange::takeRecord() {
   RequestRecord record;
   record.client = connection_->address();
   record.user = request_.user();
-  record.summary = summary_;
+  record.summary = std::move(summary_);
   record.summary.httpStatus = sentStatus_;
   record.bytes = rejection_ ? 0 : pipe_.bytes();
   record.duration = std::chrono::duration_cast<std::chrono::milliseconds>(Clock::now() - start_);

@@ -103,7 +103,7 @@ class Exchange final : public std::enable_shared_from_this<Exchange> {
   bool authenticate();
   bool waitForTurn();
   void answer(const Rejection& rejection);
-  RequestRecord record() const;
+  RequestRecord takeRecord();
   void releaseBody();
 
   ExchangeServices& services_;

@@ -10,6 +10,7 @@ namespace cimhost {
 namespace {
 
 constexpr const char* kMandatoryUri = "http://www.dmtf.org/cim/mapping/http/v1.0";
+constexpr std::size_t kUsualHeaders = 12;
 constexpr const char* kReplyUri = "http://www.dmtf.org/cim/operation";
 
 bool isDigit(char character) {
@@ -50,6 +51,7 @@ bool startsWithCim(const std::string& name) {
 }  // namespace
 
 void HttpRequest::addHeader(std::string_view name, std::string_view value) {
+  if (headers_.empty()) headers_.reserve(kUsualHeaders);
   headers_.emplace_back(name, value);
 }
 
@@ -114,7 +116,7 @@ std::optional<Rejection> HttpRequest::checkMandatory() {
   return std::nullopt;
 }
 
-HttpHeaders HttpRequest::replyHeaders(const HttpHeaders& headers) const {
+HttpHeaders HttpRequest::replyHeaders(HttpHeaders headers) const {
   if (prefix_.empty()) return headers;
   // RFC 2774, 5: the reply tells that the mandatory extension has been applied.
   HttpHeaders result = {

@@ -39,7 +39,7 @@ class HttpRequest final : public CimXmlRequest {
   /// What Content-Length says; nullopt when it is absent, or no number.
   std::optional<std::uint64_t> contentLength() const;
   /// The headers to send for those of a reply: of M-POST the CIM ones carry the request's prefix.
-  HttpHeaders replyHeaders(const HttpHeaders& headers) const;
+  HttpHeaders replyHeaders(HttpHeaders headers) const;
 
  private:
   const std::string* find(std::string_view name) const;

@@ -124,7 +124,7 @@ MHD_Result sendReply(MHD_Connection* connection, const ExchangePointer& exchange
   Response response =
       pipe.isWhole() ? wholeResponse(pipe.takeWhole()) : streamedResponse(exchange, connection);
   if (response == nullptr) return MHD_NO;
-  addHeaders(*response, exchange->request().replyHeaders(pipe.headers()));
+  addHeaders(*response, exchange->request().replyHeaders(pipe.takeHeaders()));
   if (pipe.status() == MHD_HTTP_SERVICE_UNAVAILABLE) addHeaders(*response, {{"Retry-After", "1"}});
   if (last) MHD_add_response_header(response.get(), "Connection", "close");
   return send(connection, *exchange, pipe.status(), std::move(response));

@@ -9,6 +9,7 @@
 #include <functional>
 #include <mutex>
 #include <string>
+#include <utility>
 
 namespace cimhost {
 
@@ -42,7 +43,7 @@ class ReplyPipe final : public ReplyStream {
   /// The whole body is there. Read once isReady() was true; does not change later.
   bool isWhole() const;
   int status() const;
-  const HttpHeaders& headers() const { return headers_; }
+  HttpHeaders takeHeaders() { return std::move(headers_); }
   std::string takeWhole();
   /// Of a reply that is not whole: at most `size` bytes; 0 and a suspend when none are there yet;
   /// kEnd, kCut.

@@ -20,6 +20,7 @@ namespace cimhost {
 namespace {
 
 constexpr std::size_t kMaximumText = 200;
+constexpr std::size_t kUsualLine = 256;
 
 // ISO 8601, UTC, milliseconds.
 std::string timeText(std::chrono::system_clock::time_point time) {
@@ -42,15 +43,24 @@ bool isPlain(const std::string& text) {
 }
 
 // No text can end its quotes, or the line.
-std::string fieldText(const std::string& text) {
-  if (text.empty()) return "-";
-  if (text.size() <= kMaximumText && isPlain(text) && text != "-") return text;
+std::string quoted(const std::string& text) {
   std::string escaped;
   for (const char character : text.substr(0, kMaximumText)) {
     if (character == '"' || character == '\\') escaped += '\\';
     escaped += character;
   }
   return '"' + displayText(escaped) + (text.size() > kMaximumText ? "…" : "") + '"';
+}
+
+void appendField(std::string& line, const char* name, const std::string& text) {
+  line += name;
+  if (text.empty()) {
+    line += '-';
+  } else if (text.size() <= kMaximumText && isPlain(text) && text != "-") {
+    line += text;
+  } else {
+    line += quoted(text);
+  }
 }
 
 int openLog(const std::string& file) {
@@ -61,17 +71,20 @@ int openLog(const std::string& file) {
 
 std::string toLogLine(const RequestRecord& record, std::chrono::system_clock::time_point time) {
   const RequestSummary& summary = record.summary;
-  std::string line = timeText(time) + " client=" + record.client;
-  line += " user=" + fieldText(record.user);
-  line += " operation=" + fieldText(summary.operation);
-  line += " target=" + fieldText(summary.target);
-  line += " http=" + std::to_string(summary.httpStatus);
-  line += " cim=" + std::to_string(summary.cimStatus);
-  line += " objects=" + std::to_string(summary.objects);
-  line += " bytes=" + std::to_string(record.bytes);
-  line += " ms=" + std::to_string(record.duration.count());
+  std::string line;
+  line.reserve(kUsualLine);
+  line += timeText(time);
+  (line += " client=") += record.client;
+  appendField(line, " user=", record.user);
+  appendField(line, " operation=", summary.operation);
+  appendField(line, " target=", summary.target);
+  (line += " http=") += std::to_string(summary.httpStatus);
+  (line += " cim=") += std::to_string(summary.cimStatus);
+  (line += " objects=") += std::to_string(summary.objects);
+  (line += " bytes=") += std::to_string(record.bytes);
+  (line += " ms=") += std::to_string(record.duration.count());
   if (!record.complete) line += " incomplete";
-  if (!record.note.empty()) line += " note=" + fieldText(record.note);
+  if (!record.note.empty()) appendField(line, " note=", record.note);
   return line;
 }
 

@@ -15,6 +15,7 @@ namespace {
 // "&quot;" is the longest form of one unit.
 constexpr std::size_t kLongestForm = 6;
 constexpr std::size_t kBlock = 4096;
+constexpr std::size_t kFirstCapacity = 1024;
 
 // What stands for itself as one byte.
 constexpr std::array<bool, 128> makePlain() {
@@ -83,7 +84,7 @@ bool isPair(std::uint32_t high, std::uint32_t low) {
 }  // namespace
 
 void XmlBuffer::grow(std::size_t bytes) {
-  const std::size_t capacity = std::max(size_ + bytes, 2 * capacity_);
+  const std::size_t capacity = std::max({size_ + bytes, 2 * capacity_, kFirstCapacity});
   std::unique_ptr<char[]> larger(new char[capacity]);
   if (size_ != 0) std::memcpy(larger.get(), bytes_.get(), size_);
   bytes_ = std::move(larger);

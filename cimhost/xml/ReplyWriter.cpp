@@ -2,6 +2,8 @@
 
 #include "cimhost/Text.h"
 
+#include <utility>
+
 namespace cimhost {
 
 ReplyWriter::ReplyWriter(ReplyStream& stream, const CimMessage& message)
@@ -57,11 +59,9 @@ void ReplyWriter::appendTail() {
 }
 
 void ReplyWriter::send() {
-  if (!begun_) {
-    begun_ = true;
-    stream_.begin(200, {{"Content-Type", "application/xml; charset=\"utf-8\""},
-                        {"CIMOperation", "MethodResponse"}});
-  }
+  static const HttpHeaders kHeaders = {{"Content-Type", "application/xml; charset=\"utf-8\""},
+                                       {"CIMOperation", "MethodResponse"}};
+  if (!std::exchange(begun_, true)) stream_.begin(200, kHeaders);
   if (reading_) reading_ = stream_.write(buffer_.view());
   buffer_.clear();
 }

@@ -80,8 +80,10 @@ class TreeBuilder {
   void push(const ElementRule& rule, const char** attributes) {
     XmlElement element;
     element.rule = &rule;
+    const int count = XML_GetSpecifiedAttributeCount(parser_) / 2;
+    if (count > XmlLimits::kAttributes) throwNotValid("too many attributes");
+    element.attributes.reserve(static_cast<std::size_t>(count));
     for (; *attributes != nullptr; attributes += 2) {
-      if (element.attributes.size() == XmlLimits::kAttributes) throwNotValid("too many attributes");
       element.attributes.emplace_back(attributes[0], attributes[1]);
     }
     forEachWord(rule.attributes, [&](std::string_view each) {

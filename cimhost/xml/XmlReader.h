@@ -19,7 +19,7 @@ struct XmlLimits {
   static constexpr std::size_t kBytes = 64u << 20;
   static constexpr std::size_t kDepth = 64;
   static constexpr std::size_t kElements = 200000;
-  static constexpr std::size_t kAttributes = 16;  ///< Of one element.
+  static constexpr int kAttributes = 16;  ///< Of one element.
 };
 
 /// Reads a text whose root is one of `roots` (names, separated by blanks).
