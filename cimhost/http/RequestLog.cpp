@@ -63,6 +63,12 @@ void appendField(std::string& line, const char* name, const std::string& text) {
   }
 }
 
+template <class Number>
+void appendNumber(std::string& line, const char* name, Number number) {
+  line += name;
+  line += std::to_string(number);
+}
+
 int openLog(const std::string& file) {
   return open(file.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, 0640);
 }
@@ -74,15 +80,16 @@ std::string toLogLine(const RequestRecord& record, std::chrono::system_clock::ti
   std::string line;
   line.reserve(kUsualLine);
   line += timeText(time);
-  (line += " client=") += record.client;
+  line += " client=";
+  line += record.client;
   appendField(line, " user=", record.user);
   appendField(line, " operation=", summary.operation);
   appendField(line, " target=", summary.target);
-  (line += " http=") += std::to_string(summary.httpStatus);
-  (line += " cim=") += std::to_string(summary.cimStatus);
-  (line += " objects=") += std::to_string(summary.objects);
-  (line += " bytes=") += std::to_string(record.bytes);
-  (line += " ms=") += std::to_string(record.duration.count());
+  appendNumber(line, " http=", summary.httpStatus);
+  appendNumber(line, " cim=", summary.cimStatus);
+  appendNumber(line, " objects=", summary.objects);
+  appendNumber(line, " bytes=", record.bytes);
+  appendNumber(line, " ms=", record.duration.count());
   if (!record.complete) line += " incomplete";
   if (!record.note.empty()) appendField(line, " note=", record.note);
   return line;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <string>
 #include <string_view>
 #include <utility>
@@ -43,9 +44,9 @@ const ElementRule* findElementRule(std::string_view name);
 template <class Visit>
 void forEachWord(std::string_view list, Visit visit) {
   while (!list.empty()) {
-    const std::size_t end = list.find(' ') < list.size() ? list.find(' ') : list.size();
+    const std::size_t end = std::min(list.find(' '), list.size());
     visit(list.substr(0, end));
-    list.remove_prefix(end < list.size() ? end + 1 : end);
+    list.remove_prefix(std::min(end + 1, list.size()));
   }
 }
 
