@@ -27,8 +27,12 @@ bool ClientConnection::isAbandoned() {
   return std::exchange(endSeen_, ended) && ended;
 }
 
-void ClientConnection::expire(Clock::time_point now, Clock::duration grace) {
+void ClientConnection::expire(Clock::time_point now, Clock::duration grace,
+                              Clock::duration patience) {
   const std::lock_guard<std::mutex> lock(mutex_);
+  if (exchange_ != nullptr && exchange_->pipe().isReadSlowly(patience)) {
+    exchange_->cut("was read too slowly");
+  }
   if (now < deadline_ && !isAbandoned()) return;
   if (exchange_ == nullptr || warned_ || !exchange_->cut("took too long")) {
     shutdown(socket_, SHUT_RDWR);
@@ -71,9 +75,10 @@ void ConnectionTable::remove(ClientConnection* connection) {
 }
 
 void ConnectionTable::expire(ClientConnection::Clock::time_point now,
-                             ClientConnection::Clock::duration grace) {
+                             ClientConnection::Clock::duration grace,
+                             ClientConnection::Clock::duration patience) {
   const std::lock_guard<std::mutex> lock(mutex_);
-  for (ClientConnection* each : connections_) each->expire(now, grace);
+  for (ClientConnection* each : connections_) each->expire(now, grace, patience);
 }
 
 void ConnectionTable::cutAll() {

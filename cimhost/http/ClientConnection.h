@@ -38,7 +38,8 @@ class ConnectionTable {
   std::unique_ptr<Place> reserve(const std::string& group);
   void add(ClientConnection* connection);
   void remove(ClientConnection* connection);
-  void expire(std::chrono::steady_clock::time_point now, std::chrono::steady_clock::duration grace);
+  void expire(std::chrono::steady_clock::time_point now, std::chrono::steady_clock::duration grace,
+              std::chrono::steady_clock::duration patience);
   void cutAll();
 
  private:
@@ -76,7 +77,8 @@ class ClientConnection {
   /// When the deadline has passed: ends the request with status 503 or, when it is not complete or
   /// was given `grace` already, the connection.
   /// Ends the connection as well when the client has left in the middle of a request.
-  void expire(Clock::time_point now, Clock::duration grace);
+  /// Cuts a reply, too, that has been read too slowly for `patience`.
+  void expire(Clock::time_point now, Clock::duration grace, Clock::duration patience);
   void cut();
 
  private:

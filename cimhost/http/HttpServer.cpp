@@ -29,6 +29,9 @@ constexpr std::chrono::milliseconds kLongestWait{10000};
 // Without a descriptor for another connection.
 constexpr std::chrono::milliseconds kAcceptPause{100};
 constexpr std::chrono::milliseconds kExpiryPeriod{200};
+// With a slow reader, who keeps a thread: when others wait for one, and when none do.
+constexpr std::chrono::seconds kPatienceWhenFull{2};
+constexpr std::chrono::seconds kPatience{60};
 constexpr std::size_t kReadBlock = 32U << 10U;
 // Beside request line and headers, the memory of a connection holds what is read and written.
 constexpr std::size_t kConnectionBuffers = 16U << 10U;
@@ -403,7 +406,8 @@ void HttpServer::acceptConnections() {
 
 void HttpServer::scheduleExpiry() {
   services_.housekeeper.at(Clock::now() + kExpiryPeriod, [this] {
-    connections_.expire(Clock::now(), services_.limits.idleTimeout);
+    const auto patience = services_.pool.isFull() ? kPatienceWhenFull : kPatience;
+    connections_.expire(Clock::now(), services_.limits.idleTimeout, patience);
     scheduleExpiry();
   });
 }

@@ -23,7 +23,7 @@ void ReplyPipe::begin(int httpStatus, const HttpHeaders& headers) {
 bool ReplyPipe::write(std::string_view bytes) {
   std::unique_lock<std::mutex> lock(mutex_);
   while (!bytes.empty()) {
-    room_.wait(lock, [this] { return closed_ || cut_ || pending() < kCapacity; });
+    waitForRoom(lock);
     if (closed_ || cut_) return false;
     const std::size_t part = std::min(bytes.size(), kCapacity - pending());
     filling_.append(bytes.data(), part);
@@ -32,6 +32,14 @@ bool ReplyPipe::write(std::string_view bytes) {
     if (streaming_ && pending() >= kWorthWaking) wakeSender();
   }
   return !closed_ && !cut_;
+}
+
+void ReplyPipe::waitForRoom(std::unique_lock<std::mutex>& lock) {
+  const auto hasRoom = [this] { return closed_ || cut_ || pending() < kCapacity; };
+  if (hasRoom()) return;
+  waitsSince_ = Clock::now();
+  room_.wait(lock, hasRoom);
+  waitsSince_ = Clock::time_point::max();
 }
 
 void ReplyPipe::abort() {
@@ -115,6 +123,12 @@ ssize_t ReplyPipe::read(char* bytes, std::size_t size, const Callback& suspend) 
 bool ReplyPipe::isOver() const {
   const std::lock_guard<std::mutex> lock(mutex_);
   return closed_ || cut_;
+}
+
+bool ReplyPipe::isReadSlowly(Clock::duration patience) const {
+  const std::lock_guard<std::mutex> lock(mutex_);
+  const auto now = Clock::now();
+  return now > waitsSince_ && now - waitsSince_ > patience;
 }
 
 std::uint64_t ReplyPipe::bytes() const {

@@ -4,6 +4,7 @@
 
 #include <sys/types.h>
 
+#include <chrono>
 #include <condition_variable>
 #include <cstdint>
 #include <functional>
@@ -26,6 +27,7 @@ class ReplyPipe final : public ReplyStream {
   static constexpr std::size_t kCapacity = 256U << 10U;
 
   using Callback = std::function<void()>;
+  using Clock = std::chrono::steady_clock;
 
   /// `wake` may be called from any thread.
   explicit ReplyPipe(Callback wake) : wake_(std::move(wake)) {}
@@ -59,9 +61,13 @@ class ReplyPipe final : public ReplyStream {
   bool cut(int status);
   /// True once the reply was closed or cut: nothing that is written will be read.
   bool isOver() const;
+  /// True when the maker waits for room, and has waited longer than `patience`: in that time the
+  /// client has taken less than half of kCapacity.
+  bool isReadSlowly(Clock::duration patience) const;
   std::uint64_t bytes() const;
 
  private:
+  void waitForRoom(std::unique_lock<std::mutex>& lock);
   void wakeSender();
   std::size_t pending() const { return filling_.size() + draining_.size() - drained_; }
   void refill();
@@ -81,6 +87,7 @@ class ReplyPipe final : public ReplyStream {
   bool cut_ = false;
   bool closed_ = false;
   std::uint64_t bytes_ = 0;
+  Clock::time_point waitsSince_ = Clock::time_point::max();
 };
 
 }  // namespace cimhost

@@ -63,6 +63,11 @@ bool WorkerPool::tryPush(Task task) {
   return true;
 }
 
+bool WorkerPool::isFull() {
+  const Lock lock(mutex_);
+  return !tasks_.empty() && running_ >= threadsLimit_;
+}
+
 void WorkerPool::kick(std::size_t index) {
   const std::lock_guard<std::mutex> lock(mutex_);
   if (index >= sources_.size()) return;

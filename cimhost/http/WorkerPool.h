@@ -44,6 +44,8 @@ class WorkerPool {
   /// False when the queue is full or the pool has been stopped; the task is dropped then. Called by
   /// a source, or anywhere else.
   bool tryPush(Task task);
+  /// True when tasks wait because as many as may run are running.
+  bool isFull();
   /// Runs a source soon although its descriptor does not tell. `index`: its place in start().
   void kick(std::size_t index);
   /// Drops what waits and returns when what runs has ended and no source is watched.

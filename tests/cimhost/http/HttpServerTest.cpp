@@ -214,6 +214,24 @@ TEST_F(HttpServerTest, RequestsThatHangHoldNoOthersUp) {
   for (const auto& each : hanging) EXPECT_EQ(each->receive().body, ":wait");
 }
 
+// They keep all threads; when somebody waits for one, they are cut.
+TEST_F(HttpServerTest, SlowReadersHoldNoOthersUpForLong) {
+  settings.limits.threads = 2;
+  start();
+  std::vector<std::unique_ptr<HttpClient>> slow;
+  for (int i = 0; i < 2; ++i) {
+    slow.push_back(std::make_unique<HttpClient>(port(), 4096));
+    slow.back()->send(post("size=50000000"));
+    slow.back()->take(1000);
+  }
+  EXPECT_EQ(ask(post("x")).body, ":x");
+  EXPECT_EQ(ask(post("x")).body, ":x");
+  slow.clear();
+  for (const RequestRecord& record : records(4)) {
+    EXPECT_EQ(record.note == "was read too slowly", !record.complete) << record.note;
+  }
+}
+
 TEST_F(HttpServerTest, SilentConnectionsAreClosed) {
   settings.limits.idleTimeout = std::chrono::seconds(1);
   start();
