@@ -66,7 +66,7 @@ class TreeBuilder {
 
   void start(const char* name, const char** attributes) {
     if (++depth_ > XmlLimits::kDepth) throwNotValid("elements are nested too deeply");
-    if (++elements_ > XmlLimits::kElements) throwNotValid("too many elements");
+    countPart();
     if (!document_.problem.empty()) return;
     const ElementRule* const rule = findElementRule(name);
     const std::string_view allowed = open_.empty() ? roots_ : open_.back()->rule->children;
@@ -77,6 +77,10 @@ class TreeBuilder {
     push(*rule, attributes);
   }
 
+  void countPart() {
+    if (++parts_ > XmlLimits::kParts) throwNotValid("too many elements and attributes");
+  }
+
   void push(const ElementRule& rule, const char** attributes) {
     XmlElement element;
     element.rule = &rule;
@@ -84,6 +88,7 @@ class TreeBuilder {
     if (count > XmlLimits::kAttributes) throwNotValid("too many attributes");
     element.attributes.reserve(static_cast<std::size_t>(count));
     for (; *attributes != nullptr; attributes += 2) {
+      countPart();
       element.attributes.emplace_back(attributes[0], attributes[1]);
     }
     forEachWord(rule.attributes, [&](std::string_view each) {
@@ -123,7 +128,7 @@ class TreeBuilder {
   XmlDocument document_;
   std::vector<XmlElement*> open_;
   std::size_t depth_ = 0;
-  std::size_t elements_ = 0;
+  std::size_t parts_ = 0;
   std::exception_ptr failure_;
 };
 

@@ -18,8 +18,8 @@ struct XmlDocument {
 struct XmlLimits {
   static constexpr std::size_t kBytes = 64u << 20;
   static constexpr std::size_t kDepth = 64;
-  static constexpr std::size_t kElements = 200000;
-  static constexpr int kAttributes = 16;  ///< Of one element.
+  static constexpr std::size_t kParts = 200000;  ///< Elements and attributes together.
+  static constexpr int kAttributes = 16;         ///< Of one element.
 };
 
 /// Reads a text whose root is one of `roots` (names, separated by blanks).

@@ -92,6 +92,7 @@ TEST_F(CimXmlRefusal, Texts) {
         {"<CIM ", "<!DOCTYPE CIM SYSTEM 'x.dtd'><CIM "},
         {"", repeated("<CIM>", 100000) + repeated("</CIM>", 100000)},
         {"<VALUE>TRUE</VALUE>", repeated("<VALUE/>", 200001)},
+        {"<VALUE>TRUE</VALUE>", repeated("<VALUE a='' b='' c=''/>", 50001)},
         {"<VALUE>", "<VALUE" + attributes + ">"},
         {"", "<HTML/>"},
         {"", "<CIM CIMVERSION='2.0' DTDVERSION='2.0'/>"},
