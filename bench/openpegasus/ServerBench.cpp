@@ -157,7 +157,25 @@ std::string ask(int port, const std::string& text) {
   return reply;
 }
 
-long countInstances(const std::string& reply) {
+// A chunk may begin in the middle of a tag.
+std::string withoutChunks(const std::string& reply) {
+  auto at = reply.find("\r\n\r\n");
+  if (at == std::string::npos) return {};
+  at += 4;
+  if (reply.find("chunked") > at) return reply.substr(at);
+  std::string body;
+  while (at < reply.size()) {
+    const std::size_t size = std::strtoul(reply.c_str() + at, nullptr, 16);
+    at = reply.find("\r\n", at);
+    if (size == 0 || at == std::string::npos) break;
+    body += reply.substr(at + 2, size);
+    at += 2 + size + 2;
+  }
+  return body;
+}
+
+long countInstances(const std::string& answer) {
+  const std::string reply = withoutChunks(answer);
   long count = 0;
   const std::string tag = "</VALUE.NAMEDINSTANCE>";
   for (auto at = reply.find(tag); at != std::string::npos; at = reply.find(tag, at + 1)) ++count;
