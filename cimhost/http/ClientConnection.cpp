@@ -46,6 +46,11 @@ void ClientConnection::cut() {
   if (exchange_ == nullptr || !exchange_->cut("the server stops")) shutdown(socket_, SHUT_RDWR);
 }
 
+void ClientConnection::cutIncomplete() {
+  const std::lock_guard<std::mutex> lock(mutex_);
+  if (exchange_ != nullptr && !exchange_->isSubmitted()) shutdown(socket_, SHUT_RDWR);
+}
+
 std::unique_ptr<ConnectionTable::Place> ConnectionTable::reserve(const std::string& group) {
   const std::lock_guard<std::mutex> lock(mutex_);
   if (reserved_ >= maximum_) return nullptr;
@@ -84,6 +89,11 @@ void ConnectionTable::expire(ClientConnection::Clock::time_point now,
 void ConnectionTable::cutAll() {
   const std::lock_guard<std::mutex> lock(mutex_);
   for (ClientConnection* each : connections_) each->cut();
+}
+
+void ConnectionTable::cutIncomplete() {
+  const std::lock_guard<std::mutex> lock(mutex_);
+  for (ClientConnection* each : connections_) each->cutIncomplete();
 }
 
 }  // namespace cimhost

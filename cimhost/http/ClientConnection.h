@@ -41,6 +41,7 @@ class ConnectionTable {
   void expire(std::chrono::steady_clock::time_point now, std::chrono::steady_clock::duration grace,
               std::chrono::steady_clock::duration patience);
   void cutAll();
+  void cutIncomplete();
 
  private:
   void release(const std::string& group);
@@ -80,6 +81,8 @@ class ClientConnection {
   /// Cuts a reply, too, that has been read too slowly for `patience`.
   void expire(Clock::time_point now, Clock::duration grace, Clock::duration patience);
   void cut();
+  /// Ends the connection when it carries a part of a request.
+  void cutIncomplete();
 
  private:
   bool isAbandoned();

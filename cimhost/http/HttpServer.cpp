@@ -1,6 +1,7 @@
 #include "cimhost/http/HttpServer.h"
 
 #include "cimhost/HostError.h"
+#include "cimhost/http/SmallFile.h"
 
 #include <gnutls/gnutls.h>
 #include <microhttpd.h>
@@ -10,10 +11,7 @@
 #include <cerrno>
 #include <cstdarg>
 #include <cstdio>
-#include <filesystem>
-#include <fstream>
 #include <mutex>
-#include <sstream>
 #include <utility>
 #include <vector>
 
@@ -35,26 +33,11 @@ constexpr std::chrono::seconds kPatience{60};
 constexpr std::size_t kReadBlock = 32U << 10U;
 // Beside request line and headers, the memory of a connection holds what is read and written.
 constexpr std::size_t kConnectionBuffers = 16U << 10U;
-constexpr std::uintmax_t kMaximumPemSize = 1U << 20U;
 constexpr const char* kPriorities = "NORMAL:-VERS-ALL:+VERS-TLS1.3:+VERS-TLS1.2";
 
 using ExchangePointer = std::shared_ptr<Exchange>;
 using ConnectionPointer = std::shared_ptr<ClientConnection>;
 using Response = std::unique_ptr<MHD_Response, void (*)(MHD_Response*)>;
-
-std::string readPem(const std::string& file) {
-  namespace fs = std::filesystem;
-  std::error_code error;
-  if (!fs::is_regular_file(file, error)) throw HostError(file + ": no such file");
-  if (fs::file_size(file, error) > kMaximumPemSize || error) {
-    throw HostError(file + ": larger than 1 MiB");
-  }
-  std::ifstream stream(file, std::ios::binary);
-  std::ostringstream text;
-  text << stream.rdbuf();
-  if (!stream) throw HostError(file + ": cannot be read");
-  return text.str();
-}
 
 gnutls_datum_t datumOf(std::string& text) {
   return {reinterpret_cast<unsigned char*>(text.data()), static_cast<unsigned>(text.size())};
@@ -302,7 +285,7 @@ struct HttpCallbacks {
 };
 
 TlsFiles readTlsFiles(const std::string& certificateFile, const std::string& keyFile) {
-  TlsFiles files{readPem(certificateFile), readPem(keyFile)};
+  TlsFiles files{readSmallFile(certificateFile), readSmallFile(keyFile)};
   const gnutls_datum_t certificate = datumOf(files.certificate);
   const gnutls_datum_t key = datumOf(files.key);
   gnutls_certificate_credentials_t credentials = nullptr;
@@ -415,6 +398,7 @@ void HttpServer::scheduleExpiry() {
 void HttpServer::drain() {
   if (services_.draining.exchange(true)) return;
   socket_.refuse();
+  connections_.cutIncomplete();
 }
 
 bool HttpServer::waitUntilIdle(std::chrono::milliseconds time) {

@@ -1,32 +1,40 @@
 #include "cimhost/http/UserFile.h"
 
 #include "cimhost/HostError.h"
+#include "cimhost/http/SmallFile.h"
 
 #include <crypt.h>
 #include <string.h>
 
-#include <filesystem>
-#include <fstream>
+#include <cstdlib>
 #include <memory>
+#include <sstream>
 
 namespace cimhost {
 
 namespace {
 
-constexpr std::uintmax_t kMaximumSize = 1U << 20U;
-
 struct HashKind {
   const char* prefix;
   std::size_t digest;  // Characters behind the last $ that are no salt, or all of salt and digest.
+  const char* cost;    // What the number of rounds, or its logarithm, stands behind.
+  long maximumCost;    // About a second: anybody may ask for it.
 };
 
-constexpr HashKind kHashKinds[] = {{"$6$", 86}, {"$2y$", 53}, {"$2b$", 53}};
+constexpr HashKind kHashKinds[] = {
+    {"$6$", 86, "$6$rounds=", 1000000}, {"$2y$", 53, "$2y$", 14}, {"$2b$", 53, "$2b$", 14}};
+
+bool isAffordable(const std::string& hash, const HashKind& kind) {
+  const std::string cost = kind.cost;
+  return hash.rfind(cost, 0) != 0 ||
+         std::strtol(hash.c_str() + cost.size(), nullptr, 10) <= kind.maximumCost;
+}
 
 bool isSupportedHash(const std::string& hash) {
   for (const HashKind& kind : kHashKinds) {
     if (hash.rfind(kind.prefix, 0) != 0) continue;
     const std::size_t dollar = hash.rfind('$');
-    return hash.size() - dollar - 1 == kind.digest &&
+    return hash.size() - dollar - 1 == kind.digest && isAffordable(hash, kind) &&
            crypt_checksalt(hash.c_str()) == CRYPT_SALT_OK;
   }
   return false;
@@ -41,23 +49,10 @@ bool equalInConstantTime(std::string_view left, std::string_view right) {
   return difference == 0;
 }
 
-std::ifstream openUsers(const std::string& file) {
-  namespace fs = std::filesystem;
-  std::error_code error;
-  // Opening a pipe would wait for a writer.
-  if (!fs::is_regular_file(file, error)) throw HostError(file + ": no such users file");
-  if (fs::file_size(file, error) > kMaximumSize || error) {
-    throw HostError(file + ": larger than 1 MiB");
-  }
-  std::ifstream stream(file);
-  if (!stream) throw HostError(file + ": cannot be read");
-  return stream;
-}
-
 }  // namespace
 
 UserFile::UserFile(const std::string& file) {
-  std::ifstream stream = openUsers(file);
+  std::istringstream stream(readSmallFile(file));
   int number = 0;
   for (std::string line; std::getline(stream, line);) {
     ++number;
@@ -77,7 +72,7 @@ void UserFile::addLine(std::string_view line) {
   if (colon == std::string_view::npos || colon == 0) throw HostError("expected name:hash");
   const std::string hash(line.substr(colon + 1));
   if (!isSupportedHash(hash)) {
-    throw HostError("not a SHA-512 ($6$) or bcrypt ($2y$, $2b$) hash");
+    throw HostError("not a SHA-512 ($6$) or bcrypt ($2y$, $2b$) hash, or one of too many rounds");
   }
   if (!hashes_.emplace(line.substr(0, colon), hash).second) throw HostError("user comes twice");
   if (anyHash_.empty()) anyHash_ = hash;

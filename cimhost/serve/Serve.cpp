@@ -80,8 +80,10 @@ class Server {
     notifyServiceManager(reloadingState());
     log_.reopen();
     try {
-      http_.setUsers(readUsers(usersFile_));
+      // All or nothing: both are read before either takes effect.
+      auto users = readUsers(usersFile_);
       host_.reload(options_.shutdownTimeout);
+      http_.setUsers(std::move(users));
       const std::string warnings = problemsText(host().diagnostics());
       log_.message("reloaded" + (warnings.empty() ? "" : "\n" + warnings));
     } catch (...) {

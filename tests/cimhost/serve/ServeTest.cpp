@@ -267,7 +267,7 @@ TEST_F(ServeTest, WhatCannotStartSaysWhy) {
     std::vector<std::string> options;
     const char* problem;
   } cases[] = {
-      {{"--users", "none"}, "none: no such users file"},
+      {{"--users", "none"}, "none: no such file"},
       {{"--log", "/none/log"}, "/none/log: No such file"},
       {{"--tls-cert", "none", "--tls-key", "none"}, "none: no such file"},
       {{"--bind", "192.0.2.1", "--insecure"}, "cannot listen on 192.0.2.1 port 0"},
