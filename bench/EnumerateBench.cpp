@@ -3,6 +3,7 @@
 // fetch the class for every instance.
 
 #include "bench/BenchDevice.h"
+#include "bench/HandWritten.h"
 #include "provider/SimpleInstanceResponseHandler.h"
 
 #include <Pegasus/Common/CIMClass.h>
@@ -48,11 +49,11 @@ class BenchHost : public CIMOMHandleRep {
 class HandWritten {
  public:
   HandWritten() : library_(dlopen(BENCH_PLUGIN, RTLD_NOW)) {
-    text_ = reinterpret_cast<int (*)(void*, int)>(dlsym(library_, "benchText"));
+    text_ = reinterpret_cast<Writer>(dlsym(library_, "benchText"));
     number_ = reinterpret_cast<int (*)(int)>(dlsym(library_, "benchNumber"));
     long_ = reinterpret_cast<long (*)(int)>(dlsym(library_, "benchLong"));
-    numbers_ = reinterpret_cast<int (*)(void*, int)>(dlsym(library_, "benchNumbers"));
-    texts_ = reinterpret_cast<int (*)(void*, int)>(dlsym(library_, "benchTexts"));
+    numbers_ = reinterpret_cast<Writer>(dlsym(library_, "benchNumbers"));
+    texts_ = reinterpret_cast<Writer>(dlsym(library_, "benchTexts"));
   }
   ~HandWritten() { dlclose(library_); }
   HandWritten(const HandWritten&) = delete;
@@ -66,16 +67,16 @@ class HandWritten {
                                          true, true, CIMPropertyList());
       CIMInstance instance(path.getClassName());
       Array<CIMKeyBinding> keys;
-      set(cimClass, instance, keys, "DeviceID", CIMValue(text(i)));
-      set(cimClass, instance, keys, "Caption", CIMValue(text(i)));
-      set(cimClass, instance, keys, "Number", CIMValue(static_cast<Uint32>(number_(i))));
-      set(cimClass, instance, keys, "Percent", CIMValue(static_cast<Uint8>(number_(i))));
-      set(cimClass, instance, keys, "Offset", CIMValue(static_cast<Sint16>(number_(i))));
-      set(cimClass, instance, keys, "Size", CIMValue(static_cast<Uint64>(long_(i))));
-      set(cimClass, instance, keys, "Ready", CIMValue(number_(i) != 0));
-      set(cimClass, instance, keys, "Load", CIMValue(static_cast<Real64>(number_(i))));
-      set(cimClass, instance, keys, "Counters", CIMValue(numbers(i)));
-      set(cimClass, instance, keys, "Labels", CIMValue(texts(i)));
+      setProperty(cimClass, instance, keys, "DeviceID", CIMValue(readText(text_, i)));
+      setProperty(cimClass, instance, keys, "Caption", CIMValue(readText(text_, i)));
+      setProperty(cimClass, instance, keys, "Number", CIMValue(static_cast<Uint32>(number_(i))));
+      setProperty(cimClass, instance, keys, "Percent", CIMValue(static_cast<Uint8>(number_(i))));
+      setProperty(cimClass, instance, keys, "Offset", CIMValue(static_cast<Sint16>(number_(i))));
+      setProperty(cimClass, instance, keys, "Size", CIMValue(static_cast<Uint64>(long_(i))));
+      setProperty(cimClass, instance, keys, "Ready", CIMValue(number_(i) != 0));
+      setProperty(cimClass, instance, keys, "Load", CIMValue(static_cast<Real64>(number_(i))));
+      setProperty(cimClass, instance, keys, "Counters", CIMValue(numbers(i)));
+      setProperty(cimClass, instance, keys, "Labels", CIMValue(readTexts(texts_, i)));
       instance.setPath(CIMObjectPath(String(), path.getNameSpace(), path.getClassName(), keys));
       handler.deliver(instance);
     }
@@ -83,21 +84,6 @@ class HandWritten {
   }
 
  private:
-  static void set(CIMClass& cimClass, CIMInstance& instance, Array<CIMKeyBinding>& keys,
-                  const char* name, const CIMValue& value) {
-    CIMProperty property = cimClass.getProperty(cimClass.findProperty(CIMName(name)));
-    property.setValue(value);
-    Boolean key = false;
-    property.getQualifier(property.findQualifier(CIMName("key"))).getValue().get(key);
-    if (key) keys.append(CIMKeyBinding(property.getName(), property.getValue()));
-    instance.addProperty(CIMProperty(property.getName(), property.getValue()));
-  }
-
-  String text(int index) {
-    char buffer[1024];
-    text_(buffer, index);
-    return String(buffer);
-  }
   Array<Sint32> numbers(int index) {
     char buffer[1024];
     numbers_(buffer, index);
@@ -111,26 +97,12 @@ class HandWritten {
     }
     return result;
   }
-  Array<String> texts(int index) {
-    char buffer[1024];
-    texts_(buffer, index);
-    Array<String> result;
-    int count;
-    std::memcpy(&count, buffer + 4, 4);
-    const char* item = buffer + 8;
-    for (int i = 0; i < count; ++i) {
-      result.append(String(item + 8));
-      item += 33 + std::strlen(item + 8);
-    }
-    return result;
-  }
-
   void* library_;
-  int (*text_)(void*, int);
+  Writer text_;
   int (*number_)(int);
   long (*long_)(int);
-  int (*numbers_)(void*, int);
-  int (*texts_)(void*, int);
+  Writer numbers_;
+  Writer texts_;
 };
 
 // Checks what was delivered, so that both sides are known to do the same work.

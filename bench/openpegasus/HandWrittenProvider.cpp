@@ -2,13 +2,10 @@
 // code. It fetches the class for each instance and sets the values on the class's own properties,
 // as the generic provider does.
 
-#include <Pegasus/Common/CIMClass.h>
-#include <Pegasus/Common/CIMDateTime.h>
-#include <Pegasus/Common/CIMProperty.h>
-#include <Pegasus/Common/CIMQualifier.h>
-#include <Pegasus/Provider/CIMInstanceProvider.h>
+#include "bench/HandWritten.h"
 
-#include <cstring>
+#include <Pegasus/Common/CIMDateTime.h>
+#include <Pegasus/Provider/CIMInstanceProvider.h>
 
 extern "C" {
 int deviceCount(void);
@@ -20,30 +17,9 @@ int deviceTexts(void* out, int index);
 }
 
 using namespace Pegasus;
+using namespace bench;
 
 namespace {
-
-String text(int (*function)(void*, int), int index) {
-  char buffer[1024];
-  function(buffer, index);
-  return String(buffer);
-}
-
-Array<String> texts(int index) {
-  char buffer[1024];
-  deviceTexts(buffer, index);
-  Array<String> result;
-  int count;
-  std::memcpy(&count, buffer + 4, 4);
-  const char* at = buffer + 8;
-  for (int i = 0; i < count; ++i) {
-    int length;
-    std::memcpy(&length, at + 4, 4);
-    result.append(String(at + 8));
-    at += length + 33;  // With the header, the NUL and the gap.
-  }
-  return result;
-}
 
 class HandWrittenProvider : public CIMInstanceProvider {
  public:
@@ -84,29 +60,19 @@ class HandWrittenProvider : public CIMInstanceProvider {
                                         false, true, true, CIMPropertyList());
     CIMInstance built(reference.getClassName());
     Array<CIMKeyBinding> keys;
-    set(cimClass, built, keys, "DeviceID", CIMValue(text(deviceText, i)));
-    set(cimClass, built, keys, "Percent", CIMValue(static_cast<Uint8>(deviceNumber(i))));
-    set(cimClass, built, keys, "Offset", CIMValue(static_cast<Sint16>(deviceNumber(i))));
-    set(cimClass, built, keys, "Number", CIMValue(static_cast<Uint32>(deviceNumber(i))));
-    set(cimClass, built, keys, "Balance", CIMValue(static_cast<Sint32>(deviceNumber(i))));
-    set(cimClass, built, keys, "Size", CIMValue(static_cast<Uint64>(deviceLong(i))));
-    set(cimClass, built, keys, "Ready", CIMValue(deviceNumber(i) != 0));
-    set(cimClass, built, keys, "Load", CIMValue(static_cast<Real64>(deviceNumber(i))));
-    set(cimClass, built, keys, "Since", CIMValue(CIMDateTime(text(deviceTime, i))));
-    set(cimClass, built, keys, "Labels", CIMValue(texts(i)));
+    setProperty(cimClass, built, keys, "DeviceID", CIMValue(readText(deviceText, i)));
+    setProperty(cimClass, built, keys, "Percent", CIMValue(static_cast<Uint8>(deviceNumber(i))));
+    setProperty(cimClass, built, keys, "Offset", CIMValue(static_cast<Sint16>(deviceNumber(i))));
+    setProperty(cimClass, built, keys, "Number", CIMValue(static_cast<Uint32>(deviceNumber(i))));
+    setProperty(cimClass, built, keys, "Balance", CIMValue(static_cast<Sint32>(deviceNumber(i))));
+    setProperty(cimClass, built, keys, "Size", CIMValue(static_cast<Uint64>(deviceLong(i))));
+    setProperty(cimClass, built, keys, "Ready", CIMValue(deviceNumber(i) != 0));
+    setProperty(cimClass, built, keys, "Load", CIMValue(static_cast<Real64>(deviceNumber(i))));
+    setProperty(cimClass, built, keys, "Since", CIMValue(CIMDateTime(readText(deviceTime, i))));
+    setProperty(cimClass, built, keys, "Labels", CIMValue(readTexts(deviceTexts, i)));
     built.setPath(
         CIMObjectPath(String(), reference.getNameSpace(), reference.getClassName(), keys));
     return built;
-  }
-
-  static void set(CIMClass& cimClass, CIMInstance& instance, Array<CIMKeyBinding>& keys,
-                  const char* name, const CIMValue& value) {
-    CIMProperty property = cimClass.getProperty(cimClass.findProperty(CIMName(name)));
-    property.setValue(value);
-    Boolean key = false;
-    property.getQualifier(property.findQualifier(CIMName("key"))).getValue().get(key);
-    if (key) keys.append(CIMKeyBinding(property.getName(), property.getValue()));
-    instance.addProperty(CIMProperty(property.getName(), property.getValue()));
   }
 
   CIMOMHandle cimom_;
