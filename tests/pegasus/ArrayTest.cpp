@@ -1,16 +1,11 @@
 #include <Pegasus/Common/Array.h>
-#include <Pegasus/Common/CIMName.h>
-#include <gtest/gtest.h>
 
 #include <initializer_list>
-#include <string>
-#include <type_traits>
-#include <utility>
+#include <sstream>
 
 #include "PegasusText.h"
 
 using namespace Pegasus;
-using pegasus_test::text;
 
 namespace {
 
@@ -20,28 +15,19 @@ Array<Uint32> numbers(std::initializer_list<Uint32> values) {
 
 template <class T>
 std::string joined(const Array<T>& array) {
-  std::string result;
-  for (Uint32 i = 0; i < array.size(); ++i) {
-    if constexpr (std::is_same_v<T, String>) {
-      result += text(array[i]) + " ";
-    } else {
-      result += std::to_string(array[i]) + " ";
-    }
-  }
-  return result;
+  std::ostringstream result;
+  for (Uint32 i = 0; i < array.size(); ++i) result << array[i] << " ";
+  return result.str();
 }
 
-TEST(Array, Constructs) {
-  EXPECT_EQ(joined(Array<Uint32>()), "");
-  EXPECT_EQ(joined(Array<Uint32>(3u)), "0 0 0 ");
-  EXPECT_EQ(joined(Array<Uint32>(2u, 7u)), "7 7 ");
-  EXPECT_EQ(joined(Array<String>(2u, String("x"))), "x x ");
-  EXPECT_EQ(joined(numbers({1, 2, 3})), "1 2 3 ");
-  EXPECT_NE(Array<Uint64>().getData(), nullptr);
+TEST(Array, ConstructsAndEditsInPlace) {
+  EXPECT_EQ(joined(Array<Uint32>(3u)) + joined(Array<Uint32>(2u, 7u)), "0 0 0 7 7 ");
   EXPECT_EQ(Array<Uint32>(nullptr, 0u).size(), 0u);
-}
+  EXPECT_NE(Array<Uint64>().getData(), nullptr);
+  const Array<Boolean> truths(2u, true);
+  const bool* const sideBySide = truths.getData();
+  EXPECT_TRUE(sideBySide[0] && sideBySide[1]);
 
-TEST(Array, EditsInPlace) {
   Array<Uint32> array = numbers({1, 2});
   const Uint32 more[] = {8, 9};
   array.insert(0, 0);
@@ -69,39 +55,24 @@ TEST(Array, RefusesRangesPastTheEnd) {
   const Array<Uint32>& constant = array;
   EXPECT_THROW(array[4], IndexOutOfBoundsException);
   EXPECT_THROW(constant[4], IndexOutOfBoundsException);
-  EXPECT_THROW(constant[PEG_NOT_FOUND], IndexOutOfBoundsException);
   EXPECT_THROW(array.insert(5, 1), IndexOutOfBoundsException);
-  EXPECT_THROW(array.insert(99, 1), IndexOutOfBoundsException);
   EXPECT_THROW(array.remove(99), IndexOutOfBoundsException);
   EXPECT_EQ(joined(array), "0 9 1 2 ");
 }
 
 TEST(Array, CopiesAreIndependent) {
   const Array<String> original(2u, String("a"));
-  Array<String> changed(original);
+  Array<String> changed(original), longer(original), shorter(original), cleared;
   changed[0] = String("b");
-  Array<String> longer(original);
   longer.append("c");
-  Array<String> shorter(original);
   shorter.remove(0);
-  Array<String> cleared;
   cleared = original;
   cleared.clear();
   cleared.append("d");
   EXPECT_EQ(joined(original), "a a ");
-  EXPECT_EQ(joined(changed), "b a ");
-  EXPECT_EQ(joined(longer), "a a c ");
-  EXPECT_EQ(joined(shorter), "a ");
-  EXPECT_EQ(joined(cleared), "d ");
+  EXPECT_EQ(joined(changed) + joined(longer) + joined(shorter), "b a a a c a ");
   cleared.swap(changed);
-  EXPECT_EQ(joined(cleared), "b a ");
-}
-
-TEST(Array, BooleansLieSideBySide) {
-  Array<Boolean> array(2u, true);
-  array.append(false);
-  const bool* const data = array.getData();
-  EXPECT_TRUE(data[0] && data[1] && !data[2]);
+  EXPECT_EQ(joined(cleared) + joined(changed), "b a d ");
 }
 
 }  // namespace

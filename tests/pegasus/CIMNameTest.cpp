@@ -1,26 +1,18 @@
 #include <Pegasus/Common/CIMName.h>
-#include <gtest/gtest.h>
-
-#include <string>
+#include <Pegasus/Common/CIMPropertyList.h>
 
 #include "PegasusText.h"
 
 using namespace Pegasus;
-using pegasus_test::text;
-using pegasus_test::thrownMessage;
 
 namespace {
 
-TEST(CIMName, AcceptsLegalNames) {
-  for (const char* name : {"A", "_a", "a1", "A_b9", "\xC3\xA9t\xC3\xA9", "\xEF\xBF\xAF"}) {
+TEST(CIMName, IsLegalOrRefused) {
+  for (const char* name : {"A", "_a", "A_b9", "\xC3\xA9t\xC3\xA9", "\xEF\xBF\xAF"}) {
     EXPECT_EQ(text(CIMName(name).getString()), name);
-    EXPECT_EQ(text(CIMName(String(name)).getString()), name);
     EXPECT_TRUE(CIMName::legal(name));
   }
-}
-
-TEST(CIMName, RefusesIllegalNames) {
-  for (const char* name : {"", "1a", "a b", "a.b", "a-b", "a:b", " a", "a ", "a/b", "\xEF\xBF\xB0",
+  for (const char* name : {"", "1a", "a b", "a.b", "a:b", " a", "a ", "a/b", "\xEF\xBF\xB0",
                            "a\xF0\x9F\x98\x80\xEF\xBF\xBD"}) {
     const std::string message = std::string("The CIM name is not valid: ") + name;
     CIMName assigned("kept");
@@ -35,36 +27,45 @@ TEST(CIMName, RefusesIllegalNames) {
 
 TEST(CIMName, ComparesIgnoringCase) {
   EXPECT_TRUE(CIMName("Abc") == CIMName("aBC"));
-  EXPECT_TRUE(CIMName() == CIMName());
-  EXPECT_TRUE(CIMName("A") != CIMName());
+  EXPECT_TRUE(CIMName() == CIMName() && CIMName("A") != CIMName());
   EXPECT_FALSE(CIMName("\xC3\x89") == CIMName("\xC3\xA9"));
-  CIMName name("A");
-  name.clear();
-  EXPECT_TRUE(name.isNull());
-  EXPECT_TRUE(name.equal(CIMName()));
-  EXPECT_EQ(text(name.getString()), "");
+  EXPECT_TRUE(CIMNamespaceName("root/A") == CIMNamespaceName("ROOT/a"));
 }
 
-TEST(CIMNamespaceName, AcceptsLegalNames) {
-  for (const char* name : {"root", "root/cimv2", "r1/_x", "a/b/c/d"}) {
+TEST(CIMNamespaceName, IsLegalOrRefused) {
+  for (const char* name : {"root", "r1/_x", "a/b/c/d"}) {
     EXPECT_EQ(text(CIMNamespaceName(name).getString()), name);
     EXPECT_EQ(text(CIMNamespaceName(String("/") + String(name)).getString()), name);
   }
-  EXPECT_TRUE(CIMNamespaceName("root/A") == CIMNamespaceName("ROOT/a"));
-  EXPECT_TRUE(CIMNamespaceName("root") != CIMNamespaceName());
-  CIMNamespaceName name;
-  EXPECT_TRUE(name.isNull());
-  name = String("/root");
-  EXPECT_EQ(text(name.getString()), "root");
-}
-
-TEST(CIMNamespaceName, RefusesIllegalNames) {
   for (const char* name : {"", "/", "//root", "root/", "root//a", "root/1a", "root/a b", "root/a.b",
-                           "1root", "root:a", "/root/"}) {
+                           "1root", "root:a"}) {
     EXPECT_EQ(thrownMessage<InvalidNamespaceNameException>([&] { CIMNamespaceName x(name); }),
               std::string("invalid CIM namespace name: ") + name);
     EXPECT_FALSE(CIMNamespaceName::legal(name));
   }
+}
+
+TEST(CIMPropertyList, NullMeansAllAndEmptyMeansNone) {
+  CIMPropertyList list;
+  EXPECT_TRUE(list.isNull() && list.useThisProperty(CIMName("x")));
+  EXPECT_FALSE(list.contains(CIMName("x")));
+  EXPECT_EQ(text(list.toString()), "NULL");
+  list.set(Array<CIMName>());
+  EXPECT_FALSE(list.isNull() || list.useThisProperty(CIMName("x")));
+  EXPECT_EQ(text(list.toString()), "EMPTY");
+  Array<CIMName> names(1, CIMName("A"));
+  names.append(CIMName("b"));
+  list.set(names);
+  EXPECT_EQ(text(list.toString()), "A, b");
+  EXPECT_TRUE(list.contains(CIMName("B")) && list.useThisProperty(CIMName("a")));
+  EXPECT_FALSE(list.useThisProperty(CIMName("c")));
+  names.append(CIMName());
+  EXPECT_EQ(thrownMessage<UninitializedObjectException>([&] { list.set(names); }),
+            "uninitialized object");
+  EXPECT_EQ(list.size(), 2u);
+  EXPECT_EQ(thrownMessage<IndexOutOfBoundsException>([&] { list[2]; }), "index out of bounds");
+  list.clear();
+  EXPECT_TRUE(list.isNull());
 }
 
 }  // namespace

@@ -1,10 +1,8 @@
-// One class object, cloned and read by several threads at once. Meant for the thread sanitizer,
-// too.
+// One class object, cloned and read by several threads at once. For the thread sanitizer, too.
 #include <Pegasus/Common/CIMClass.h>
 #include <gtest/gtest.h>
 
 #include <atomic>
-#include <string>
 #include <thread>
 #include <vector>
 
@@ -14,9 +12,8 @@ namespace {
 
 CIMClass makeClass() {
   CIMClass cls(CIMName("A"));
-  for (int i = 0; i < 5; ++i) {
-    CIMProperty p(CIMName(("p" + std::to_string(i)).c_str()), String("initial"));
-    p.addQualifier(CIMQualifier(CIMName("Key"), Boolean(i == 0)));
+  for (const char* name : {"p0", "p1"}) {
+    CIMProperty p(CIMName(name), String("initial"));
     p.addQualifier(CIMQualifier(CIMName("Text"), String("text")));
     cls.addProperty(p);
   }
@@ -32,7 +29,7 @@ CIMClass makeClass() {
 bool changeClone(CIMClass cls, Uint32 number) {
   for (Uint32 i = 0; i < cls.getPropertyCount(); ++i) {
     cls.getProperty(i).setValue(String("changed"));
-    cls.getProperty(i).getQualifier(1).setValue(number);
+    cls.getProperty(i).getQualifier(0).setValue(number);
   }
   CIMQualifier in = cls.getMethod(0).getParameter(0).getQualifier(0);
   in.setValue(number);
@@ -40,7 +37,7 @@ bool changeClone(CIMClass cls, Uint32 number) {
   in.setValue(Boolean(false));
   const CIMConstMethod method = CIMConstClass(next).getMethod(0);
   return method.getParameter(0).getQualifier(0).getValue() == CIMValue(number) &&
-         CIMConstClass(next).getProperty(4).getQualifier(1).getValue() == CIMValue(number);
+         CIMConstClass(next).getProperty(1).getQualifier(0).getValue() == CIMValue(number);
 }
 
 TEST(CloneThreads, ClonesAreIndependentFromTheFirst) {
@@ -53,7 +50,7 @@ TEST(CloneThreads, ClonesAreIndependentFromTheFirst) {
       threads.emplace_back([&, t] {
         for (Uint32 i = 0; i < 10; ++i) {
           good += changeClone(shared.clone(), t * 100 + i);
-          const CIMConstQualifier q = shared.getProperty(1).getQualifier(1);
+          const CIMConstQualifier q = shared.getProperty(1).getQualifier(0);
           good += q.getValue() == CIMValue(String("text"));
         }
       });

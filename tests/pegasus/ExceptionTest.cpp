@@ -1,12 +1,9 @@
 #include <Pegasus/Common/CIMType.h>
-#include <Pegasus/Common/Exception.h>
 #include <Pegasus/Provider/ProviderException.h>
-#include <gtest/gtest.h>
 
 #include "PegasusText.h"
 
 using namespace Pegasus;
-using pegasus_test::text;
 
 namespace {
 
@@ -15,10 +12,7 @@ void expectCode(CIMStatusCode code) {
   try {
     throw E(String("%s stays as it is"));
   } catch (const CIMOperationFailedException& exception) {
-    EXPECT_EQ(exception.getCode(), code);
-    CIMException copy;
-    EXPECT_EQ(copy.getCode(), CIM_ERR_SUCCESS);
-    copy = exception;
+    const CIMException copy(exception);
     EXPECT_EQ(copy.getCode(), code);
     EXPECT_EQ(text(copy.getMessage()), "%s stays as it is");
   }
@@ -33,17 +27,11 @@ TEST(Exceptions, CarryTheCodesOfTheirNames) {
   expectCode<CIMObjectAlreadyExistsException>(CIM_ERR_ALREADY_EXISTS);
   expectCode<CIMPropertyNotFoundException>(CIM_ERR_NO_SUCH_PROPERTY);
   expectCode<CIMMethodNotFoundException>(CIM_ERR_METHOD_NOT_FOUND);
-}
-
-TEST(Exceptions, CodesAndTypesHaveNames) {
-  EXPECT_STREQ(cimStatusCodeToString(CIM_ERR_SUCCESS), "CIM_ERR_SUCCESS");
-  EXPECT_STREQ(cimStatusCodeToString(CIM_ERR_METHOD_NOT_FOUND), "CIM_ERR_METHOD_NOT_FOUND");
   EXPECT_STREQ(cimStatusCodeToString(static_cast<CIMStatusCode>(18)), "empty");
   EXPECT_STREQ(cimStatusCodeToString(CIM_ERR_SERVER_IS_SHUTTING_DOWN),
                "CIM_ERR_SERVER_IS_SHUTTING_DOWN");
   EXPECT_STREQ(cimStatusCodeToString(static_cast<CIMStatusCode>(29)),
                "Unrecognized CIM status code");
-  EXPECT_STREQ(cimTypeToString(CIMTYPE_BOOLEAN), "boolean");
   EXPECT_STREQ(cimTypeToString(CIMTYPE_INSTANCE), "instance");
 }
 

@@ -5,8 +5,6 @@
 
 #include <string>
 
-namespace pegasus_test {
-
 inline std::string text(const Pegasus::String& str) {
   return static_cast<const char*>(str.getCString());
 }
@@ -23,5 +21,3 @@ std::string thrownMessage(Action action) {
   }
   return "no exception";
 }
-
-}  // namespace pegasus_test

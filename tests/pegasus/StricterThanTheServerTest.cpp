@@ -1,19 +1,15 @@
 // What the server's library leaves undefined, and this one does not: built with this one alone.
-//
-// The server's library crashes or reads freed memory where it is handed a part of the very object
-// that is changed, on ranges past the end and on empty handles; it needs exponential time for
-// nested references, sorts the keys of its caller, and knows no moves: there a move is a copy.
+// It crashes or reads freed memory where it is handed a part of the very object that is changed, on
+// ranges past the end and on empty handles; nested references take it exponential time; it sorts
+// the keys of its caller, and knows no moves: there a move is a copy.
 #include <Pegasus/Common/CIMClass.h>
 #include <Pegasus/Common/OperationContext.h>
-#include <gtest/gtest.h>
 
-#include <string>
 #include <utility>
 
 #include "PegasusText.h"
 
 using namespace Pegasus;
-using pegasus_test::text;
 
 namespace {
 
@@ -21,8 +17,8 @@ TEST(StricterArray, RefusesRangesPastTheEnd) {
   Array<String> array(4u, String("kept"));
   EXPECT_THROW(array.remove(2, 3), IndexOutOfBoundsException);
   EXPECT_THROW(array.remove(2, PEG_NOT_FOUND), IndexOutOfBoundsException);
-  EXPECT_THROW(Array<String>().remove(0), IndexOutOfBoundsException);
   EXPECT_THROW(array.grow(PEG_NOT_FOUND, String()), std::bad_alloc);
+  EXPECT_THROW(CIMInstance().clone(), UninitializedObjectException);
   ASSERT_EQ(array.size(), 4u);
   EXPECT_EQ(text(array[3]), "kept");
 }
@@ -94,11 +90,6 @@ TEST(StricterPath, ParsesDeeplyNestedReferences) {
   EXPECT_EQ(parsed.getKeyBindings()[0].getType(), CIMKeyBinding::REFERENCE);
 }
 
-TEST(StricterHandles, NothingHasNoClone) {
-  EXPECT_THROW(CIMInstance().clone(), UninitializedObjectException);
-  EXPECT_THROW(CIMQualifier().clone(), UninitializedObjectException);
-}
-
 TEST(StricterContext, SetsTheContainerThatItHolds) {
   OperationContext context;
   context.insert(IdentityContainer(String("guest")));
@@ -113,22 +104,16 @@ TEST(Moves, LeaveAnEmptyObject) {
   str.append(String("again"));
   EXPECT_EQ(text(strTarget) + " " + text(str), "moved again");
 
-  Array<String> array(1u, String("moved"));
-  const Array<String> arrayTarget(std::move(array));
-  array.append("again");
-  EXPECT_EQ(text(arrayTarget[0]) + " " + text(array[0]), "moved again");
-
   CIMObjectPath path(String("//host/root:A.k=1"));
   const CIMObjectPath pathTarget(std::move(path));
   path.setHost(pathTarget.getHost());
   EXPECT_EQ(text(pathTarget.toString()) + " " + text(path.toString()),
             "//host/root:A.k=1 //host/:");
 
-  CIMValue value(arrayTarget);
+  CIMValue value(Array<String>(1u, String("moved")));
   const CIMValue valueTarget(std::move(value));
   EXPECT_EQ(text(valueTarget.toString()), "moved ");
-  EXPECT_TRUE(value.isNull());
-  EXPECT_EQ(value.getArraySize(), 0u);
+  EXPECT_TRUE(value.isNull() && value.getArraySize() == 0);
 }
 // NOLINTEND(bugprone-use-after-move)
 
@@ -143,12 +128,13 @@ TEST(ObjectText, IsEscaped) {
             "<PROPERTY NAME=\"n\" TYPE=\"uint32\" ARRAY=\"true\"></PROPERTY></INSTANCE>");
   CIMClass cls(CIMName("A"));
   CIMMethod method(CIMName("Run"), CIMTYPE_UINT32);
-  method.addParameter(CIMParameter(CIMName("In"), CIMTYPE_REFERENCE, true, 0, CIMName("X")));
+  method.addParameter(CIMParameter(CIMName("In"), CIMTYPE_UINT8, true));
+  method.addQualifier(CIMQualifier(CIMName("q"), Boolean(true)));
   cls.addMethod(method);
-  EXPECT_NE(text(CIMObject(cls).toString())
-                .find("<METHOD NAME=\"Run\" TYPE=\"uint32\"><PARAMETER NAME=\"In\" "
-                      "TYPE=\"reference\" ARRAY=\"true\"></PARAMETER></METHOD></CLASS>"),
-            std::string::npos);
+  EXPECT_EQ(text(CIMObject(cls).toString()),
+            "<CLASS NAME=\"A\"><METHOD NAME=\"Run\" TYPE=\"uint32\">"
+            "<QUALIFIER NAME=\"q\" TYPE=\"boolean\"><VALUE>TRUE</VALUE></QUALIFIER>"
+            "<PARAMETER NAME=\"In\" TYPE=\"uint8\" ARRAY=\"true\"></PARAMETER></METHOD></CLASS>");
 }
 
 }  // namespace

@@ -3,15 +3,11 @@
 set(embedded_only CIMOMHandleTest.cpp StricterThanTheServerTest.cpp)
 commonprovider_test(pegasus_objects_test
   SOURCES
-    CIMKeyBindingValueTest.cpp
     "$<$<STREQUAL:${CIM_API},embedded>:${embedded_only}>"
-    CIMPropertyListTest.cpp
     CIMValueTest.cpp
     CloneModelTest.cpp
     CloneThreadsTest.cpp
     HandleTest.cpp
     ObjectRulesTest.cpp
     OperationContextTest.cpp
-    PortabilityTest.cpp
-    ProviderInterfaceTest.cpp
   LIBRARIES cim_api)
