@@ -2,146 +2,98 @@
 
 #include "tests/support/TemporaryTree.h"
 
-#include <iterator>
+#include <algorithm>
+#include <vector>
 
 namespace {
 
-// A property as the class declares it and as the definition file serves it.
-struct PropertyRow {
-  const char* qualifiers;
-  const char* type;  // With [] for an array.
-  const char* name;
-  const char* function;      // Its family follows from the type; with Set it is stored.
-  const char* functionType;  // Null: a constant, whose type and text stand in `function`.
-};
+// Each row is what one function gives: its name and type, then each property's type (* for a key)
+// and name ([] for an array). Without "get" clients set it; a constant stands with text and type.
+using Rows = std::vector<const char*>;
 
-constexpr PropertyRow kElement[] = {
-    {"Key, Override(\"Name\")", "string", "Name", "elementName", "getSi"},
-    {"Key", "uint32", "Number", "elementNumber", "getIi"},
-    {"Key(false)", "string", "Label", "indexstring:element", nullptr},
-    {"Key(false)", "boolean", "Flag", "elementValue", "getIi"},
-    {"Key(false)", "uint8", "U8", "elementValue", "getIi"},
-    {"Key(false)", "sint8", "S8", "elementValue", "getIi"},
-    {"Key(false)", "uint16", "U16", "elementValue", "getIi"},
-    {"Key(false)", "sint16", "S16", "elementValue", "getIi"},
-    {"Key(false)", "uint32", "U32", "elementValue", "getIi"},
-    {"Key(false)", "sint32", "S32", "elementValue", "getIi"},
-    {"Key(false)", "uint64", "U64", "elementLong", "getLi"},
-    {"Key(false)", "sint64", "S64", "elementLong", "getLi"},
-    {"Key(false)", "real32", "R32", "elementValue", "getIi"},
-    {"Key(false)", "real64", "R64", "elementValue", "getIi"},
-    {"Key(false)", "char16", "C16", "elementLetter", "getIi"},
-    {"Key(false)", "datetime", "Time", "elementTime", "getSi"},
-    {"Key(false)", "boolean[]", "Flags", "elementNumbers", "getAIi"},
-    {"Key(false)", "uint8[]", "U8s", "elementNumbers", "getAIi"},
-    {"Key(false)", "sint16[]", "S16s", "elementNumbers", "getAIi"},
-    {"Key(false)", "uint64[]", "U64s", "elementNumbers", "getAIi"},
-    {"Key(false)", "real64[]", "R64s", "elementNumbers", "getAIi"},
-    {"Key(false)", "string[]", "Texts", "elementTexts", "getASi"},
-    {"Key(false)", "datetime[]", "Times", "elementTimes", "getASi"},
+const Rows kElement = {
+    "elementName getSi *string Name", "elementNumber getIi *uint32 Number",
+    "element indexstring string Label",
+    "elementValue getIi boolean Flag uint8 U8 sint8 S8 uint16 U16 sint16 S16 uint32 U32 sint32 S32",
+    "elementLong getLi uint64 U64 sint64 S64", "elementValue getIi real32 R32 real64 R64",
+    "elementLetter getIi char16 C16", "elementTime getSi datetime Time",
+    "elementNumbers getAIi boolean Flags[] uint8 U8s[] sint16 S16s[] uint64 U64s[] real64 R64s[]",
+    "elementTexts getASi string Texts[]", "elementTimes getASi datetime Times[]",
     // A number where the class declares a text: empty.
-    {"Key(false)", "string", "NoText", "elementValue", "getIi"},
-};
+    "elementValue getIi string NoText"};
 
-constexpr PropertyRow kStored[] = {
-    {"Key, Override(\"Name\")", "string", "Name", "elementName", "getSi"},
-    {"Key(false), Write", "boolean", "Flag", "Number", "Iv"},
-    {"Key(false), Write", "uint8", "U8", "Number", "Iv"},
-    {"Key(false), Write", "sint32", "S32", "Number", "Iv"},
-    {"Key(false), Write", "uint64", "U64", "Number", "Iv"},
-    {"Key(false), Write", "real64", "R64", "Number", "Iv"},
-    {"Key(false), Write", "string", "Text", "Text", "Sv"},
-    {"Key(false), Write", "datetime", "Time", "Text", "Sv"},
-    {"Key(false), Write", "sint32[]", "S32s", "Numbers", "AIv"},
-    {"Key(false), Write", "string[]", "Texts", "Texts", "ASv"},
-};
+const Rows kStored = {"elementName getSi *string Name",
+                      "Number Iv boolean Flag uint8 U8 sint32 S32 uint64 U64 real64 R64",
+                      "Text Sv string Text datetime Time", "Numbers AIv sint32 S32s[]",
+                      "Texts ASv string Texts[]"};
 
-constexpr PropertyRow kPart[] = {
-    {"Key, Override(\"Name\")", "string", "Name", "partName", "getSi"},
-    {"Key(false)", "string", "Owner", "partOwner", "getSi"},
-};
+const Rows kPart = {"partName getSi *string Name", "partOwner getSi string Owner"};
+const Rows kBroken = {"partName getSi *string Name", "partBroken getSi string Text"};
+const Rows kNoFunction = {"partName getSi *string Name", "noSuchFunction getIi sint32 Number"};
 
-constexpr PropertyRow kBroken[] = {
-    {"Key, Override(\"Name\")", "string", "Name", "partName", "getSi"},
-    {"Key(false)", "string", "Text", "partBroken", "getSi"},
-};
-
-constexpr PropertyRow kNoFunction[] = {
-    {"Key, Override(\"Name\")", "string", "Name", "partName", "getSi"},
-    {"Key(false)", "sint32", "Number", "noSuchFunction", "getIi"},
-};
-
-const std::string kIndex = "<argument type=\"index\"/>";
+const std::string kIndex = R"(<argument type="index"/>)";
+const std::string kTransfer = R"(<argument type="input"/><argument type="output"/>)";
 
 std::string call(const std::string& function, const std::string& type,
-                 const std::string& arguments) {
+                 const std::string& arguments = "") {
   return "<functioncall><function name=\"" + function + "\" type=\"" + type + "\"/>" + arguments +
          "</functioncall>";
 }
 
-std::string propertyText(const PropertyRow& row) {
-  const std::string type = row.functionType == nullptr ? "" : row.functionType;
-  const std::string function = row.function;
-  std::string body;
-  if (type.empty()) {
-    const auto colon = function.find(':');
-    body = "<get><constant type=\"" + function.substr(0, colon) + "\">" +
-           function.substr(colon + 1) + "</constant></get>";
-  } else if (type.compare(0, 3, "get") == 0) {
-    body = "<get>" + call(function, type, kIndex) + "</get>";
-  } else {
-    const std::string place = kIndex + "<argument type=\"element\"><constant type=\"string\">" +
-                              row.name + "</constant></argument>";
-    body = "<get>" + call("stored" + function, "get" + type, place) + "</get><set>" +
-           call("store" + function, "set" + type, place) + "</set>";
+std::string constant(const std::string& type, const std::string& text) {
+  return "<constant type=\"" + type + "\">" + text + "</constant>";
+}
+
+std::string accessors(const std::string& function, const std::string& type,
+                      const std::string& property) {
+  if (type == "indexstring") return "<get>" + constant(type, function) + "</get>";
+  if (type.compare(0, 3, "get") == 0) return "<get>" + call(function, type, kIndex) + "</get>";
+  const std::string place =
+      kIndex + "<argument type=\"element\">" + constant("string", property) + "</argument>";
+  return "<get>" + call("stored" + function, "get" + type, place) + "</get><set>" +
+         call("store" + function, "set" + type, place) + "</set>";
+}
+
+// Texts for class declarations and for the definition file.
+struct Texts {
+  std::string declared, defined;
+};
+
+Texts propertiesOf(const Rows& rows) {
+  Texts texts;
+  for (const char* row : rows) {
+    std::istringstream words(row);
+    std::string function, functionType, type, name;
+    for (words >> function >> functionType; words >> type >> name;) {
+      const bool isKey = type[0] == '*';
+      texts.declared += std::string("  [Key") + (isKey ? "" : "(false)") +
+                        (name == "Name" ? ", Override(\"Name\")" : "") +
+                        (functionType.back() == 'v' ? ", Write] " : "] ") + type.substr(isKey) +
+                        " " + name + ";\n";
+      name = name.substr(0, name.find('['));
+      texts.defined += "    <property name=\"" + name + "\">" +
+                       accessors(function, functionType, name) + "</property>\n";
+    }
   }
-  return "    <property name=\"" + std::string(row.name) + "\">" + body + "</property>\n";
-}
-
-template <std::size_t size>
-std::string classText(const std::string& name, const std::string& instances,
-                      const PropertyRow (&rows)[size], const std::string& methods = "") {
-  std::string text = "  <class name=\"" + name + "\" namespace=\"root/compare\">\n    <instances>" +
-                     instances + "</instances>\n";
-  for (const PropertyRow& row : rows) text += propertyText(row);
-  return text + methods + "  </class>\n";
-}
-
-std::string methodText(const std::string& name, const std::string& function,
-                       const std::string& type, const std::string& arguments) {
-  return "    <method name=\"" + name + "\">" + call(function, type, arguments) + "</method>\n";
-}
-
-template <std::size_t size>
-std::string classDeclaration(const std::string& head, const PropertyRow (&rows)[size],
-                             const std::string& methods = "") {
-  std::string text = head + " {\n";
-  for (const PropertyRow& row : rows) {
-    std::string type = row.type;
-    const bool isArray = type.back() == ']';
-    if (isArray) type.resize(type.size() - 2);
-    text += "  [" + std::string(row.qualifiers) + "] " + type + " " + row.name +
-            (isArray ? "[];\n" : ";\n");
-  }
-  return text + methods + "};\n";
+  return texts;
 }
 
 // What comes in goes out: a parameter of each type in both directions.
 std::string echoDeclaration() {
   const char* const types[] = {"boolean",  "uint8",  "sint16",   "sint32",   "uint64", "real64",
                                "datetime", "string", "uint16[]", "string[]", "char16"};
-  std::string text = "  [Static(false)] sint32 Echo(";
+  std::string parameters;
   for (const std::string direction : {"In", "Out"}) {
-    for (std::size_t i = 0; i < std::size(types); ++i) {
-      std::string type = types[i];
-      const bool isArray = type.back() == ']';
-      if (isArray) type.resize(type.size() - 2);
-      text += (direction == "Out" || i > 0 ? ",\n    [" : "\n    [");
-      text += direction == "In" ? "In, Out(false)] " : "In(false), Out] ";
-      text += type + " " + direction + std::to_string(i) + (isArray ? "[]" : "");
+    int number = 0;
+    for (const std::string type : types) {
+      const auto bracket = std::min(type.find('['), type.size());
+      parameters += std::string(parameters.empty() ? "" : ",") + "\n    [" +
+                    (direction == "In" ? "In, Out(false)] " : "In(false), Out] ") +
+                    type.substr(0, bracket) + " " + direction + std::to_string(number++) +
+                    type.substr(bracket);
     }
   }
-  return text + ");\n";
+  return "  [Static(false)] sint32 Echo(" + parameters + ");\n";
 }
 
 constexpr const char* kMethods = R"(
@@ -152,44 +104,35 @@ constexpr const char* kMethods = R"(
   sint32 NoStatic();
 )";
 
-}  // namespace
-
-std::string comparedDeclarations() {
-  return std::string("[Abstract] class Cmp_Named {\n  [Key] string Name;\n};\n") +
-         classDeclaration("class Cmp_Part : Cmp_Named", kPart) +
-         classDeclaration("class Cmp_Element : Cmp_Named", kElement, echoDeclaration() + kMethods) +
-         "class Cmp_SubElement : Cmp_Element {\n};\n" +
-         classDeclaration("class Cmp_Stored : Cmp_Named", kStored) +
-         classDeclaration("class Cmp_Broken : Cmp_Named", kBroken) +
-         classDeclaration("class Cmp_NoFunction : Cmp_Named", kNoFunction) +
-         classDeclaration("class Cmp_Empty : Cmp_Named", kPart) +
-         classDeclaration("class Cmp_NoLibrary : Cmp_Named", kPart) +
-         "class Cmp_NotServed : Cmp_Named {\n};\n"
-         "[Association] class Cmp_Owns {\n"
-         "  [Key] Cmp_Stored ref Owner;\n  [Key] Cmp_Part ref Owned;\n};\n"
-         "[Association] class Cmp_Beside {\n"
-         "  [Key] Cmp_Part ref Left;\n  [Key] Cmp_Broken ref Right;\n};\n";
+std::string method(const std::string& name, const std::string& functionCall) {
+  return "    <method name=\"" + name + "\">" + functionCall + "</method>\n";
 }
 
-std::string comparedDefinitions() {
-  const std::string elements = call("elementCount", "getI", "");
-  const std::string parts = call("partCount", "getI", "");
-  const std::string transfer = "<argument type=\"input\"/><argument type=\"output\"/>";
-  const std::string methods = methodText("Echo", "echo", "execC", transfer) +
-                              methodText("Which", "whichElement", "execCi", kIndex + transfer) +
-                              methodText("Die", "die", "execA", "") +
-                              methodText("NoFunction", "noSuchMethod", "execA", "") +
-                              methodText("NoStatic", "elementCount", "execA", "");
-  std::string noLibrary = classText("Cmp_NoLibrary", "<constant type=\"int\">2</constant>", kPart);
-  noLibrary.insert(noLibrary.find("<instances>"),
-                   "<module name=\"/nowhere/libmissing.so\" path=\"fullpath\"/>");
-  return "<plugin>\n  <module name=\"compare\" path=\"short\"/>\n" +
-         classText("Cmp_Element", elements, kElement, methods) +
-         classText("Cmp_SubElement", "<constant type=\"int\">2</constant>", kElement) +
-         classText("Cmp_Stored", elements, kStored) + classText("Cmp_Part", parts, kPart) +
-         classText("Cmp_Broken", parts, kBroken) + classText("Cmp_NoFunction", parts, kNoFunction) +
-         classText("Cmp_Empty", "<constant type=\"int\">0</constant>", kPart) + noLibrary +
-         R"(  <association name="Cmp_Owns" namespace2="root/compare" propertyname1="Owner" propertyname2="Owned">
+// Adds a class below Cmp_Named.
+void add(Texts& to, const std::string& name, const std::string& instances, const Rows& rows,
+         const Texts& methods = {}, const std::string& module = "") {
+  const Texts properties = propertiesOf(rows);
+  to.declared +=
+      "class " + name + " : Cmp_Named {\n" + properties.declared + methods.declared + "};\n";
+  to.defined += "  <class name=\"" + name + "\" namespace=\"root/compare\">" + module +
+                "\n    <instances>" + instances + "</instances>\n" + properties.defined +
+                methods.defined + "  </class>\n";
+}
+
+constexpr const char* kMoreDeclarations = R"(class Cmp_NotServed : Cmp_Named {
+};
+[Association] class Cmp_Owns {
+  [Key] Cmp_Stored ref Owner;
+  [Key] Cmp_Part ref Owned;
+};
+[Association] class Cmp_Beside {
+  [Key] Cmp_Part ref Left;
+  [Key] Cmp_Broken ref Right;
+};
+)";
+
+constexpr const char* kAssociations =
+    R"(  <association name="Cmp_Owns" namespace2="root/compare" propertyname1="Owner" propertyname2="Owned">
     <classname name="Cmp_Stored"><propertyname name="Name"/></classname>
     <classname name="Cmp_Part"><propertyname name="Owner"/></classname>
     <condition><equal>0 0</equal></condition>
@@ -199,15 +142,44 @@ std::string comparedDefinitions() {
     <classname name="Cmp_Broken"><propertyname name="Name"/></classname>
     <condition><equal>0 0</equal></condition>
   </association>
-</plugin>
 )";
+
+Texts allClasses() {
+  const std::string elements = call("elementCount", "getI");
+  const std::string parts = call("partCount", "getI");
+  const std::string two = constant("int", "2");
+  Texts all{"[Abstract] class Cmp_Named {\n  [Key] string Name;\n};\n", ""};
+  add(all, "Cmp_Part", parts, kPart);
+  add(all, "Cmp_Element", elements, kElement,
+      {echoDeclaration() + kMethods,
+       method("Echo", call("echo", "execC", kTransfer)) +
+           method("Which", call("whichElement", "execCi", kIndex + kTransfer)) +
+           method("Die", call("die", "execA")) +
+           method("NoFunction", call("noSuchMethod", "execA")) +
+           method("NoStatic", call("elementCount", "execA"))});
+  Texts below;
+  add(below, "Cmp_SubElement", two, kElement);
+  all.declared += "class Cmp_SubElement : Cmp_Element {\n};\n";
+  all.defined += below.defined;
+  add(all, "Cmp_Stored", elements, kStored);
+  add(all, "Cmp_Broken", parts, kBroken);
+  add(all, "Cmp_NoFunction", parts, kNoFunction);
+  add(all, "Cmp_Empty", constant("int", "0"), kPart);
+  add(all, "Cmp_NoLibrary", two, kPart, {},
+      R"(<module name="/nowhere/libmissing.so" path="fullpath"/>)");
+  return {all.declared + kMoreDeclarations, all.defined + kAssociations};
 }
+
+}  // namespace
 
 void writeComparedHome(const std::filesystem::path& home) {
   for (const char* folder : {"run", "lib", "logs", "mof/root/compare"}) {
     std::filesystem::create_directories(home / folder);
   }
   std::filesystem::create_symlink(COMPARE_PLUGIN, home / "lib/libcompare.so");
-  TemporaryTree::write(home / "run/compare.xml", comparedDefinitions());
-  TemporaryTree::write(home / "mof/root/compare/compare.mof", comparedDeclarations());
+  const Texts texts = allClasses();
+  TemporaryTree::write(
+      home / "run/compare.xml",
+      "<plugin>\n  <module name=\"compare\" path=\"short\"/>\n" + texts.defined + "</plugin>\n");
+  TemporaryTree::write(home / "mof/root/compare/compare.mof", texts.declared);
 }

@@ -1,31 +1,23 @@
 #include "CimServer.h"
 
-#include <arpa/inet.h>
-#include <netinet/in.h>
 #include <signal.h>
 #include <sys/prctl.h>
-#include <sys/socket.h>
 
 #include <chrono>
 #include <thread>
 
+#include "tests/cimhost/http/HttpClient.h"
 #include "tests/support/TemporaryTree.h"
 
 namespace fs = std::filesystem;
 
 namespace {
 
-sockaddr_in loopback(int port) {
-  sockaddr_in address{};
-  address.sin_family = AF_INET;
-  address.sin_port = htons(static_cast<uint16_t>(port));
-  address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
-  return address;
-}
-
 int freePort() {
   const int listener = socket(AF_INET, SOCK_STREAM, 0);
-  sockaddr_in address = loopback(0);
+  sockaddr_in address{};
+  address.sin_family = AF_INET;
+  address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
   socklen_t size = sizeof address;
   const bool bound = listener >= 0 &&
                      bind(listener, reinterpret_cast<sockaddr*>(&address), size) == 0 &&
@@ -36,12 +28,7 @@ int freePort() {
 }
 
 bool answers(int port) {
-  const int client = socket(AF_INET, SOCK_STREAM, 0);
-  const sockaddr_in address = loopback(port);
-  const bool connected =
-      connect(client, reinterpret_cast<const sockaddr*>(&address), sizeof address) == 0;
-  close(client);
-  return connected;
+  return HttpClient(static_cast<std::uint16_t>(port)).isConnected();
 }
 
 // Asks every tenth of a second, up to `tenths` times.
@@ -98,13 +85,11 @@ std::vector<std::string> CimServer::environment() const {
 void CimServer::start() {
   std::vector<std::string> words = environment();
   words.push_back((root_ / "pegasus/bin/cimserver").string());
-  for (const std::string option : {"daemon=false", "enableHttpConnection=true",
-                                   "enableHttpsConnection=false", "enableAuthentication=false"}) {
-    words.push_back(option);
-  }
-  words.push_back("httpPort=" + std::to_string(port_));
-  words.push_back(std::string("forceProviderProcesses=") +
-                  (providers_ == Providers::inAgents ? "true" : "false"));
+  const char* const agents = providers_ == Providers::inAgents ? "true" : "false";
+  words.insert(words.end(),
+               {"daemon=false", "enableHttpConnection=true", "enableHttpsConnection=false",
+                "enableAuthentication=false", "httpPort=" + std::to_string(port_),
+                std::string("forceProviderProcesses=") + agents});
   std::vector<char*> argv;
   for (std::string& word : words) argv.push_back(word.data());
   argv.push_back(nullptr);
@@ -150,8 +135,7 @@ ProgramResult CimServer::run(const std::string& program,
 void CimServer::mustRun(const std::string& program,
                         const std::vector<std::string>& arguments) const {
   const ProgramResult result = run(program, arguments);
-  if (result.code != 0) {
-    throw std::runtime_error(program + ": " + std::to_string(result.code) + "\n" + result.out +
-                             result.err);
-  }
+  if (result.code == 0) return;
+  throw std::runtime_error(program + ": " + std::to_string(result.code) + "\n" + result.out +
+                           result.err);
 }

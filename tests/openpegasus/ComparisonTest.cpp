@@ -1,14 +1,9 @@
 // Every operation by the CIM server's own client against the server, and by the one-shot commands
 // against the embedded host: the same instances, paths, values and error codes.
 
-#include <gmock/gmock.h>
-#include <gtest/gtest.h>
-
 #include <algorithm>
-#include <regex>
 
-#include "Deployment.h"
-#include "PlainReals.h"
+#include "ServerTest.h"
 
 namespace {
 
@@ -19,9 +14,26 @@ struct OperationCase {
   const char* name;
   Form form;
   int expected;  // How many instances or lines; below 0 a failure with that CIM status code.
-  std::vector<std::string> cimcli;
-  std::vector<std::string> cimhost;
+  std::string object;
+  std::string cimcli, cimhost;  // The command and its options, which go behind the object.
+  std::string both = "";        // What goes to both behind these, with | between.
 };
+
+using Words = std::vector<std::string>;
+
+Words split(const std::string& text, char separator) {
+  Words words;
+  std::istringstream stream(text);
+  for (std::string word; std::getline(stream, word, separator);) words.push_back(word);
+  return words;
+}
+
+Words wordsOf(const std::string& command, const std::string& object, const std::string& both) {
+  Words words = split(command, ' ');
+  words.insert(words.begin() + 1, object);
+  for (const std::string& word : split(both, '|')) words.push_back(word);
+  return words;
+}
 
 std::string replaceAll(const std::string& text, const char* pattern, const char* replacement) {
   return std::regex_replace(text, std::regex(pattern), replacement);
@@ -33,10 +45,10 @@ std::string plainValues(const std::string& text) {
 }
 
 // One element for each instance; white space and the comments with paths do not count.
-std::vector<std::string> instances(const std::string& text) {
+Words instances(const std::string& text) {
   std::string flat = replaceAll(text, "(^|\n)//[^\n]*", "");
   flat = plainValues(replaceAll(replaceAll(flat, "\\s+", " "), "; ", ";"));
-  std::vector<std::string> found;
+  Words found;
   const std::string start = "instance of ";
   for (auto at = flat.find(start); at != std::string::npos;) {
     const auto next = flat.find(start, at + 1);
@@ -48,10 +60,9 @@ std::vector<std::string> instances(const std::string& text) {
 }
 
 // One element for each line; host and namespace are left out where they lead a line.
-std::vector<std::string> lines(const std::string& text) {
-  std::vector<std::string> found;
-  std::istringstream stream(text);
-  for (std::string line; std::getline(stream, line);) {
+Words lines(const std::string& text) {
+  Words found;
+  for (std::string line : split(text, '\n')) {
     line = replaceAll(line, "^(//[^/]*/)?(root/compare:)?|^\\d+ associatorNames$", "");
     if (!line.empty()) found.push_back(line);
   }
@@ -60,7 +71,7 @@ std::vector<std::string> lines(const std::string& text) {
 }
 
 // One element for the result and for each parameter: NAME=VALUE, without any quotes and braces.
-std::vector<std::string> results(const std::string& text) {
+Words results(const std::string& text) {
   std::string flat = replaceAll(plainValues(text), "Return Value= ", "ReturnValue=");
   flat = replaceAll(replaceAll(flat, " = ", "="), "=null|=NULL", "=");
   return lines(replaceAll(replaceAll(flat, "[{}\"]| ?;?(?=\n)", ""), ", ", " "));
@@ -78,245 +89,110 @@ int cimhostStatus(const ProgramResult& result) {
   return result.code >= 10 ? result.code - 10 : -result.code;
 }
 
-template <class Base>
-class WithServer : public Base {
- protected:
-  void SetUp() override {
-    const std::string reason = CimServer::whyUnavailable();
-    if (!reason.empty()) GTEST_SKIP() << "No server to compare with: " << reason;
-  }
-};
-
 using Comparison = WithServer<testing::TestWithParam<OperationCase>>;
 using Differences = WithServer<testing::Test>;
 
 }  // namespace
 
 TEST_P(Comparison, BothAnswerAlike) {
-  const OperationCase& given = GetParam();
-  const ProgramResult server = Deployment::shared().cimcli(given.cimcli);
-  std::vector<std::string> arguments = given.cimhost;
-  if (given.form != Form::paths) {
-    arguments.insert(arguments.begin(), {"--format", "mof"});
-  }
+  const auto& [name, form, expected, object, cimcli, cimhost, both] = GetParam();
+  const ProgramResult server = Deployment::shared().cimcli(wordsOf(cimcli, object, both));
+  Words arguments = wordsOf(cimhost, "root/compare:" + object, both);
+  if (form != Form::paths) arguments.insert(arguments.begin(), {"--format", "mof"});
   const ProgramResult host = Deployment::shared().cimhost(arguments);
-  const int status = given.expected < 0 ? -given.expected : 0;
+  const int status = std::max(0, -expected);
   EXPECT_EQ(cimcliStatus(server), status) << server.out << server.err;
   EXPECT_EQ(cimhostStatus(host), status) << host.out << host.err;
-  if (status != 0 || given.form == Form::none) return;
-  const auto parts = given.form == Form::instances ? instances
-                     : given.form == Form::result  ? results
-                                                   : lines;
-  EXPECT_THAT(parts(server.out), testing::SizeIs(given.expected));
+  if (status != 0 || form == Form::none) return;
+  const auto parts = form == Form::instances ? instances : form == Form::result ? results : lines;
+  EXPECT_THAT(parts(server.out), testing::SizeIs(expected));
   EXPECT_EQ(parts(host.out), parts(server.out));
 }
 
 constexpr Form kInstances = Form::instances;
 constexpr Form kPaths = Form::paths;
+constexpr Form kResult = Form::result;
 
-const std::string kOdd = R"(Cmp_Element.Name="<&>'\"\\",Number=3)";
-const std::string kSecond = R"(Cmp_Element.Name="a b,c=d.e:f",Number=2)";
+const std::string kElement = "Cmp_Element";
 const std::string kPlain = R"(Cmp_Element.Name="plain",Number=1)";
-
-std::string at(const std::string& path) {
-  return "root/compare:" + path;
-}
-
-INSTANTIATE_TEST_SUITE_P(
-    Instances, Comparison,
-    testing::ValuesIn(std::vector<OperationCase>{
-        {"AllTypes", kInstances, 6, {"ei", "Cmp_Element", "-di"}, {"enumerate", at("Cmp_Element")}},
-        {"Shallow",
-         kInstances,
-         6,
-         {"ei", "Cmp_Element"},
-         {"enumerate", at("Cmp_Element"), "--no-deep"}},
-        {"BelowAnAbstractClass",
-         kInstances,
-         21,
-         {"ei", "Cmp_Named", "-di"},
-         {"enumerate", at("Cmp_Named")}},
-        {"PropertyList",
-         kInstances,
-         6,
-         {"ei", "Cmp_Element", "-pl", "u8,Texts,NoSuchProperty"},
-         {"enumerate", at("Cmp_Element"), "--property", "u8", "--property", "Texts", "--property",
-          "NoSuchProperty"}},
-        {"InstancesThatCannotBeBuilt",
-         kInstances,
-         3,
-         {"ei", "Cmp_Broken"},
-         {"enumerate", at("Cmp_Broken")}},
-        {"NoInstances", kInstances, 0, {"ei", "Cmp_Empty"}, {"enumerate", at("Cmp_Empty")}},
-        {"NoFunction",
-         kInstances,
-         0,
-         {"ei", "Cmp_NoFunction"},
-         {"enumerate", at("Cmp_NoFunction")}},
-        {"NoLibrary", kInstances, 2, {"ei", "Cmp_NoLibrary"}, {"enumerate", at("Cmp_NoLibrary")}},
-        {"NotServed", kInstances, 0, {"ei", "Cmp_NotServed"}, {"enumerate", at("Cmp_NotServed")}},
-        {"NoSuchClass", kInstances, -5, {"ei", "Cmp_Nothing"}, {"enumerate", at("Cmp_Nothing")}},
-        {"Names", kPaths, 6, {"ni", "Cmp_Element"}, {"names", at("Cmp_Element")}},
-        {"NamesOfAnAssociation", kPaths, 6, {"ni", "Cmp_Owns"}, {"names", at("Cmp_Owns")}},
-        {"AnAssociation", kInstances, 6, {"ei", "Cmp_Owns"}, {"enumerate", at("Cmp_Owns")}},
-        {"One", kInstances, 1, {"gi", kPlain}, {"get", at(kPlain)}},
-        {"KeysInAnotherOrder",
-         kInstances,
-         1,
-         {"gi", R"(cmp_element.number=1,NAME="plain")"},
-         {"get", at(R"(cmp_element.number=1,NAME="plain")")}},
-        {"KeyWithQuotes", kInstances, 1, {"gi", kOdd}, {"get", at(kOdd)}},
-        {"KeyBeyondAscii",
-         kInstances,
-         1,
-         {"gi", "Cmp_Element.Name=\"ä€\",Number=4"},
-         {"get", at("Cmp_Element.Name=\"ä€\",Number=4")}},
-        {"NumberAsHexadecimal",
-         kInstances,
-         1,
-         {"gi", R"(Cmp_Element.Name="plain",Number=0x1)"},
-         {"get", at(R"(Cmp_Element.Name="plain",Number=0x1)")}},
-        {"ListOfOne",
-         kInstances,
-         1,
-         {"gi", kPlain, "-pl", "S8"},
-         {"get", at(kPlain), "--property", "S8"}},
-        {"NoSuchInstance",
-         kInstances,
-         -1,
-         {"gi", R"(Cmp_Element.Name="plain",Number=9)"},
-         {"get", at(R"(Cmp_Element.Name="plain",Number=9)")}},
-        {"NoSuchKey",
-         kInstances,
-         -1,
-         {"gi", R"(Cmp_Element.Title="plain")"},
-         {"get", at(R"(Cmp_Element.Title="plain")")}},
-        {"InstanceOfNoClass",
-         kInstances,
-         -5,
-         {"gi", R"(Cmp_Nothing.Name="x")"},
-         {"get", at(R"(Cmp_Nothing.Name="x")")}},
-    }),
-    [](const auto& given) { return given.param.name; });
-
-std::vector<OperationCase> changes() {
-  const std::string path = R"(Cmp_Stored.Name="plain")";
-  std::vector<OperationCase> cases;
-  const auto change = [&](const char* name, const std::vector<std::string>& assignments) {
-    OperationCase both{name, Form::none, 0, {"mi", path}, {"modify", at(path)}};
-    both.cimcli.insert(both.cimcli.end(), assignments.begin(), assignments.end());
-    both.cimhost.insert(both.cimhost.end(), assignments.begin(), assignments.end());
-    cases.push_back(both);
-    cases.push_back({"Read", kInstances, 1, {"gi", path}, {"get", at(path)}});
-  };
-  change("Numbers", {"Flag=TRUE", "U8=255", "S32=-2147483648", "U64=7", "R64=-2.9"});
-  change("Texts", {"Text=a b", "Time=20260131120000.123456+060"});
-  change("Arrays", {"S32s=1,-2,3", "Texts=a,b"});
-  change("ReadOnlyIsPassedOver", {"Text=kept"});
-  return cases;
-}
-
-INSTANTIATE_TEST_SUITE_P(Changes, Comparison, testing::ValuesIn(changes()), [](const auto& given) {
-  return std::to_string(given.index) + given.param.name;
-});
-
+const std::string kSecond = R"(Cmp_Element.Name="a b,c=d.e:f",Number=2)";
+const std::string kMissing = R"(Cmp_Element.Name="plain",Number=9)";
+const std::string kNoClass = R"(Cmp_Nothing.Name="x")";
 const std::string kPart = R"(Cmp_Part.Name="part 2")";
 const std::string kOwner = R"(Cmp_Stored.Name="a b,c=d.e:f")";
+const std::string kStored = R"(Cmp_Stored.Name="plain")";
 
-INSTANTIATE_TEST_SUITE_P(
-    Associations, Comparison,
-    testing::ValuesIn(std::vector<OperationCase>{
-        {"OfOneSide", kInstances, 2, {"a", kOwner}, {"associators", at(kOwner)}},
-        {"OfTheOtherInTwoClasses", kInstances, 2, {"a", kPart}, {"associators", at(kPart)}},
-        {"Names", kPaths, 2, {"an", kPart}, {"associator-names", at(kPart)}},
-        {"AlongOneClass",
-         kPaths,
-         1,
-         {"an", kPart, "-ac", "cmp_owns"},
-         {"associator-names", at(kPart), "--assoc-class", "cmp_owns"}},
-        {"ToOneClass",
-         kPaths,
-         1,
-         {"an", kPart, "-rc", "Cmp_Broken"},
-         {"associator-names", at(kPart), "--result-class", "Cmp_Broken"}},
-        {"ToASuperclass",
-         kPaths,
-         0,
-         {"an", kPart, "-rc", "Cmp_Named"},
-         {"associator-names", at(kPart), "--result-class", "Cmp_Named"}},
-        {"AlongNoSuchClass",
-         kPaths,
-         -4,
-         {"an", kPart, "-ac", "Cmp_Nothing"},
-         {"associator-names", at(kPart), "--assoc-class", "Cmp_Nothing"}},
-        {"OfAnInstanceThatIsNot",
-         kPaths,
-         0,
-         {"an", R"(Cmp_Part.Name="x")"},
-         {"associator-names", at(R"(Cmp_Part.Name="x")")}},
-        {"OfAClassInNone", kPaths, 0, {"an", kPlain}, {"associator-names", at(kPlain)}},
-        {"OfNoSuchClass",
-         kPaths,
-         -4,
-         {"an", R"(Cmp_Nothing.Name="x")"},
-         {"associator-names", at(R"(Cmp_Nothing.Name="x")")}},
-        {"References", kInstances, 0, {"r", kPart}, {"references", at(kPart)}},
-        {"ReferenceNames", kPaths, 0, {"rn", kPart}, {"reference-names", at(kPart)}},
-    }),
-    [](const auto& given) { return given.param.name; });
+const OperationCase kInstanceCases[] = {
+    {"AllTypes", kInstances, 6, kElement, "ei -di", "enumerate"},
+    {"Shallow", kInstances, 6, kElement, "ei", "enumerate --no-deep"},
+    {"BelowAnAbstractClass", kInstances, 21, "Cmp_Named", "ei -di", "enumerate"},
+    {"PropertyList", kInstances, 6, kElement, "ei -pl u8,Texts,NoSuchProperty",
+     "enumerate --property u8 --property Texts --property NoSuchProperty"},
+    {"InstancesThatCannotBeBuilt", kInstances, 3, "Cmp_Broken", "ei", "enumerate"},
+    {"NoInstances", kInstances, 0, "Cmp_Empty", "ei", "enumerate"},
+    {"NoFunction", kInstances, 0, "Cmp_NoFunction", "ei", "enumerate"},
+    {"NoLibrary", kInstances, 2, "Cmp_NoLibrary", "ei", "enumerate"},
+    {"NotServed", kInstances, 0, "Cmp_NotServed", "ei", "enumerate"},
+    {"NoSuchClass", kInstances, -5, "Cmp_Nothing", "ei", "enumerate"},
+    {"Names", kPaths, 6, kElement, "ni", "names"},
+    {"NamesOfAnAssociation", kPaths, 6, "Cmp_Owns", "ni", "names"},
+    {"AnAssociation", kInstances, 6, "Cmp_Owns", "ei", "enumerate"},
+    {"KeysInAnotherOrder", kInstances, 1, R"(cmp_element.number=1,NAME="plain")", "gi", "get"},
+    {"KeyWithQuotes", kInstances, 1, R"(Cmp_Element.Name="<&>'\"\\",Number=3)", "gi", "get"},
+    {"KeyBeyondAscii", kInstances, 1, R"(Cmp_Element.Name="ä€",Number=4)", "gi", "get"},
+    {"Hexadecimal", kInstances, 1, R"(Cmp_Element.Name="plain",Number=0x1)", "gi", "get"},
+    {"ListOfOne", kInstances, 1, kPlain, "gi -pl S8", "get --property S8"},
+    {"NoSuchInstance", kInstances, -1, kMissing, "gi", "get"},
+    {"NoSuchKey", kInstances, -1, R"(Cmp_Element.Title="plain")", "gi", "get"},
+    {"InstanceOfNoClass", kInstances, -5, kNoClass, "gi", "get"}};
+INSTANTIATE_TEST_SUITE_P(Instances, Comparison, testing::ValuesIn(kInstanceCases), kByName);
 
-INSTANTIATE_TEST_SUITE_P(
-    MethodsAndClasses, Comparison,
-    testing::ValuesIn(std::vector<OperationCase>{
-        {"Echo",
-         Form::result,
-         11,
-         {"im", "Cmp_Element", "Echo", "In0=TRUE", "In1=255", "In2=-7", "In3=-2147483648", "In4=9",
-          "In5=-2.5", "In6=20260131120000.123456+060", "In7=a & b", "In8=1,65535", "In9=x,y"},
-         {"invoke", at("Cmp_Element"), "Echo", "In0=TRUE", "In1=255", "In2=-7", "In3=-2147483648",
-          "In4=9", "In5=-2.5", "In6=20260131120000.123456+060", "In7=a & b", "In8=1,65535",
-          "In9=x,y"}},
-        {"SomeInputs",
-         Form::result,
-         3,
-         {"im", "Cmp_Element", "Echo", "In1=5", "In2=6"},
-         {"invoke", at("Cmp_Element"), "Echo", "In1=5", "In2=6"}},
-        {"OfAnInstance",
-         Form::result,
-         3,
-         {"im", kSecond, "Which"},
-         {"invoke", at(kSecond), "Which"}},
-        {"OfAnInstanceThatIsNot",
-         Form::result,
-         3,
-         {"im", R"(Cmp_Element.Name="x",Number=9)", "Which"},
-         {"invoke", at(R"(Cmp_Element.Name="x",Number=9)"), "Which"}},
-        {"WithoutAFunction",
-         Form::result,
-         1,
-         {"im", "Cmp_Element", "NoFunction"},
-         {"invoke", at("Cmp_Element"), "NoFunction"}},
-        {"WithoutADefinition",
-         Form::result,
-         1,
-         {"im", "Cmp_Element", "NotServed"},
-         {"invoke", at("Cmp_Element"), "NotServed"}},
-        {"WithoutStatic",
-         Form::result,
-         -1,
-         {"im", "Cmp_Element", "NoStatic"},
-         {"invoke", at("Cmp_Element"), "NoStatic"}},
-        {"OfNoClass",
-         Form::result,
-         -6,
-         {"im", "Cmp_Nothing", "Echo"},
-         {"invoke", at("Cmp_Nothing"), "Echo"}},
-        {"Class", Form::none, 0, {"gc", "Cmp_Element"}, {"class", at("Cmp_Element")}},
-        {"NoClass", Form::none, -6, {"gc", "Cmp_Nothing"}, {"class", at("Cmp_Nothing")}},
-        {"ClassesBelow", kPaths, 8, {"nc", "Cmp_Named"}, {"classes", at("Cmp_Named"), "--no-deep"}},
-        {"ClassesBelowNone", kPaths, -5, {"nc", "Cmp_Nothing"}, {"classes", at("Cmp_Nothing")}},
-    }),
-    [](const auto& given) { return given.param.name; });
+const OperationCase kChanges[] = {
+    {"Numbers", Form::none, 0, kStored, "mi", "modify",
+     "Flag=TRUE|U8=255|S32=-2147483648|U64=7|R64=-2.9"},
+    {"ReadNumbers", kInstances, 1, kStored, "gi", "get"},
+    {"Texts", Form::none, 0, kStored, "mi", "modify",
+     "Text=a b|Time=20260131120000.123456+060|S32s=1,-2,3|Texts=a,b"},
+    {"ReadTexts", kInstances, 1, kStored, "gi", "get"},
+    {"ReadOnlyIsPassedOver", Form::none, 0, kPart, "mi", "modify", "Owner=kept"},
+    {"ReadAsBefore", kInstances, 1, kPart, "gi", "get"}};
+INSTANTIATE_TEST_SUITE_P(Changes, Comparison, testing::ValuesIn(kChanges), [](const auto& given) {
+  return std::to_string(given.index) + given.param.name;  // The order counts.
+});
+
+const OperationCase kAssociations[] = {
+    {"OfOneSide", kInstances, 2, kOwner, "a", "associators"},
+    {"OfTheOtherInTwoClasses", kInstances, 2, kPart, "a", "associators"},
+    {"Names", kPaths, 2, kPart, "an", "associator-names"},
+    {"Along", kPaths, 1, kPart, "an -ac cmp_owns", "associator-names --assoc-class cmp_owns"},
+    {"To", kPaths, 1, kPart, "an -rc Cmp_Broken", "associator-names --result-class Cmp_Broken"},
+    {"ToASuperclass", kPaths, 0, kPart, "an -rc Cmp_Named",
+     "associator-names --result-class Cmp_Named"},
+    {"AlongNoSuchClass", kPaths, -4, kPart, "an -ac Cmp_Nothing",
+     "associator-names --assoc-class Cmp_Nothing"},
+    {"OfAnInstanceThatIsNot", kPaths, 0, R"(Cmp_Part.Name="x")", "an", "associator-names"},
+    {"OfAClassInNone", kPaths, 0, kPlain, "an", "associator-names"},
+    {"OfNoSuchClass", kPaths, -4, kNoClass, "an", "associator-names"},
+    {"References", kInstances, 0, kPart, "r", "references"},
+    {"ReferenceNames", kPaths, 0, kPart, "rn", "reference-names"}};
+INSTANTIATE_TEST_SUITE_P(Associations, Comparison, testing::ValuesIn(kAssociations), kByName);
+
+const OperationCase kMethodsAndClasses[] = {
+    {"Echo", kResult, 11, kElement, "im", "invoke",
+     "Echo|In0=TRUE|In1=255|In2=-7|In3=-2147483648|In4=9|In5=-2.5|In6=20260131120000.123456+060|"
+     "In7=a & b|In8=1,65535|In9=x,y"},
+    {"SomeInputs", kResult, 3, kElement, "im", "invoke", "Echo|In1=5|In2=6"},
+    {"OfAnInstance", kResult, 3, kSecond, "im", "invoke", "Which"},
+    {"OfAnInstanceThatIsNot", kResult, 3, kMissing, "im", "invoke", "Which"},
+    {"WithoutAFunction", kResult, 1, kElement, "im", "invoke", "NoFunction"},
+    {"WithoutADefinition", kResult, 1, kElement, "im", "invoke", "NotServed"},
+    {"WithoutStatic", kResult, -1, kElement, "im", "invoke", "NoStatic"},
+    {"OfNoClass", kResult, -6, "Cmp_Nothing", "im", "invoke", "Echo"},
+    {"Class", Form::none, 0, kElement, "gc", "class"},
+    {"NoClass", Form::none, -6, "Cmp_Nothing", "gc", "class"},
+    {"ClassesBelow", kPaths, 8, "Cmp_Named", "nc", "classes --no-deep"},
+    {"ClassesBelowNone", kPaths, -5, "Cmp_Nothing", "nc", "classes"}};
+INSTANTIATE_TEST_SUITE_P(Others, Comparison, testing::ValuesIn(kMethodsAndClasses), kByName);
 
 // The server leaves roles to the provider, which does not look at them; the host keeps to DSP0200.
 TEST_F(Differences, OnlyTheHostFiltersByRole) {
@@ -324,8 +200,9 @@ TEST_F(Differences, OnlyTheHostFiltersByRole) {
     EXPECT_THAT(lines(Deployment::shared().cimcli({"an", kPart, option, "Owned"}).out),
                 testing::SizeIs(2));
   }
-  const auto found = [](const char* option, const char* role) {
-    return lines(Deployment::shared().cimhost({"associator-names", at(kPart), option, role}).out);
+  const std::string part = "root/compare:" + kPart;
+  const auto found = [&](const char* option, const char* role) {
+    return lines(Deployment::shared().cimhost({"associator-names", part, option, role}).out);
   };
   EXPECT_THAT(found("--role", "Owned"), testing::ElementsAre(kOwner));
   EXPECT_THAT(found("--result-role", "Right"), testing::ElementsAre(R"(Cmp_Broken.Name="part 2")"));

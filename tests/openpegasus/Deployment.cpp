@@ -16,27 +16,24 @@ Deployment::Deployment(CimServer::Providers providers) {
 
 namespace {
 
-std::unique_ptr<Deployment>& sharedDeployment() {
-  static std::unique_ptr<Deployment> deployment;
-  return deployment;
-}
+std::unique_ptr<Deployment> sharedDeployment;
 
 }  // namespace
 
 Deployment& Deployment::shared() {
-  std::unique_ptr<Deployment>& deployment = sharedDeployment();
+  // One that could not be made is not tried again by every test.
   static bool failed = false;
   if (failed) throw std::runtime_error("there is no deployment");
-  if (deployment == nullptr) {
+  if (sharedDeployment == nullptr) {
     failed = true;
-    deployment = std::make_unique<Deployment>(CimServer::Providers::inProcess);
+    sharedDeployment = std::make_unique<Deployment>(CimServer::Providers::inProcess);
     failed = false;
   }
-  return *deployment;
+  return *sharedDeployment;
 }
 
 void Deployment::releaseShared() {
-  sharedDeployment().reset();
+  sharedDeployment.reset();
 }
 
 Deployment::~Deployment() {
@@ -53,12 +50,11 @@ void Deployment::declareAndRegister() {
     TemporaryTree::write(file, result.out);
     return file.string();
   };
-  server_->mustRun("cimmof",
-                   {"-n", "root/compare", print("qualifiers.mof", {"qualifiers", "root/compare"})});
-  server_->mustRun(
-      "cimmof", {"-n", "root/compare", (cimhostHome() / "mof/root/compare/compare.mof").string()});
-  server_->mustRun("cimmof",
-                   {"-n", "root/PG_InterOp", print("registration.mof", {"registration"})});
+  const std::string classes = (cimhostHome() / "mof/root/compare/compare.mof").string();
+  const std::string qualifiers = print("qualifiers.mof", {"qualifiers", "root/compare"});
+  server_->mustRun("cimmof", {"-n", "root/compare", qualifiers, classes});
+  const std::string registration = print("registration.mof", {"registration"});
+  server_->mustRun("cimmof", {"-n", "root/PG_InterOp", registration});
 }
 
 ProgramResult Deployment::cimhost(std::vector<std::string> arguments) const {

@@ -1,52 +1,40 @@
 // The provider in the server over time: disabled and enabled, the server restarted, a plug-in that
 // takes its process along, and many clients at once.
 
-#include <gmock/gmock.h>
-#include <gtest/gtest.h>
-
 #include <thread>
 
-#include "Deployment.h"
+#include "ServerTest.h"
 
 namespace {
 
 const char* const kModule = "CommonProviderModule";
 
-class Lifecycle : public testing::TestWithParam<CimServer::Providers> {
+class Lifecycle : public WithServer<testing::TestWithParam<CimServer::Providers>> {
  protected:
   void SetUp() override {
-    const std::string reason = CimServer::whyUnavailable();
-    if (!reason.empty()) GTEST_SKIP() << "No server to compare with: " << reason;
+    WithServer::SetUp();
+    if (IsSkipped()) return;
     Deployment::releaseShared();
     deployment_ = std::make_unique<Deployment>(GetParam());
   }
 
   ProgramResult parts() const { return deployment_->cimcli({"ei", "Cmp_Part"}); }
 
-  static int count(const std::string& text, const std::string& word) {
-    int found = 0;
-    for (auto at = text.find(word); at != std::string::npos; at = text.find(word, at + 1)) ++found;
-    return found;
+  static long count(const std::string& text, const std::string& word) {
+    const std::regex each(word);
+    return std::distance(std::sregex_iterator(text.begin(), text.end(), each), {});
   }
 
   std::unique_ptr<Deployment> deployment_;
 };
 
-struct Resources {
-  long files = 0;
-  long kibibytes = 0;
-};
-
-// Of the server's process; of agents the server sees only a pipe.
-Resources resources(pid_t process) {
+// The open files and the resident KiB of the server's process; of agents the server sees only a
+// pipe.
+std::pair<long, long> resources(pid_t process) {
   const std::filesystem::path folder = "/proc/" + std::to_string(process);
-  Resources used;
-  used.files = std::distance(std::filesystem::directory_iterator(folder / "fd"), {});
-  std::istringstream status(TemporaryTree::read(folder / "status"));
-  for (std::string line; std::getline(status, line);) {
-    if (line.compare(0, 6, "VmRSS:") == 0) used.kibibytes = std::stol(line.substr(6));
-  }
-  return used;
+  const std::string status = TemporaryTree::read(folder / "status");
+  return {std::distance(std::filesystem::directory_iterator(folder / "fd"), {}),
+          std::stol(status.substr(status.find("VmRSS:") + 6))};
 }
 
 }  // namespace
@@ -60,16 +48,11 @@ TEST_P(Lifecycle, DisabledAndEnabledTwice) {
     const ProgramResult disabled = this->parts();
     EXPECT_THAT(disabled.out + disabled.err, testing::HasSubstr("Code= 7"));
 
-    std::string changed = definitions;
-    const std::string call =
-        "<functioncall><function name=\"partCount\" type=\"getI\"/></functioncall>";
-    for (auto at = changed.find(call); at != std::string::npos; at = changed.find(call)) {
-      changed.replace(at, call.size(),
-                      std::string("<constant type=\"int\">") + parts + "</constant>");
-    }
-    TemporaryTree::write(file, changed);
+    const std::regex call("<functioncall><function name=\"partCount\"[^>]*></functioncall>");
+    const std::string constant = std::string("<constant type=\"int\">") + parts + "</constant>";
+    TemporaryTree::write(file, std::regex_replace(definitions, call, constant));
     deployment_->server().mustRun("cimprovider", {"-e", "-m", kModule});
-    EXPECT_EQ(count(this->parts().out, "instance of Cmp_Part"), std::stoi(parts));
+    EXPECT_EQ(count(this->parts().out, "instance of Cmp_Part"), std::stol(parts));
   }
 }
 
@@ -102,22 +85,19 @@ TEST_P(Lifecycle, ManyClientsAtOnce) {
     EXPECT_THAT(wrong, testing::Each(""));
   };
   enumerate200();
-  const Resources once = resources(deployment_->server().process());
+  const auto [files, kibibytes] = resources(deployment_->server().process());
   enumerate200();
-  const Resources twice = resources(deployment_->server().process());
+  const auto [filesLater, kibibytesLater] = resources(deployment_->server().process());
   // A file or an instance's class left behind at each call would be hundreds of files, or of KiB.
-  EXPECT_LT(twice.files, once.files + 20);
-  EXPECT_LT(twice.kibibytes, once.kibibytes + 4096);
+  EXPECT_LT(filesLater, files + 20);
+  EXPECT_LT(kibibytesLater, kibibytes + 4096);
   EXPECT_TRUE(deployment_->server().stop());
 }
 
-INSTANTIATE_TEST_SUITE_P(Server, Lifecycle,
-                         testing::Values(CimServer::Providers::inProcess,
-                                         CimServer::Providers::inAgents),
-                         [](const auto& given) {
-                           return given.param == CimServer::Providers::inProcess ? "InProcess"
-                                                                                 : "InAgents";
-                         });
+constexpr auto kInProcess = CimServer::Providers::inProcess;
+constexpr auto kInAgents = CimServer::Providers::inAgents;
+
+INSTANTIATE_TEST_SUITE_P(Server, Lifecycle, testing::Values(kInProcess, kInAgents));
 
 using Agents = Lifecycle;
 
@@ -132,4 +112,4 @@ TEST_P(Agents, SurviveACrashOfThePlugIn) {
   EXPECT_TRUE(deployment_->server().stop());
 }
 
-INSTANTIATE_TEST_SUITE_P(Server, Agents, testing::Values(CimServer::Providers::inAgents));
+INSTANTIATE_TEST_SUITE_P(Server, Agents, testing::Values(kInAgents));

@@ -1,21 +1,17 @@
 // A stock client against the CIM server and against `cimhost serve`: what it prints is the same.
 
-#include <gmock/gmock.h>
-#include <gtest/gtest.h>
+#include <algorithm>
 
-#include <regex>
-
-#include "Deployment.h"
-#include "PlainReals.h"
+#include "ServerTest.h"
 #include "tests/support/CimhostServer.h"
 
 namespace {
 
 struct RequestCase {
   const char* name;
-  std::string command;
+  const char* command;
   std::string path;  // Behind the namespace's colon; empty for the namespace.
-  std::vector<std::string> values;
+  std::vector<std::string> values = {};
 };
 
 // The servers' names, and reals, in one form; the order of the lines does not count.
@@ -28,27 +24,27 @@ std::vector<std::string> comparable(const std::string& text) {
   return lines;
 }
 
-class Wire : public testing::TestWithParam<RequestCase> {
+class Wire : public WithServer<testing::TestWithParam<RequestCase>> {
  protected:
   void SetUp() override {
-    const std::string reason = CimServer::whyUnavailable();
-    if (!reason.empty()) GTEST_SKIP() << "No server to compare with: " << reason;
+    WithServer::SetUp();
+    if (IsSkipped()) return;
     if (access("/usr/bin/wbemcli", X_OK) != 0) GTEST_SKIP() << "No server to compare with wbemcli";
-    if (host_ == nullptr) {
-      host_ = std::make_unique<CimhostServer>(CIMHOST, Deployment::shared().cimhostHome().string(),
-                                              std::vector<std::string>{"--log", "/dev/null"});
-    }
+    if (host_ != nullptr) return;
+    const std::string home = Deployment::shared().cimhostHome().string();
+    host_.reset(new CimhostServer(CIMHOST, home, {"--log", "/dev/null"}));
   }
   static void TearDownTestSuite() {
     host_.reset();
     Deployment::releaseShared();
   }
 
-  static ProgramResult ask(int port, const RequestCase& request) {
-    std::vector<std::string> words = {"/usr/bin/timeout", "60", "/usr/bin/wbemcli", request.command,
+  static ProgramResult ask(int port) {
+    const auto& [name, command, path, values] = GetParam();
+    std::vector<std::string> words = {"/usr/bin/timeout", "60", "/usr/bin/wbemcli", command,
                                       "http://localhost:" + std::to_string(port) + "/root/compare" +
-                                          (request.path.empty() ? "" : ":" + request.path)};
-    words.insert(words.end(), request.values.begin(), request.values.end());
+                                          (path.empty() ? "" : ":" + path)};
+    words.insert(words.end(), values.begin(), values.end());
     return runProgram(words);
   }
 
@@ -60,8 +56,8 @@ std::unique_ptr<CimhostServer> Wire::host_;
 }  // namespace
 
 TEST_P(Wire, BothAnswerAlike) {
-  const ProgramResult server = ask(Deployment::shared().server().port(), GetParam());
-  const ProgramResult host = ask(host_->port(), GetParam());
+  const ProgramResult server = ask(Deployment::shared().server().port());
+  const ProgramResult host = ask(host_->port());
   EXPECT_EQ(host.code, server.code);
   EXPECT_EQ(comparable(host.out), comparable(server.out));
   EXPECT_EQ(host.err, server.err);
@@ -74,38 +70,32 @@ const std::string kPart = R"(Cmp_Part.Name="part 2")";
 // Without methods of instances and without createInstance: before these the client fetches the
 // class, and takes every Key qualifier for a key, [Key(false)] too, which the server sends and the
 // host does not.
-INSTANTIATE_TEST_SUITE_P(
-    Requests, Wire,
-    testing::ValuesIn(std::vector<RequestCase>{
-        {"EnumerateInstances", "ei", "Cmp_Element", {}},
-        {"EnumerateBelow", "ei", "Cmp_Named", {}},
-        {"EnumerateNone", "ei", "Cmp_Empty", {}},
-        {"EnumerateNoClass", "ei", "Cmp_Nothing", {}},
-        {"Names", "ein", "Cmp_Element", {}},
-        {"NamesOfAnAssociation", "ein", "Cmp_Owns", {}},
-        {"Get", "gi", kPlain, {}},
-        {"GetSome", "gi", kPlain, {"U8,Texts"}},
-        {"GetNone", "gi", R"(Cmp_Element.Name="x",Number=1)", {}},
-        {"Modify", "mi", kStored, {"U8=7,Text=\"a b\",Flag=TRUE,R64=-2.5"}},
-        {"GetModified", "gi", kStored, {}},
-        {"ModifyReadOnly", "mi", kPart, {"Owner=\"x\""}},
-        {"GetProperty", "gp", kStored, {"Text"}},
-        {"GetNoProperty", "gp", kStored, {"Nothing"}},
-        {"SetProperty", "sp", kStored, {"S32=-5"}},
-        {"GetSetProperty", "gi", kStored, {"S32"}},
-        {"DeleteInstance", "di", kPart, {}},
-        {"Method", "cm", "Cmp_Element", {"Echo.In0=TRUE,In1=255,In2=-7,In7=\"a b\""}},
-        {"Associators", "ai", kPart, {}},
-        {"AssociatorNames", "ain", kPart, {}},
-        {"AlongOneClass", "ain", kPart, {"-ac", "Cmp_Owns"}},
-        {"ToOneClass", "ain", kPart, {"-arc", "Cmp_Broken"}},
-        {"AssociatorsOfNoClass", "ain", R"(Cmp_Nothing.Name="x")", {}},
-        {"References", "ri", kPart, {}},
-        {"ReferenceNames", "rin", kPart, {}},
-        {"Class", "gc", "Cmp_Element", {}},
-        {"NoClass", "gc", "Cmp_Nothing", {}},
-        {"Classes", "ec", "Cmp_Named", {}},
-        {"ClassNames", "ecn", "Cmp_Named", {}},
-        {"AllClassNames", "ecn", "", {}},
-    }),
-    [](const auto& given) { return given.param.name; });
+const RequestCase kRequests[] = {
+    {"EnumerateInstances", "ei", "Cmp_Element"},
+    {"EnumerateBelow", "ei", "Cmp_Named"},
+    {"EnumerateNoClass", "ei", "Cmp_Nothing"},
+    {"Names", "ein", "Cmp_Element"},
+    {"NamesOfAnAssociation", "ein", "Cmp_Owns"},
+    {"Get", "gi", kPlain},
+    {"GetSome", "gi", kPlain, {"U8,Texts"}},
+    {"GetNone", "gi", R"(Cmp_Element.Name="x",Number=1)"},
+    {"Modify", "mi", kStored, {"U8=7,Text=\"a b\",Flag=TRUE,R64=-2.5"}},
+    {"GetModified", "gi", kStored},
+    {"ModifyReadOnly", "mi", kPart, {"Owner=\"x\""}},
+    {"GetProperty", "gp", kStored, {"Text"}},
+    {"GetNoProperty", "gp", kStored, {"Nothing"}},
+    {"SetProperty", "sp", kStored, {"S32=-5"}},
+    {"GetSetProperty", "gi", kStored, {"S32"}},
+    {"DeleteInstance", "di", kPart},
+    {"Method", "cm", "Cmp_Element", {"Echo.In0=TRUE,In1=255,In2=-7,In7=\"a b\""}},
+    {"Associators", "ai", kPart},
+    {"AssociatorNames", "ain", kPart},
+    {"ToOneClass", "ain", kPart, {"-arc", "Cmp_Broken"}},
+    {"AssociatorsOfNoClass", "ain", R"(Cmp_Nothing.Name="x")"},
+    {"References", "ri", kPart},
+    {"ReferenceNames", "rin", kPart},
+    {"Class", "gc", "Cmp_Element"},
+    {"NoClass", "gc", "Cmp_Nothing"},
+    {"Classes", "ec", "Cmp_Named"},
+    {"AllClassNames", "ecn", ""}};
+INSTANTIATE_TEST_SUITE_P(Requests, Wire, testing::ValuesIn(kRequests), kByName);
