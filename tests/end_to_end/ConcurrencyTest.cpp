@@ -1,7 +1,7 @@
 // Many clients at once, each with a connection that stays. COMMONPROVIDER_REQUESTS is how many
 // requests each of them sends; 1000 belong to a run under the thread sanitizer.
 
-#include <gtest/gtest.h>
+#include <gmock/gmock.h>
 
 #include <atomic>
 #include <chrono>
@@ -17,11 +17,6 @@ namespace {
 
 constexpr int kClients = 8;
 constexpr int kReloads = 5;
-
-int requestsOfAClient() {
-  const char* const text = std::getenv("COMMONPROVIDER_REQUESTS");
-  return text == nullptr ? 100 : std::atoi(text);
-}
 
 const std::string kNamespace =
     "<LOCALNAMESPACEPATH><NAMESPACE NAME=\"root\"/><NAMESPACE NAME=\"compare\"/>"
@@ -57,84 +52,62 @@ std::string path(const std::string& className, const std::string& key) {
          key + "</KEYVALUE></KEYBINDING></INSTANCENAME>";
 }
 
-std::string echo(int number) {
-  return message("Echo", "root%2Fcompare%3ACmp_Element",
-                 "<METHODCALL NAME=\"Echo\"><LOCALCLASSPATH>" + kNamespace +
-                     "<CLASSNAME NAME=\"Cmp_Element\"/></LOCALCLASSPATH><PARAMVALUE NAME=\"In0\">"
-                     "<VALUE>TRUE</VALUE></PARAMVALUE><PARAMVALUE NAME=\"In1\"><VALUE>" +
-                     std::to_string(number % 256) + "</VALUE></PARAMVALUE></METHODCALL>");
+struct Exchange {
+  std::string request, expected;
+};
+
+// What a client asks in turn. It has one property of one of the four instances to itself, reads it
+// right after it has written it, and begins elsewhere than the others.
+Exchange exchange(std::size_t client, int number) {
+  number += static_cast<int>(client);
+  const int round = number / 9;
+  const std::string value = std::to_string(round % 256);
+  const std::string part = "part " + std::to_string(round % 6);
+  const std::string property[] = {"S32", "U64", "U8", "Text"};
+  const std::string place =
+      parameter("InstanceName", path("Cmp_Stored", client % 2 == 0 ? "plain" : "a b,c=d.e:f")) +
+      parameter("PropertyName", "<VALUE>" + property[client / 2] + "</VALUE>");
+  switch (number % 9) {
+    case 0:
+      return {operation("EnumerateInstances", className("Cmp_Named")), "<VALUE>&lt;two&gt;"};
+    case 1:
+      return {operation("GetInstance", parameter("InstanceName", path("Cmp_Part", part))),
+              "<VALUE>" + part + "</VALUE>"};
+    case 2:
+      return {message("Echo", "root%2Fcompare%3ACmp_Element",
+                      "<METHODCALL NAME=\"Echo\"><LOCALCLASSPATH>" + kNamespace +
+                          "<CLASSNAME NAME=\"Cmp_Element\"/></LOCALCLASSPATH>"
+                          "<PARAMVALUE NAME=\"In0\"><VALUE>TRUE</VALUE></PARAMVALUE>"
+                          "<PARAMVALUE NAME=\"In1\"><VALUE>" +
+                          value + "</VALUE></PARAMVALUE></METHODCALL>"),
+              "<VALUE>" + value + "</VALUE>"};
+    case 3:
+      return {operation("Associators", parameter("ObjectName", path("Cmp_Part", "part 2"))),
+              "<INSTANCE CLASSNAME=\"Cmp_Stored\">"};
+    case 4:
+      return {operation("GetClass", className("Cmp_Element")), "<METHOD NAME=\"Echo\""};
+    case 5:
+      return {operation("EnumerateInstanceNames", className("Cmp_Element")),
+              "<KEYVALUE VALUETYPE=\"numeric\">4</KEYVALUE>"};
+    case 6:
+      return {operation("GetInstance", parameter("InstanceName", path("Cmp_Part", "none"))),
+              "<ERROR CODE=\"1\""};
+    case 7:
+      return {
+          operation("SetProperty", place + parameter("NewValue", "<VALUE>" + value + "</VALUE>")),
+          "\"SetProperty\">\n</IMETHODRESPONSE>"};
+    default:
+      return {operation("GetProperty", place), "<VALUE>" + value + "</VALUE>"};
+  }
 }
 
-// A client has one property of one of the four instances to itself.
-struct Place {
-  explicit Place(std::size_t client)
-      : instance(path("Cmp_Stored", client % 2 == 0 ? "plain" : "a b,c=d.e:f")),
-        property(std::vector<std::string>{"S32", "U64", "U8", "Text"}[client / 2]) {}
-
-  std::string read() const {
-    return operation("GetProperty",
-                     parameter("InstanceName", instance) +
-                         parameter("PropertyName", "<VALUE>" + property + "</VALUE>"));
-  }
-  std::string write(const std::string& value) const {
-    return operation("SetProperty",
-                     parameter("InstanceName", instance) +
-                         parameter("PropertyName", "<VALUE>" + property + "</VALUE>") +
-                         parameter("NewValue", "<VALUE>" + value + "</VALUE>"));
-  }
-
-  std::string instance;
-  std::string property;
-};
-
-class Client {
- public:
-  Client(int port, std::size_t number) : http_(static_cast<std::uint16_t>(port)), place_(number) {}
-
-  /// Request number `round`; what is wrong with the reply, or nothing.
-  std::string round(int round) {
-    const std::string value = std::to_string(round % 256);
-    switch (round % 8) {
-      case 0: {
-        const std::string written =
-            ask(place_.write(value), "\"SetProperty\">\n</IMETHODRESPONSE>");
-        return written + ask(place_.read(), "<VALUE>" + value + "</VALUE>");
-      }
-      case 1:
-        return ask(operation("EnumerateInstances", className("Cmp_Named")), "<VALUE>&lt;two&gt;");
-      case 2:
-        return ask(operation("GetInstance",
-                             parameter("InstanceName",
-                                       path("Cmp_Part", "part " + std::to_string(round % 6)))),
-                   "<VALUE>part " + std::to_string(round % 6) + "</VALUE>");
-      case 3:
-        return ask(echo(round), "<VALUE>" + value + "</VALUE>");
-      case 4:
-        return ask(operation("Associators", parameter("ObjectName", path("Cmp_Part", "part 2"))),
-                   "<INSTANCE CLASSNAME=\"Cmp_Stored\">");
-      case 5:
-        return ask(operation("GetClass", className("Cmp_Element")), "<METHOD NAME=\"Echo\"");
-      case 6:
-        return ask(operation("EnumerateInstanceNames", className("Cmp_Element")),
-                   "<KEYVALUE VALUETYPE=\"numeric\">4</KEYVALUE>");
-      default:
-        return ask(operation("GetInstance", parameter("InstanceName", path("Cmp_Part", "none"))),
-                   "<ERROR CODE=\"1\"");
-    }
-  }
-
- private:
-  std::string ask(const std::string& request, const std::string& expected) {
-    const HttpReply reply = http_.ask(request);
-    if (reply.status == 200 && reply.complete && reply.body.find(expected) != std::string::npos) {
-      return {};
-    }
-    return request + "\n" + std::to_string(reply.status) + "\n" + reply.body + "\n";
-  }
-
-  HttpClient http_;
-  Place place_;
-};
+// What is wrong with the reply, or nothing.
+std::string ask(HttpClient& client, const Exchange& exchange) {
+  const HttpReply reply = client.ask(exchange.request);
+  const bool found = reply.body.find(exchange.expected) != std::string::npos;
+  if (reply.status == 200 && reply.complete && found) return {};
+  return exchange.request + "\n" + std::to_string(reply.status) + "\n" + reply.body + "\n";
+}
 
 }  // namespace
 
@@ -144,31 +117,32 @@ TEST(Concurrency, ClientsDoNotDisturbEachOther) {
   writeComparedHome(tree.root() / "home");
   CimhostServer server(CIMHOST, (tree.root() / "home").string(),
                        {"--threads", "8", "--log", (tree.root() / "log").string()});
-  const int rounds = requestsOfAClient();
+  const char* const text = std::getenv("COMMONPROVIDER_REQUESTS");
+  const int requests = text == nullptr ? 100 : std::atoi(text);
   std::atomic<int> done{0};
   std::vector<std::string> problems(kClients);
   std::vector<std::thread> clients;
   for (std::size_t number = 0; number < kClients; ++number) {
     clients.emplace_back([&, number] {
-      Client client(server.port(), number);
+      HttpClient client(static_cast<std::uint16_t>(server.port()));
       std::string& problem = problems[number];
-      for (int round = 0; round < rounds && problem.empty(); ++round) {
-        problem = client.round(round + static_cast<int>(number));
+      for (int i = 0; i < requests && problem.empty(); ++i) {
+        problem = ask(client, exchange(number, i));
         ++done;
       }
-      done += problem.empty() ? 0 : rounds;
+      done += problem.empty() ? 0 : requests;
     });
   }
   for (int reload = 1; reload <= kReloads; ++reload) {
-    while (done < kClients * rounds * reload / (kReloads + 1)) {
+    while (done < kClients * requests * reload / (kReloads + 1)) {
       std::this_thread::sleep_for(std::chrono::milliseconds(1));
     }
     kill(server.process(), SIGHUP);
   }
   for (std::thread& client : clients) client.join();
-  for (const std::string& problem : problems) EXPECT_EQ(problem, "");
+  EXPECT_THAT(problems, testing::Each(""));
   EXPECT_EQ(server.stop(), 0);
   const std::string log = TemporaryTree::read(tree.root() / "log");
-  EXPECT_NE(log.find(" reloaded\n"), std::string::npos);
-  EXPECT_EQ(log.find("failed"), std::string::npos);
+  EXPECT_THAT(log, testing::HasSubstr(" reloaded\n"));
+  EXPECT_THAT(log, Not(testing::HasSubstr("failed")));
 }

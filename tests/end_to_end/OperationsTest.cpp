@@ -1,7 +1,8 @@
-// Every operation of the program with the real provider, plug-in and definitions: what a client
-// changes, calls and follows.
+// Every operation of the program with the real provider and the hostinfo example: that every kind
+// of value arrives, and what a client changes, calls and follows. What the values are is compared
+// with the system in tests/examples/hostinfo.
 
-#include <gtest/gtest.h>
+#include <gmock/gmock.h>
 
 #include <nlohmann/json.hpp>
 
@@ -18,17 +19,19 @@ class HostOperations : public testing::Test {
   HostOperations() { setenv("HOSTINFO_STATE", tree_.logs().c_str(), 1); }
   ~HostOperations() override { unsetenv("HOSTINFO_STATE"); }
 
-  static ProgramResult run(std::vector<std::string> arguments) {
-    std::vector<std::string> all = {CIMHOST, "--home", HOMES "/hostinfo"};
-    all.insert(all.end(), arguments.begin(), arguments.end());
-    return runProgram(all);
+  static ProgramResult run(const std::vector<std::string>& arguments) {
+    return runProgram({CIMHOST, "--home", HOMES "/hostinfo"}, arguments);
   }
 
   static json runJson(std::vector<std::string> arguments) {
     arguments.insert(arguments.begin(), {"--format", "json"});
-    const ProgramResult result = run(std::move(arguments));
+    const ProgramResult result = run(arguments);
     EXPECT_EQ(result.code, 0) << result.err;
     return json::parse(result.out, nullptr, false);
+  }
+
+  static json enumerate(const std::string& className) {
+    return runJson({"enumerate", "root/host:" + className});
   }
 
   static std::string firstPath(const std::string& className) {
@@ -39,32 +42,73 @@ class HostOperations : public testing::Test {
   TemporaryTree tree_;
 };
 
-std::string owner(const json& instance) {
-  return instance.at("properties").at("Owner");
+std::string textOf(const json& instance, const char* property) {
+  return instance.at("properties").at(property);
 }
 
 }  // namespace
 
+// A definition whose function has another type than the property shows as 0 or empty.
+TEST_F(HostOperations, EveryKindOfValueArrives) {
+  for (const json& system : enumerate("Host_FileSystem")) {
+    const json& properties = system.at("properties");
+    EXPECT_EQ(system.at("path"),
+              "root/host:Host_FileSystem.Name=\"" + textOf(system, "Name") + "\"");
+    EXPECT_GT(properties.at("SizeKiB").get<unsigned long long>(), 0u);
+    EXPECT_TRUE(properties.at("PercentUsed").is_number());
+    const auto options = properties.at("MountOptions").get<std::vector<std::string>>();
+    EXPECT_THAT(options, testing::Contains(properties.at("ReadOnly").get<bool>() ? "ro" : "rw"));
+  }
+  std::string paths;
+  int position = 0;
+  for (const json& port : enumerate("Host_NetworkPort")) {
+    EXPECT_EQ(textOf(port, "Label"), "port " + std::to_string(position++));
+    EXPECT_GT(port.at("properties").at("MTU").get<unsigned>(), 0u);
+    EXPECT_EQ(port.at("properties").at("Traffic").size(), 4u);
+    paths += port.at("path").get<std::string>() + "\n";
+  }
+  EXPECT_GT(position, 0);
+  EXPECT_EQ(run({"names", "root/host:Host_NetworkPort"}).out, paths);
+  for (const json& endpoint : enumerate("Host_IPEndpoint")) {
+    EXPECT_NE(textOf(endpoint, "Address"), "");
+    EXPECT_GT(endpoint.at("properties").at("PrefixLength").get<unsigned>(), 0u);
+  }
+}
+
+// The provider delivers nothing; the server's own handler makes that an error.
+TEST_F(HostOperations, AMissingInstanceIsAnError) {
+  const ProgramResult missing = run({"get", "root/host:Host_NetworkPort.Name=\"no such port\""});
+  EXPECT_EQ(missing.code, 11) << missing.out;
+  EXPECT_THAT(missing.err, testing::HasSubstr("Too few objects delivered."));
+}
+
+TEST_F(HostOperations, TracesDoNotMixWithTheResults) {
+  for (const char* format : {"table", "mof", "json"}) {
+    const ProgramResult result =
+        run({"--format", format, "enumerate", "root/host:Host_PortEndpoint"});
+    EXPECT_EQ(result.code, 0) << format << ": " << result.err;
+    EXPECT_THAT(result.out, testing::HasSubstr("Endpoint")) << format;
+    EXPECT_THAT(result.out, Not(testing::HasSubstr("ProviderDef"))) << format;
+  }
+}
+
 TEST_F(HostOperations, ModifiedPropertyIsReadBackByAnotherProcess) {
   const std::string path = firstPath("Host_FileSystem");
-  ASSERT_FALSE(path.empty());
+  // A comma would separate elements of an array only.
   for (const std::string text : {"Ä \"team\" a,b %n", ""}) {
-    // A comma would separate elements of an array only.
     const ProgramResult modified = run({"modify", path, "Owner=" + text});
     EXPECT_EQ(modified.code, 0) << modified.err;
     EXPECT_EQ(modified.out, "");
-    EXPECT_EQ(owner(runJson({"get", path})), text);
+    EXPECT_EQ(textOf(runJson({"get", path}), "Owner"), text);
   }
 }
 
 TEST_F(HostOperations, MethodOfTheClassDeliversAnArray) {
-  const json systems = runJson({"enumerate", "root/host:Host_FileSystem"});
-  const std::string type = systems[0].at("properties").at("FileSystemType");
+  const json systems = enumerate("Host_FileSystem");
+  const std::string type = textOf(systems[0], "FileSystemType");
   json expected = json::array();
   for (const json& system : systems) {
-    if (system.at("properties").at("FileSystemType") == type) {
-      expected.push_back(system.at("properties").at("Name"));
-    }
+    if (textOf(system, "FileSystemType") == type) expected.push_back(textOf(system, "Name"));
   }
   const json result =
       runJson({"invoke", "root/host:Host_FileSystem", "FindByType", "FileSystemType=" + type});
@@ -74,31 +118,36 @@ TEST_F(HostOperations, MethodOfTheClassDeliversAnArray) {
 }
 
 TEST_F(HostOperations, MethodOfAnInstanceRunsOnThatInstance) {
-  for (const json& system : runJson({"enumerate", "root/host:Host_FileSystem"})) {
+  for (const json& system : enumerate("Host_FileSystem")) {
     const json result = runJson({"invoke", system.at("path"), "CheckSpace", "NeededMiB=0"});
     EXPECT_EQ(result.at("returnValue"), 0);
-    EXPECT_EQ(result.at("parameters").at("Name"), system.at("properties").at("Name"));
+    EXPECT_EQ(result.at("parameters").at("Name"), textOf(system, "Name"));
     EXPECT_EQ(result.at("parameters").at("Fits"), true);
   }
 }
 
 TEST_F(HostOperations, AssociationIsFollowedInBothDirections) {
-  for (const json& endpoint : runJson({"enumerate", "root/host:Host_IPEndpoint"})) {
-    const std::string endpointPath = endpoint.at("path");
-    const json ports = runJson({"associators", endpointPath});
-    ASSERT_EQ(ports.size(), 1u) << endpointPath;
-    EXPECT_EQ(ports[0].at("properties").at("Name"), endpoint.at("properties").at("PortName"));
-    const std::string back = run({"associator-names", ports[0].at("path")}).out;
-    EXPECT_NE(("\n" + back).find("\n" + endpointPath + "\n"), std::string::npos) << back;
+  for (const json& endpoint : enumerate("Host_IPEndpoint")) {
+    const std::string path = endpoint.at("path");
+    const json ports = runJson({"associators", path});
+    ASSERT_EQ(ports.size(), 1u) << path;
+    EXPECT_EQ(textOf(ports[0], "Name"), textOf(endpoint, "PortName"));
+    EXPECT_THAT("\n" + run({"associator-names", ports[0].at("path")}).out,
+                testing::HasSubstr("\n" + path + "\n"));
   }
 }
 
 TEST_F(HostOperations, RefusedAndEmptyAnswersAreToldApart) {
   const std::string port = firstPath("Host_NetworkPort");
-  // The provider refuses references; clients see an empty answer, as from a server.
-  EXPECT_EQ(run({"reference-names", port}).code, 0);
-  EXPECT_EQ(run({"reference-names", port}).out, "");
-  EXPECT_EQ(run({"associator-names", port, "--result-class", "Host_FileSystem"}).out, "");
-  EXPECT_EQ(run({"associator-names", port, "--assoc-class", "NoSuchClass"}).code, 14);
-  EXPECT_EQ(run({"associator-names", "root/host:NoSuchClass.Name=\"x\""}).code, 14);
+  const std::pair<std::vector<std::string>, int> cases[] = {
+      // The provider refuses references; clients see an empty answer, as from a server.
+      {{"reference-names", port}, 0},
+      {{"associator-names", port, "--result-class", "Host_FileSystem"}, 0},
+      {{"associator-names", port, "--assoc-class", "NoSuchClass"}, 14},
+      {{"associator-names", "root/host:NoSuchClass.Name=\"x\""}, 14}};
+  for (const auto& [arguments, code] : cases) {
+    const ProgramResult result = run(arguments);
+    EXPECT_EQ(result.code, code) << result.err;
+    EXPECT_EQ(result.out, "");
+  }
 }

@@ -1,6 +1,6 @@
 // `cimhost serve` as people meet it: every command of a stock client, and what it prints.
 
-#include <gtest/gtest.h>
+#include <gmock/gmock.h>
 #include <unistd.h>
 
 #include <algorithm>
@@ -33,16 +33,10 @@ std::vector<std::string> words(const std::string& text) {
   return all;
 }
 
-void replaceAll(std::string& text, const std::string& from, const std::string& to) {
-  for (std::size_t at = 0; (at = text.find(from, at)) != std::string::npos; at += to.size()) {
-    text.replace(at, from.size(), to);
-  }
-}
-
 struct Exchange {
   const char* arguments;
-  std::string out;    // S/ stands for the server's address and the namespace, H/ for its name.
-  std::string error;  // Empty: success.
+  std::string out;         // S/ stands for the server's address and the namespace, H/ for its name.
+  std::string error = "";  // Empty: success.
 };
 
 class Wbemcli : public testing::Test {
@@ -51,36 +45,34 @@ class Wbemcli : public testing::Test {
     if (access(kClient, X_OK) != 0) GTEST_SKIP() << "wbemcli (sblim-wbemcli) is not installed";
     setenv("no_proxy", "127.0.0.1", 1);
     writeComparedHome(tree_.root() / "compare");
-    serve((tree_.root() / "compare").string(), "root/compare");
+    serve();
   }
 
   // What a sanitizer has seen is in the exit code.
-  void TearDown() override {
-    const int code = server_ == nullptr ? 0 : server_->stop();
-    EXPECT_EQ(code, 0);
-  }
+  void TearDown() override { EXPECT_EQ(server_ == nullptr ? 0 : server_->stop(), 0); }
 
-  void serve(const std::string& home, const std::string& nameSpace,
-             std::vector<std::string> options = {}) {
+  void serve(std::vector<std::string> options = {}) {
     options.insert(options.end(), {"--log", (tree_.root() / "log").string()});
-    server_ = std::make_unique<CimhostServer>(CIMHOST, home, options);
-    nameSpace_ = nameSpace;
+    server_ =
+        std::make_unique<CimhostServer>(CIMHOST, (tree_.root() / "compare").string(), options);
   }
 
   ProgramResult run(const std::string& arguments, const std::string& before = "http://") const {
     const std::string address = "127.0.0.1:" + std::to_string(server_->port());
     std::vector<std::string> command = {"/usr/bin/timeout", "60", kClient};
     for (std::string& word : words(arguments)) {
-      const std::string path = before + address + "/";
-      if (word[0] == ':') word = path + nameSpace_ + (word == ":" ? "" : word);
-      if (word.rfind("/root/", 0) == 0) word = path + word.substr(1);
+      if (word[0] == ':') word = "/root/compare" + (word == ":" ? "" : word);
+      if (word.rfind("/root/", 0) == 0) word = before + address + word;
       command.push_back(word);
     }
     ProgramResult result = runProgram(command);
     char host[256] = "";
     gethostname(host, sizeof host);
-    replaceAll(result.out, address + "/" + nameSpace_ + ":", "S/");
-    replaceAll(result.out, std::string(host) + "/" + nameSpace_ + ":", "H/");
+    const auto shorten = [&](const std::string& name, const char* letter) {
+      result.out = std::regex_replace(result.out, std::regex(name + "/root/compare:"), letter);
+    };
+    shorten(address, "S/");
+    shorten(host, "H/");
     return result;
   }
 
@@ -96,132 +88,78 @@ class Wbemcli : public testing::Test {
 
   TemporaryTree tree_;
   std::unique_ptr<CimhostServer> server_;
-  std::string nameSpace_;
 };
 
 }  // namespace
 
 TEST_F(Wbemcli, ReadsInstances) {
   expect({
-      {"ein :Cmp_Element",
-       "S/Cmp_Element.Name=\"plain\",Number=1\n"
-       "S/Cmp_Element.Name=\"a b,c=d.e:f\",Number=2\n"
-       "S/Cmp_Element.Name=\"<&>'\\\"\\\\\",Number=3\n"
-       "S/Cmp_Element.Name=\"\u00E4\u20AC\",Number=4\n"
-       "S/Cmp_SubElement.Name=\"plain\",Number=1\n"
-       "S/Cmp_SubElement.Name=\"a b,c=d.e:f\",Number=2\n",
-       ""},
-      {"ei :Cmp_Broken",
-       "S/Cmp_Broken.Name=\"part 0\" Name=\"part 0\",Text=\"fine\"\n"
-       "S/Cmp_Broken.Name=\"part 2\" Name=\"part 2\",Text=\"fine\"\n"
-       "S/Cmp_Broken.Name=\"part 4\" Name=\"part 4\",Text=\"fine\"\n",
-       ""},
-      {"-cte ei :Cmp_Empty", "", ""},
-      {"ein :Cmp_Empty", "", ""},
-      {"gi ':Cmp_Part.Name=\"part 2\"'",
-       "S/Cmp_Part.Name=\"part 2\" Name=\"part 2\",Owner=\"a b,c=d.e:f\"\n", ""},
-      {"-nl gi ':Cmp_Part.Name=\"part 4\"' Owner",
-       "S/Cmp_Part.Name=\"part 4\"\n-Owner=\"<&>'\\\"\\\\\"\n\n", ""},
-      {"gi ':Cmp_Element.Name=\"\u00E4\u20AC\",Number=4' Label,Nothing",
-       "S/Cmp_Element.Name=\"\u00E4\u20AC\",Number=\"4\" Label=\"element 3\"\n", ""},
-      {"gp ':Cmp_Part.Name=\"part 2\"' Owner", "a b,c=d.e:f\n", ""},
-  });
-}
-
-TEST_F(Wbemcli, ReadsEveryType) {
-  const std::string plain =
-      "Flag=FALSE,U8=0,S8=0,U16=0,S16=0,U32=0,S32=0,U64=0,S64=0,R32=0.0,R64=0.0,C16=A,"
-      "Time=20260131120000.123456+060\n";
-  const std::string second =
-      "Flag=TRUE,U8=1,S8=1,U16=1,S16=1,U32=1,S32=1,U64=1,S64=1,R32=1.0,R64=1.0,C16=\u00E4,"
-      "Time=00000001020304.000005:000\n";
-  const std::string noArrays = "Flags=,U8s=,S16s=,U64s=,R64s=,Texts=,Times=,NoText=\"\"\n";
-  const std::string one =
-      "Flags=TRUE,U8s=1,S16s=1,U64s=1,R64s=1.0,Texts=\"one\",Times=20260131120000.123456+060,"
-      "NoText=\"\"\n";
-  expect({
-      {"ei :Cmp_Element Flag,U8,S8,U16,S16,U32,S32,U64,S64,R32,R64,C16,Time",
-       "S/Cmp_Element.Name=\"plain\",Number=1 " + plain +
-           "S/Cmp_Element.Name=\"a b,c=d.e:f\",Number=2 " + second +
-           "S/Cmp_Element.Name=\"<&>'\\\"\\\\\",Number=3 Flag=TRUE,U8=255,S8=-1,U16=65535,S16=-1,"
-           "U32=4294967295,S32=-1,U64=18446744073709551615,S64=-1,R32=-1.0,R64=-1.0,C16=\u20AC,"
-           "Time=20260131120000.123456+060\n"
-           "S/Cmp_Element.Name=\"\u00E4\u20AC\",Number=4 Flag=TRUE,U8=135,S8=-121,U16=54919,"
-           "S16=-10617,U32=1234567,S32=1234567,U64=1234567,S64=1234567,R32=1234567.0,"
-           "R64=1234567.0,C16=~,Time=00000001020304.000005:000\n"
-           "S/Cmp_SubElement.Name=\"plain\",Number=1 " +
-           plain + "S/Cmp_SubElement.Name=\"a b,c=d.e:f\",Number=2 " + second,
-       ""},
-      {"ei :Cmp_Element Flags,U8s,S16s,U64s,R64s,Texts,Times,NoText",
-       "S/Cmp_Element.Name=\"plain\",Number=1 " + noArrays +
-           "S/Cmp_Element.Name=\"a b,c=d.e:f\",Number=2 " + one +
-           "S/Cmp_Element.Name=\"<&>'\\\"\\\\\",Number=3 Flags=TRUE,TRUE,U8s=1,65,S16s=1,65,"
-           "U64s=1,65,R64s=1.0,65.0,Texts=\"one\",\"\","
-           "Times=20260131120000.123456+060,00000001020304.000005:000,NoText=\"\"\n"
-           "S/Cmp_Element.Name=\"\u00E4\u20AC\",Number=4 Flags=TRUE,TRUE,TRUE,U8s=1,65,253,"
-           "S16s=1,65,-3,U64s=1,65,18446744073709551613,R64s=1.0,65.0,-3.0,"
-           "Texts=\"one\",\"\",\"<two> & \\\"three\\\"\",Times=20260131120000.123456+060,"
-           "00000001020304.000005:000,20260131******.******-300,NoText=\"\"\n"
-           "S/Cmp_SubElement.Name=\"plain\",Number=1 " +
-           noArrays + "S/Cmp_SubElement.Name=\"a b,c=d.e:f\",Number=2 " + one,
-       ""},
+      {"ei :Cmp_Element C16",
+       "S/Cmp_Element.Name=\"plain\",Number=1 C16=A\n"
+       "S/Cmp_Element.Name=\"a b,c=d.e:f\",Number=2 C16=\u00E4\n"
+       "S/Cmp_Element.Name=\"<&>'\\\"\\\\\",Number=3 C16=\u20AC\n"
+       "S/Cmp_Element.Name=\"\u00E4\u20AC\",Number=4 C16=~\n"
+       "S/Cmp_SubElement.Name=\"plain\",Number=1 C16=A\n"
+       "S/Cmp_SubElement.Name=\"a b,c=d.e:f\",Number=2 C16=\u00E4\n"},
+      {"-nl gi ':Cmp_Element.Name=\"\u00E4\u20AC\",Number=4'",
+       "S/Cmp_Element.Name=\"\u00E4\u20AC\",Number=\"4\"\n-Name=\"\u00E4\u20AC\"\n-Number=4\n"
+       "-Label=\"element 3\"\n-Flag=TRUE\n-U8=135\n-S8=-121\n-U16=54919\n-S16=-10617\n"
+       "-U32=1234567\n-S32=1234567\n-U64=1234567\n-S64=1234567\n-R32=1234567.0\n-R64=1234567.0\n"
+       "-C16=~\n-Time=00000001020304.000005:000\n-Flags=TRUE,TRUE,TRUE\n-U8s=1,65,253\n"
+       "-S16s=1,65,-3\n-U64s=1,65,18446744073709551613\n-R64s=1.0,65.0,-3.0\n"
+       "-Texts=\"one\",\"\",\"<two> & \\\"three\\\"\"\n-Times=20260131120000.123456+060,"
+       "00000001020304.000005:000,20260131******.******-300\n-NoText=\"\"\n\n"},
+      {"-cte ei :Cmp_Empty", ""},
+      {"ein :Cmp_Empty", ""},
+      {"gi ':Cmp_Part.Name=\"part 4\"' Owner,Nothing",
+       "S/Cmp_Part.Name=\"part 4\" Owner=\"<&>'\\\"\\\\\"\n"},
+      {"gp ':Cmp_Part.Name=\"part 2\"' Owner", "a b,c=d.e:f\n"},
   });
 }
 
 TEST_F(Wbemcli, ReadsBackWhatItHasWritten) {
   expect({
-      {"sp ':Cmp_Stored.Name=\"plain\"' S32=-2147483648", "", ""},
+      {"sp ':Cmp_Stored.Name=\"plain\"' S32=-2147483648", ""},
+      // It sends the < as it is.
       {"sp ':Cmp_Stored.Name=\"plain\"' 'Text=\"a <b\"'", "",
-       // It sends the < as it is.
        "Http Exception: HTTP response code said error"},
-      {"sp ':Cmp_Stored.Name=\"plain\"' 'Text=\"\u00E4 b\"'", "", ""},
+      {"sp ':Cmp_Stored.Name=\"plain\"' 'Text=\"\u00E4 b\"'", ""},
       {"sp ':Cmp_Stored.Name=\"plain\"' U8=256", "",
        "Cim: (13) CIM_ERR_TYPE_MISMATCH: parameter NewValue: \"256\" is out of range, 0 to 255"},
-      {"sp ':Cmp_Stored.Name=\"plain\"' Nothing=1", "", "Cmd Exception: Unknown property"},
-      {"gp ':Cmp_Stored.Name=\"plain\"' Text", "\u00E4 b\n", ""},
       {"mi ':Cmp_Stored.Name=\"plain\"' "
        "'U8=7,Flag=FALSE,R64=-2.0,Time=\"20260228235959.000000-480\",S32s=1,-2,3,Texts=\"x\",\"y "
        "z\"'",
-       "", ""},
+       ""},
       {"mi ':Cmp_Stored.Name=\"plain\"' U8=seven", "",
        "Cim: (4) CIM_ERR_INVALID_PARAMETER: parameter ModifiedInstance: U8 (uint8): \"seven\" is "
        "not an integer"},
-      {"-nl gi ':Cmp_Stored.Name=\"plain\"'",
-       "S/Cmp_Stored.Name=\"plain\"\n-Name=\"plain\"\n-Flag=FALSE\n-U8=7\n-S32=-2147483648\n"
-       "-U64=18446744073709551615\n-R64=-2.0\n-Text=\"\u00E4 b\"\n"
-       "-Time=20260228235959.000000-480\n-S32s=1,-2,3\n-Texts=\"x\",\"y z\"\n\n",
-       ""},
+      {"gi ':Cmp_Stored.Name=\"plain\"'",
+       "S/Cmp_Stored.Name=\"plain\" Name=\"plain\",Flag=FALSE,U8=7,S32=-2147483648,"
+       "U64=18446744073709551615,R64=-2.0,Text=\"\u00E4 b\",Time=20260228235959.000000-480,"
+       "S32s=1,-2,3,Texts=\"x\",\"y z\"\n"},
       // The others have kept their values.
       {"ei :Cmp_Stored S32,Texts",
        "S/Cmp_Stored.Name=\"plain\" S32=-2147483648,Texts=\"x\",\"y z\"\n"
        "S/Cmp_Stored.Name=\"a b,c=d.e:f\" S32=-1,Texts=\n"
        "S/Cmp_Stored.Name=\"<&>'\\\"\\\\\" S32=-1,Texts=\n"
-       "S/Cmp_Stored.Name=\"\u00E4\u20AC\" S32=-1,Texts=\n",
-       ""},
+       "S/Cmp_Stored.Name=\"\u00E4\u20AC\" S32=-1,Texts=\n"},
       // Without a <set>: tolerated, and left alone.
-      {"mi ':Cmp_Part.Name=\"part 1\"' 'Owner=\"x\"'", "", ""},
-      {"gp ':Cmp_Part.Name=\"part 1\"' Owner", "plain\n", ""},
+      {"mi ':Cmp_Part.Name=\"part 1\"' 'Owner=\"x\"'", ""},
+      {"gp ':Cmp_Part.Name=\"part 1\"' Owner", "plain\n"},
   });
 }
 
 TEST_F(Wbemcli, CallsMethods) {
   // The plug-in gives back what comes in, in the order in which it was sent.
-  const std::string echo = "S/Cmp_Element Echo: 4, Out0 (boolean): TRUE, Out1 (uint8): 255, ";
   expect({
       {"cm :Cmp_Element Echo.In0=TRUE,In1=255,In2=-7,In3=-2147483648",
-       echo + "Out2 (sint16): -7, Out3 (sint32): -2147483648\n", ""},
+       "S/Cmp_Element Echo: 4, Out0 (boolean): TRUE, Out1 (uint8): 255, Out2 (sint16): -7, "
+       "Out3 (sint32): -2147483648\n"},
       {"cm :Cmp_Element Echo.In1=256", "",
        "Cim: (4) CIM_ERR_INVALID_PARAMETER: parameter In1: \"256\" is out of range, 0 to 255"},
       {"cm ':Cmp_Element.Name=\"a b,c=d.e:f\",Number=2' Which",
        "S/Cmp_Element.Name=\"a b,c=d.e:f\",Number=2 Which: 0, Index (uint32): 1, Name (string): a "
-       "b,c=d.e:f\n",
-       ""},
-      {"cmx :Cmp_Element Echo.In0=FALSE",
-       "\n<METHODRESPONSE NAME=\"Echo\">\n"
-       "<RETURNVALUE PARAMTYPE=\"sint32\"><VALUE>1</VALUE></RETURNVALUE>\n"
-       "<PARAMVALUE NAME=\"Out0\" PARAMTYPE=\"boolean\"><VALUE>FALSE</VALUE></PARAMVALUE>\n"
-       "</METHODRESPONSE>\n\n",
-       ""},
+       "b,c=d.e:f\n"},
       {"cm :Cmp_Empty Nothing", "", "Cim: (17) CIM_ERR_METHOD_NOT_FOUND: Nothing"},
   });
 }
@@ -230,54 +168,37 @@ TEST_F(Wbemcli, FollowsAssociations) {
   const std::string stored = "H/Cmp_Stored.Name=\"a b,c=d.e:f\"";
   const std::string broken = "H/Cmp_Broken.Name=\"part 2\"";
   expect({
-      {"ain ':Cmp_Part.Name=\"part 2\"'", stored + "\n" + broken + "\n", ""},
-      {"-ac Cmp_Owns ain ':Cmp_Part.Name=\"part 2\"'", stored + "\n", ""},
-      {"-arc Cmp_Broken ain ':Cmp_Part.Name=\"part 2\"'", broken + "\n", ""},
-      {"-ar Owned ain ':Cmp_Part.Name=\"part 2\"'", stored + "\n", ""},
-      {"-arr Right ain ':Cmp_Part.Name=\"part 2\"'", broken + "\n", ""},
-      {"-ar Nothing ain ':Cmp_Part.Name=\"part 2\"'", "", ""},
+      {"ain ':Cmp_Part.Name=\"part 2\"'", stored + "\n" + broken + "\n"},
+      {"-ac Cmp_Owns ain ':Cmp_Part.Name=\"part 2\"'", stored + "\n"},
+      {"-arc Cmp_Broken ain ':Cmp_Part.Name=\"part 2\"'", broken + "\n"},
+      {"-ar Owned ain ':Cmp_Part.Name=\"part 2\"'", stored + "\n"},
+      {"-arr Right ain ':Cmp_Part.Name=\"part 2\"'", broken + "\n"},
       {"ai ':Cmp_Part.Name=\"part 2\"' U64,Text",
        stored + " U64=18446744073709551615,Text=\"20260131120000.123456+060\"\n" + broken +
-           " Text=\"fine\"\n",
-       ""},
-      {"-nl -arc Cmp_Broken ai ':Cmp_Part.Name=\"part 2\"'",
-       broken + "\n-Name=\"part 2\"\n-Text=\"fine\"\n\n", ""},
-      {"ri ':Cmp_Part.Name=\"part 2\"'", "", ""},
-      {"rin ':Cmp_Part.Name=\"part 2\"'", "", ""},
-      {"gi ':Cmp_Part.Name=\"part 9\"'", "", "Cim: (1) CIM_ERR_FAILED: Too few objects delivered."},
+           " Text=\"fine\"\n"},
+      {"ri ':Cmp_Part.Name=\"part 2\"'", ""},
+      {"rin ':Cmp_Part.Name=\"part 2\"'", ""},
   });
-  const std::string owns = run("ei :Cmp_Owns").out;
-  EXPECT_NE(owns.find("Owner=root/compare:Cmp_Stored.Name=\"<&>'\\\"\\\\\","
-                      "Owned=root/compare:Cmp_Part.Name=\"part 5\"\n"),
-            std::string::npos)
-      << owns;
+  EXPECT_THAT(run("ei :Cmp_Owns").out,
+              testing::HasSubstr("Owner=root/compare:Cmp_Stored.Name=\"<&>'\\\"\\\\\","
+                                 "Owned=root/compare:Cmp_Part.Name=\"part 5\"\n"));
 }
 
 TEST_F(Wbemcli, ReadsClasses) {
   expect({
-      {"gc :Cmp_Stored", "S/Cmp_Stored Name=,Flag=,U8=,S32=,U64=,R64=,Text=,Time=,S32s=,Texts=\n",
-       ""},
-      {"-nl gc :Cmp_Part", "S/Cmp_Part\n-Name=\n-Owner=\n\n", ""},
+      {"gc :Cmp_Stored", "S/Cmp_Stored Name=,Flag=,U8=,S32=,U64=,R64=,Text=,Time=,S32s=,Texts=\n"},
       {"gcd :Cmp_Part",
        "\n<CLASS NAME=\"Cmp_Part\" SUPERCLASS=\"Cmp_Named\"><PROPERTY NAME=\"Name\" "
        "TYPE=\"string\"></PROPERTY><PROPERTY NAME=\"Owner\" TYPE=\"string\"></PROPERTY></CLASS>\n"
-       "\n",
-       ""},
-      {"gcd :Cmp_Beside",
-       "\n<CLASS NAME=\"Cmp_Beside\"><PROPERTY.REFERENCE NAME=\"Left\" "
-       "REFERENCECLASS=\"Cmp_Part\"></PROPERTY.REFERENCE><PROPERTY.REFERENCE NAME=\"Right\" "
-       "REFERENCECLASS=\"Cmp_Broken\"></PROPERTY.REFERENCE></CLASS>\n\n",
-       ""},
-      {"ecn :Cmp_Element", "S/Cmp_SubElement\n", ""},
+       "\n"},
       {"ecn :Cmp_Named",
        "S/Cmp_Part\nS/Cmp_Element\nS/Cmp_SubElement\nS/Cmp_Stored\nS/Cmp_Broken\n"
-       "S/Cmp_NoFunction\nS/Cmp_Empty\nS/Cmp_NoLibrary\nS/Cmp_NotServed\n",
-       ""},
-      {"ec :Cmp_Part", "", ""},
+       "S/Cmp_NoFunction\nS/Cmp_Empty\nS/Cmp_NoLibrary\nS/Cmp_NotServed\n"},
+      {"ec :Cmp_Part", ""},
   });
   const std::string all = run("ec :").out;
   EXPECT_EQ(std::count(all.begin(), all.end(), '\n'), 12) << all;
-  EXPECT_NE(all.find("S/Cmp_Owns Owner=,Owned=\nS/Cmp_Beside Left=,Right=\n"), std::string::npos);
+  EXPECT_THAT(all, testing::HasSubstr("S/Cmp_Owns Owner=,Owned=\nS/Cmp_Beside Left=,Right=\n"));
 }
 
 TEST_F(Wbemcli, IsToldWhatCannotBeDone) {
@@ -287,7 +208,6 @@ TEST_F(Wbemcli, IsToldWhatCannotBeDone) {
       {"di ':Cmp_Part.Name=\"part 2\"'", "", refused},
       {"dc :Cmp_Part", "", "Cim: (7) CIM_ERR_NOT_SUPPORTED: DeleteClass"},
       {"ei :Cmp_Nothing", "", "Cim: (5) CIM_ERR_INVALID_CLASS: Cmp_Nothing"},
-      {"ein :Cmp_Nothing", "", "Cim: (5) CIM_ERR_INVALID_CLASS: Cmp_Nothing"},
       {"ain ':Cmp_Nothing.Name=\"x\"'", "", "Cim: (4) CIM_ERR_INVALID_PARAMETER: Cmp_Nothing"},
       {"gc :Cmp_Nothing", "", "Cim: (6) CIM_ERR_NOT_FOUND: Cmp_Nothing"},
       {"ei /root/nowhere:Cmp_Part", "", "Cim: (3) CIM_ERR_INVALID_NAMESPACE: root/nowhere"},
@@ -298,9 +218,9 @@ TEST_F(Wbemcli, IsToldWhatCannotBeDone) {
 }
 
 TEST_F(Wbemcli, SeesAReplyAsItIsOnTheWire) {
-  const std::string out = run("-dx gi ':Cmp_Part.Name=\"part 5\"' Owner").err;
-  EXPECT_NE(
-      out.find(
+  EXPECT_THAT(
+      run("-dx gi ':Cmp_Part.Name=\"part 5\"' Owner").err,
+      testing::HasSubstr(
           "From server: Content-Type: application/xml; charset=\"utf-8\"\n"
           "From server: CIMOperation: MethodResponse\n"
           "From server: Content-Length: 402\n"
@@ -310,9 +230,7 @@ TEST_F(Wbemcli, SeesAReplyAsItIsOnTheWire) {
           "<IMETHODRESPONSE NAME=\"GetInstance\">\n<IRETURNVALUE>\n"
           "<INSTANCE CLASSNAME=\"Cmp_Part\"><PROPERTY NAME=\"Owner\" TYPE=\"string\" "
           "CLASSORIGIN=\"Cmp_Part\"><VALUE>&lt;&amp;&gt;'&quot;\\</VALUE></PROPERTY></INSTANCE>\n"
-          "</IRETURNVALUE>\n</IMETHODRESPONSE>\n</SIMPLERSP>\n</MESSAGE>\n</CIM>\n"),
-      std::string::npos)
-      << out;
+          "</IRETURNVALUE>\n</IMETHODRESPONSE>\n</SIMPLERSP>\n</MESSAGE>\n</CIM>\n"));
 }
 
 TEST_F(Wbemcli, ShowsItsPasswordOnceItTrustsTheCertificate) {
@@ -326,8 +244,7 @@ TEST_F(Wbemcli, ShowsItsPasswordOnceItTrustsTheCertificate) {
   TemporaryTree::write(folder + "/users",
                        "anna:$6$saltsalt$TVLlQcbpFVof5W3Yz4DTP6gRstiNuHwwTt6GLc1E5n0U"
                        "0aDehy0S5knV8wiOQSpT0Y77vwPZN.Pq.H91p5hVO1\n");
-  serve(folder + "/compare", "root/compare",
-        {"--bind", "0.0.0.0", "--users", folder + "/users", "--tls-cert", folder + "/certificate",
+  serve({"--bind", "0.0.0.0", "--users", folder + "/users", "--tls-cert", folder + "/certificate",
          "--tls-key", folder + "/key"});
   const std::string trusting = "-cacert " + folder + "/certificate ecn :Cmp_Element";
   EXPECT_EQ(run(trusting, "https://anna:secret@").out, "S/Cmp_SubElement\n");

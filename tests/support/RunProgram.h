@@ -21,9 +21,11 @@ struct ProgramResult {
   std::string err;
 };
 
-/// Runs a program to its end, with an empty standard input. Its output goes through files, so no
-/// amount of it can block.
-inline ProgramResult runProgram(const std::vector<std::string>& arguments) {
+/// Runs a command with more arguments to its end, with an empty standard input. Its output goes
+/// through files, so no amount of it can block.
+inline ProgramResult runProgram(std::vector<std::string> command,
+                                const std::vector<std::string>& arguments = {}) {
+  command.insert(command.end(), arguments.begin(), arguments.end());
   char outName[] = "/tmp/program-out-XXXXXX";
   char errName[] = "/tmp/program-err-XXXXXX";
   const int out = mkstemp(outName);
@@ -34,16 +36,14 @@ inline ProgramResult runProgram(const std::vector<std::string>& arguments) {
   posix_spawn_file_actions_adddup2(&actions, out, STDOUT_FILENO);
   posix_spawn_file_actions_adddup2(&actions, err, STDERR_FILENO);
   std::vector<char*> argv;
-  for (const std::string& argument : arguments) {
-    argv.push_back(const_cast<char*>(argument.c_str()));
-  }
+  for (std::string& word : command) argv.push_back(word.data());
   argv.push_back(nullptr);
   pid_t child = 0;
   const int failed = posix_spawn(&child, argv[0], &actions, nullptr, argv.data(), environ);
   posix_spawn_file_actions_destroy(&actions);
   close(out);
   close(err);
-  if (failed != 0) throw std::runtime_error("cannot run " + arguments[0]);
+  if (failed != 0) throw std::runtime_error("cannot run " + command[0]);
   int status = 0;
   waitpid(child, &status, 0);
 
@@ -53,9 +53,6 @@ inline ProgramResult runProgram(const std::vector<std::string>& arguments) {
     unlink(name);
     return all.str();
   };
-  ProgramResult result;
-  result.code = WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status);
-  result.out = take(outName);
-  result.err = take(errName);
-  return result;
+  return {WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status), take(outName),
+          take(errName)};
 }
