@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <sstream>
 
 namespace {
@@ -15,12 +16,8 @@ std::string check(const std::string& text) {
   return result;
 }
 
-TEST(ConfigurationCheck, GoodTexts) {
-  EXPECT_EQ(check(""), "");
-  EXPECT_EQ(check("# c\n; c\n[section]\n\n  LogLevel = 9\r\nLogLevel=-1\n"), "");
-}
-
 TEST(ConfigurationCheck, ProblemsPointAtTheCharacter) {
+  EXPECT_EQ(check("# c\n; c\n[section]\n\n  LogLevel = 9\r\nLogLevel=-1\n"), "");
   EXPECT_EQ(check("LogLevel=9\nLogLevel = nine\n"),
             "c.ini:2:12: error: LogLevel is not a decimal number\n"
             "  LogLevel = nine\n"
@@ -33,10 +30,10 @@ TEST(ConfigurationCheck, ProblemsPointAtTheCharacter) {
 }
 
 TEST(ConfigurationCheck, AFloodOfProblemsIsBounded) {
-  std::string text = std::string(100000, '\n') + std::string(5000, 'x') + "\n";
-  for (int i = 0; i < 5000; ++i) text += "x\n";
-  std::istringstream stream(text);
-  EXPECT_EQ(cimhost::checkConfiguration(stream, "c.ini").size(), 100u);
+  std::string text(5000, 'x');
+  for (int i = 0; i < 5000; ++i) text += "\nx";
+  const std::string problems = check(text);
+  EXPECT_EQ(std::count(problems.begin(), problems.end(), '|'), 100);
 }
 
 }  // namespace

@@ -14,10 +14,7 @@ TEST(Diagnostic, PlacesAreAsCompilersPrintThem) {
   EXPECT_EQ((Diagnostic{kError, "a.xml", 2, 0, "bad", "<x y>"}.toString()), "a.xml:2: error: bad");
   EXPECT_EQ((Diagnostic{Diagnostic::Severity::warning, "a.xml", 0, 0, "one\ntwo\n", ""}.toString()),
             "a.xml: warning: one\n  two");
-}
-
-TEST(Diagnostic, TextOfFilesIsSafeForATerminal) {
-  const auto kError = Diagnostic::Severity::error;
+  // Safe for a terminal.
   EXPECT_EQ((Diagnostic{kError, "a\x1b.xml", 1, 2, "bad \x1b[2J", "\x1b[1m"}.toString()),
             "a\\x1b.xml:1:2: error: bad \\x1b[2J\n  \\x1b[1m\n      ^");
 }

@@ -15,9 +15,7 @@ TEST(PathArgument, WellFormedPaths) {
   EXPECT_EQ(parseInstancePath("root/host:Host_System.").getKeyBindings().size(), 0u);
   EXPECT_EQ(parseInstancePath("root:A.k=\"x.y:z,\\\"\"").getKeyBindings().size(), 1u);
   EXPECT_EQ(toUtf8(parseClassPath("root/host:A").getClassName().getString()), "A");
-  const Pegasus::CIMObjectPath space = parseNamespaceOrClass("root/host");
-  EXPECT_EQ(toUtf8(space.getNameSpace().getString()), "root/host");
-  EXPECT_TRUE(space.getClassName().isNull());
+  EXPECT_EQ(toUtf8(parseNamespaceOrClass("root/host").getNameSpace().getString()), "root/host");
   EXPECT_FALSE(parseNamespaceOrClass("root/host:A").getClassName().isNull());
 }
 
@@ -32,16 +30,13 @@ TEST(PathArgument, MalformedOnesAreReportedWithTheirColumn) {
        "object path, column 12: invalid key-value pair, missing quote in key value\n"
        "  root:A.a=1,b=\"x\n"
        "             ^"},
-      {parseInstancePath, "root:A.a=", 8, "invalid number"},
       {parseInstancePath, "root:A.a=\"x,y\",b", 16, "equal sign"},
       {parseInstancePath, "root:1A.a=1", 6, "class name 1A"},
       {parseInstancePath, "root:A", 7, "no keys"},
       {parseInstancePath, "A.k=\"x:y\"", 1, "no namespace"},  // the colon is the value's
-      {parseClassPath, "ro ot:A", 1, "namespace"},
       {parseClassPath, "A", 1, "no namespace"},
       {parseClassPath, "//h/root:A", 1, "host"},
       {parseClassPath, "root:A.a=1", 7, "no keys"},
-      {parseClassPath, "", 1, "no namespace"},
       {parseClassPath, "root:", 6, "class name"},
       {parseClassPath, "root:\x1b[2J", 6, "class name \\x1b[2J"},
       {parseClassPath, "root:\xff", 6, "UTF-8"},

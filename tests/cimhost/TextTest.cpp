@@ -11,23 +11,20 @@ using Pegasus::String;
 
 TEST(Text, Utf8OfAnyUtf16IsValid) {
   const Char16 lone[] = {Char16('a'), Char16(0xD83D), Char16('b'), Char16(0xDE00), Char16(0)};
-  EXPECT_EQ(toUtf8(String(lone, 5)), std::string("a\xEF\xBF\xBD"
-                                                 "b\xEF\xBF\xBD\0",
-                                                 9));
+  EXPECT_EQ(toUtf8(String(lone, 5)), std::string("a\uFFFDb\uFFFD\0", 9));
   const std::string smile = "\xF0\x9F\x98\x80";
   EXPECT_EQ(toUtf8(fromUtf8(smile)), smile);
   EXPECT_EQ(toUtf8(fromUtf8("\u00e9\u20ac")), "\u00e9\u20ac");
 }
 
 TEST(Text, MalformedBytesAreReplacedOneByOne) {
-  const char* const kR = "\xEF\xBF\xBD";
   const struct {
-    std::string text, expected;
-  } cases[] = {{"a\xFFz", std::string("a") + kR + "z"},
-               {"\xC3", kR},                                           // truncated
-               {"\xC0\xAF", std::string(kR) + kR},                     // overlong
-               {"\xED\xA0\x80", std::string(kR) + kR + kR},            // surrogate
-               {"\xF4\x90\x80\x80", std::string(kR) + kR + kR + kR}};  // above U+10FFFF
+    const char *text, *expected;
+  } cases[] = {{"a\xFFz", "a\uFFFDz"},
+               {"\xC3", "\uFFFD"},                                 // truncated
+               {"\xC0\xAF", "\uFFFD\uFFFD"},                       // overlong
+               {"\xED\xA0\x80", "\uFFFD\uFFFD\uFFFD"},             // surrogate
+               {"\xF4\x90\x80\x80", "\uFFFD\uFFFD\uFFFD\uFFFD"}};  // above U+10FFFF
   for (const auto& row : cases) EXPECT_EQ(toValidUtf8(row.text), row.expected);
 }
 

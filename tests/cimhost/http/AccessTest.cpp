@@ -16,19 +16,13 @@ namespace {
 using namespace cimhost;
 using testing::HasSubstr;
 
-// Cheap hashes of "secret": the cost is the hash's own matter.
+// A cheap hash of "secret": the cost is the hash's own matter.
 std::string hashOf(const char* setting) {
   crypt_data data{};
   return crypt_r("secret", setting, &data);
 }
-const std::string& sha512() {
-  static const std::string hash = hashOf("$6$rounds=1000$saltsalt$");
-  return hash;
-}
-const std::string& bcrypt() {
-  static const std::string hash = hashOf("$2y$04$abcdefghijklmnopqrstuu");
-  return hash;
-}
+const std::string kSha512 = hashOf("$6$rounds=1000$saltsalt$");
+const std::string kBcrypt = hashOf("$2y$04$abcdefghijklmnopqrstuu");
 
 std::string basic(const std::string& encoded) {
   return "Authorization: Basic " + encoded + "\r\n";
@@ -43,7 +37,7 @@ class UsersTest : public HttpServerTest {
   }
   void startWithUsers() {
     settings.users = std::make_shared<Authenticator>(
-        write("# who\nalice:" + sha512() + "\r\n\nbob:" + bcrypt() + "\n"));
+        write("# who\nalice:" + kSha512 + "\r\n\nbob:" + kBcrypt + "\n"));
     start();
   }
 
@@ -51,46 +45,38 @@ class UsersTest : public HttpServerTest {
   TemporaryTree tree_;
 };
 
-struct LoginCase {
-  const char* name;
-  std::string header;
-  std::string body;  // Empty: refused.
-};
-
-class Logins : public UsersTest, public testing::WithParamInterface<LoginCase> {};
-
-TEST_P(Logins, AreCheckedBeforeTheHandler) {
-  startWithUsers();
-  HttpClient client(port());
-  // The second time what has been verified is remembered.
-  for (int i = 0; i < 2; ++i) {
-    const HttpReply reply = client.ask(post("x", GetParam().header));
-    if (GetParam().body.empty()) {
-      EXPECT_EQ(reply.status, 401);
-      EXPECT_THAT(reply.header("WWW-Authenticate"), HasSubstr("Basic realm="));
-      EXPECT_EQ(calls(), 0);
-    } else {
-      EXPECT_EQ(reply.body, GetParam().body);
+TEST_F(UsersTest, AreCheckedBeforeTheHandler) {
+  const struct {
+    std::string header;
+    const char* body;  // Empty: refused.
+  } cases[] = {
+      {basic("YWxpY2U6c2VjcmV0"), "alice:x"},
+      {"authorization: bAsIc  Ym9iOnNlY3JldA==\r\n", "bob:x"},
+      {"", ""},
+      {basic("YWxpY2U6c2VjcmVU"), ""},      // another password
+      {basic("YWxpY2U6c2VjcmV0AA=="), ""},  // the password, a NUL
+      {basic("Y2Fyb2w6c2VjcmV0"), ""},      // nobody's name
+      {basic("YWxpY2U="), ""},              // no colon
+      {basic("!!!!"), ""},
+      {basic(""), ""},
+      {"Authorization: Bearer YWxpY2U6c2VjcmV0\r\n", ""},
+      {basic(std::string(4000, 'A')), ""},
+  };
+  for (const auto& row : cases) {
+    SCOPED_TRACE(row.header.substr(0, 100));
+    startWithUsers();
+    const int before = calls();
+    HttpClient client(port());
+    // The second time what has been verified is remembered.
+    for (int i = 0; i < 2; ++i) {
+      const HttpReply reply = client.ask(post("x", row.header));
+      const bool refused = *row.body == '\0';
+      EXPECT_EQ(reply.status, refused ? 401 : 200);
+      EXPECT_EQ(reply.body, refused ? "not authorized\n" : row.body);
+      EXPECT_EQ(reply.headers.count("WWW-Authenticate"), refused ? 1U : 0U);
+      EXPECT_EQ(calls() - before, refused ? 0 : i + 1);
     }
   }
-}
-
-INSTANTIATE_TEST_SUITE_P(
-    Table, Logins,
-    testing::Values(LoginCase{"Sha512", basic("YWxpY2U6c2VjcmV0"), "alice:x"},
-                    LoginCase{"Bcrypt", "authorization: bAsIc  Ym9iOnNlY3JldA==\r\n", "bob:x"},
-                    LoginCase{"Nobody", "", ""},
-                    LoginCase{"WrongPassword", basic("YWxpY2U6c2VjcmVU"), ""},
-                    LoginCase{"PasswordAndMore", basic("YWxpY2U6c2VjcmV0AA=="), ""},
-                    LoginCase{"UnknownUser", basic("Y2Fyb2w6c2VjcmV0"), ""},
-                    LoginCase{"NoColon", basic("YWxpY2U="), ""},
-                    LoginCase{"NotBase64", basic("!!!!"), ""}, LoginCase{"Empty", basic(""), ""},
-                    LoginCase{"OtherScheme", "Authorization: Bearer YWxpY2U6c2VjcmV0\r\n", ""},
-                    LoginCase{"TooLong", basic(std::string(4000, 'A')), ""}),
-    [](const auto& each) { return each.param.name; });
-
-TEST_F(UsersTest, HealthNeedsNoUser) {
-  startWithUsers();
   EXPECT_EQ(ask("GET /healthz HTTP/1.1\r\nHost: x\r\n\r\n").status, 200);
 }
 
@@ -110,30 +96,25 @@ TEST_F(UsersTest, NewUsersTakeTheOldOnesPlace) {
   startWithUsers();
   const std::string alice = post("x", basic("YWxpY2U6c2VjcmV0"));
   ASSERT_EQ(ask(alice).status, 200);
-  server->setUsers(std::make_shared<Authenticator>(write("bob:" + bcrypt() + "\n")));
+  server->setUsers(std::make_shared<Authenticator>(write("bob:" + kBcrypt + "\n")));
   EXPECT_EQ(ask(alice).status, 401);
 }
 
 TEST_F(UsersTest, UnusableFilesAreToldWithTheirLine) {
-  struct FileCase {
+  const struct {
     std::string text;
     const char* problem;
-  };
-  const FileCase cases[] = {
-      {"", "no users"},
+  } cases[] = {
       {"# nobody\n", "no users"},
       {"alice\n", ":1: expected name:hash"},
-      {"\n:" + sha512() + "\n", ":2: expected name:hash"},
+      {"\n:" + kSha512 + "\n", ":2: expected name:hash"},
       {"alice:$apr1$TqI9WECO$LHZB2DqRlk9nObiB6vJG9.\n", ":1: not a SHA-512"},
-      {"alice:{SHA}W6ph5Mm5Pz8GgiULbPgzG37mj9g=\n", ":1: not a SHA-512"},
-      {"alice:secret\n", ":1: not a SHA-512"},
-      {"alice:" + sha512().substr(1) + "\n", ":1: not a SHA-512"},
-      {"alice:" + sha512() + "x\n", ":1: not a SHA-512"},
+      {"alice:" + kSha512 + "x\n", ":1: not a SHA-512"},
       {"alice:$6$\n", ":1: not a SHA-512"},
-      {"a:" + sha512() + "\na:" + bcrypt() + "\n", ":2: user comes twice"},
+      {"a:" + kSha512 + "\na:" + kBcrypt + "\n", ":2: user comes twice"},
       {std::string((1U << 20U) + 1, '\n'), "larger than 1 MiB"},
   };
-  for (const FileCase& each : cases) {
+  for (const auto& each : cases) {
     try {
       const UserFile users(write(each.text));
       ADD_FAILURE() << each.text;
@@ -161,37 +142,29 @@ TEST(FailureDelaysTest, AttemptsOfAnAddressGetTheirTurnsOneByOne) {
   EXPECT_EQ(delays.reserve("a", now + FailureDelays::kMemory * 2), milliseconds(0));
   delays.succeeded("a");
   EXPECT_EQ(delays.size(), 0U);
-}
-
-TEST(FailureDelaysTest, RemembersAFixedNumberOfAddresses) {
-  FailureDelays delays;
-  auto now = FailureDelays::Clock::time_point() + std::chrono::hours(1);
-  for (int i = 0; i < static_cast<int>(FailureDelays::kAddresses) + 50; ++i) {
-    delays.failed(std::to_string(i), now += std::chrono::milliseconds(1));
-  }
+  for (int i = 0; i < 5000; ++i) delays.failed(std::to_string(i), now += milliseconds(1));
   EXPECT_EQ(delays.size(), FailureDelays::kAddresses);
 }
 
 class TlsTest : public HttpServerTest {
  protected:
   void SetUp() override {
-    const ProgramResult made =
-        runProgram({"/usr/bin/openssl", "req", "-x509", "-newkey", "rsa:2048", "-nodes", "-days",
-                    "2", "-subj", "/CN=localhost", "-addext", "subjectAltName=IP:127.0.0.1",
-                    "-keyout", key(), "-out", certificate()});
-    ASSERT_EQ(made.code, 0) << made.err;
+    ASSERT_EQ(openssl("req -x509 -newkey rsa:2048 -nodes -days 2 -subj /CN=localhost -addext "
+                      "subjectAltName=IP:127.0.0.1 -keyout " +
+                      key() + " -out " + certificate()),
+              0);
   }
 
   std::string key() const { return (tree_.root() / "key.pem").string(); }
   std::string certificate() const { return (tree_.root() / "cert.pem").string(); }
-  std::string other() const { return (tree_.root() / "other.pem").string(); }
 
-  ProgramResult curl(const std::vector<std::string>& options) {
-    std::vector<std::string> all = {"/usr/bin/curl", "-sS",        "--max-time", "20",
-                                    "--cacert",      certificate()};
-    all.insert(all.end(), options.begin(), options.end());
-    all.push_back("https://127.0.0.1:" + std::to_string(port()) + "/cimom");
-    return runProgram(all);
+  static int openssl(const std::string& words) {
+    return runProgram({"/bin/sh", "-c", "/usr/bin/openssl " + words}).code;
+  }
+  ProgramResult curl(const std::string& options) {
+    return runProgram({"/bin/sh", "-c",
+                       "/usr/bin/curl -sS --max-time 20 --cacert " + certificate() + " " + options +
+                           " https://127.0.0.1:" + std::to_string(port()) + "/cimom"});
   }
 
   TemporaryTree tree_;
@@ -200,19 +173,18 @@ class TlsTest : public HttpServerTest {
 TEST_F(TlsTest, RepliesCrossItWholeFromVersion12On) {
   settings.tls = readTlsFiles(certificate(), key());
   start();
-  EXPECT_EQ(curl({"--data-binary", "hello", "--tlsv1.3"}).out, ":hello");
-  EXPECT_EQ(curl({"--data-binary", "hello", "--tls-max", "1.2"}).out, ":hello");
-  EXPECT_NE(
-      curl({"--data-binary", "hello", "--tls-max", "1.1", "--ciphers", "DEFAULT@SECLEVEL=0"}).code,
-      0);
-  EXPECT_EQ(curl({"--data-binary", "size=1000000"}).out.size(), 1000000U);
+  EXPECT_EQ(curl("--data-binary hello --tlsv1.3").out, ":hello");
+  EXPECT_EQ(curl("--data-binary hello --tls-max 1.2").out, ":hello");
+  EXPECT_NE(curl("--data-binary hello --tls-max 1.1 --ciphers DEFAULT@SECLEVEL=0").code, 0);
+  EXPECT_EQ(curl("--data-binary size=1000000").out.size(), 1000000U);
   // Plain HTTP is no handshake.
   EXPECT_EQ(ask(post("x")).status, 0);
 }
 
 TEST_F(TlsTest, FilesThatDoNotFitAreTold) {
-  ASSERT_EQ(runProgram({"/usr/bin/openssl", "genrsa", "-out", other(), "2048"}).code, 0);
-  EXPECT_THROW(readTlsFiles(certificate(), other()), HostError);
+  const std::string other = (tree_.root() / "other.pem").string();
+  ASSERT_EQ(openssl("genrsa -out " + other + " 2048"), 0);
+  EXPECT_THROW(readTlsFiles(certificate(), other), HostError);
   EXPECT_THROW(readTlsFiles(key(), key()), HostError);
   EXPECT_THROW(readTlsFiles(certificate(), tree_.root().string()), HostError);
 }

@@ -140,10 +140,8 @@ class HttpClient {
     for (std::string line; readLine(line);) {
       const std::size_t size = std::strtoul(line.c_str(), nullptr, 16);
       if (!readBytes(size, reply.body) || !readLine(line)) return;
-      if (size == 0) {
-        reply.complete = true;
-        return;
-      }
+      reply.complete = size == 0;
+      if (reply.complete) return;
     }
   }
 

@@ -7,7 +7,9 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <atomic>
 #include <condition_variable>
+#include <deque>
 #include <functional>
 #include <mutex>
 #include <string>
@@ -74,20 +76,13 @@ class HttpServerTest : public testing::Test {
     changed_.wait_for(lock, std::chrono::seconds(20), [&] { return records_.size() >= count; });
     return records_;
   }
-
   /// Waits until `count` requests have reached the handler.
   void waitForCalls(int count) {
     std::unique_lock<std::mutex> lock(mutex_);
     changed_.wait_for(lock, std::chrono::seconds(20), [&] { return calls_ >= count; });
   }
-  int calls() {
-    const std::lock_guard<std::mutex> lock(mutex_);
-    return calls_;
-  }
-  std::size_t written() {
-    const std::lock_guard<std::mutex> lock(mutex_);
-    return written_;
-  }
+  int calls() const { return calls_; }
+  std::size_t written() const { return written_; }
 
   cimhost::HttpSettings settings;
   Latch go;
@@ -102,8 +97,6 @@ class HttpServerTest : public testing::Test {
       ++calls_;
       changed_.notify_all();
     }
-    cimhost::RequestSummary summary{"Echo", request.header("CIMObject").value_or("none"), 200, 0,
-                                    1};
     if (body == "wait") go.wait();
     reply.begin(200, {{"Content-Type", "application/xml"}, {"CIMOperation", "MethodResponse"}});
     if (body.rfind("size=", 0) == 0) {
@@ -114,7 +107,7 @@ class HttpServerTest : public testing::Test {
     } else {
       reply.write(std::string(request.user()) + ":" + body);
     }
-    return summary;
+    return {"Echo", request.header("CIMObject").value_or("none"), 200, 0, 1};
   }
 
   // Lines of 100 bytes that tell their number.
@@ -123,7 +116,6 @@ class HttpServerTest : public testing::Test {
       std::string line = std::to_string(sent);
       line.resize(std::min<std::size_t>(100, size - sent), '.');
       if (!reply.write(line)) return;
-      const std::lock_guard<std::mutex> lock(mutex_);
       written_ += line.size();
     }
   }
@@ -131,6 +123,6 @@ class HttpServerTest : public testing::Test {
   std::mutex mutex_;
   std::condition_variable changed_;
   std::vector<cimhost::RequestRecord> records_;
-  int calls_ = 0;
-  std::size_t written_ = 0;
+  std::atomic<int> calls_{0};
+  std::atomic<std::size_t> written_{0};
 };

@@ -16,26 +16,21 @@ using testing::StartsWith;
 class KeptProperty : public CimXmlTest {
  protected:
   std::string modify(const std::string& property) {
-    return ask("ModifyInstance", parameter("ModifiedInstance",
-                                           "<VALUE.NAMEDINSTANCE><INSTANCENAME "
-                                           "CLASSNAME='Test_Memory'><KEYBINDING NAME='Name'>"
-                                           "<KEYVALUE>m</KEYVALUE></KEYBINDING></INSTANCENAME>"
-                                           "<INSTANCE CLASSNAME='Test_Memory'>" +
-                                               property + "</INSTANCE></VALUE.NAMEDINSTANCE>"));
+    return ask("ModifyInstance",
+               parameter("ModifiedInstance", "<VALUE.NAMEDINSTANCE>" +
+                                                 instanceElement("Test_Memory", "m") +
+                                                 "<INSTANCE CLASSNAME='Test_Memory'>" + property +
+                                                 "</INSTANCE></VALUE.NAMEDINSTANCE>"));
   }
   std::string get() {
-    const std::string before = "<IRETURNVALUE><INSTANCE CLASSNAME='Test_Memory'>";
-    const std::string after = "</INSTANCE></IRETURNVALUE>";
-    const std::string text =
-        ask("GetInstance", instanceName("InstanceName", "Test_Memory", "m") +
-                               value("LocalOnly", "FALSE") + value("IncludeQualifiers", "TRUE") +
-                               value("IncludeClassOrigin", "TRUE"));
-    EXPECT_THAT(text, StartsWith(before));
-    return text.substr(before.size(), text.size() - before.size() - after.size());
+    return ask("GetInstance", instanceName("InstanceName", "Test_Memory", "m") +
+                                  value("LocalOnly", "FALSE") + value("IncludeQualifiers", "TRUE") +
+                                  value("IncludeClassOrigin", "TRUE"));
   }
   void expectKept(const std::string& sent, const std::string& returned) {
     EXPECT_EQ(modify(sent), "") << sent;
-    EXPECT_EQ(get(), returned);
+    EXPECT_EQ(get(), "<IRETURNVALUE><INSTANCE CLASSNAME='Test_Memory'>" + returned +
+                         "</INSTANCE></IRETURNVALUE>");
   }
 };
 
@@ -50,18 +45,11 @@ TEST_F(KeptProperty, Scalars) {
     const char* returned = sent;
   } cases[] = {
       {"boolean", "true", "TRUE"},
-      {"boolean", "FALSE"},
       {"uint8", "255"},
-      {"sint8", "-128"},
-      {"uint16", "65535"},
-      {"sint16", "-32768"},
-      {"uint32", "4294967295"},
-      {"sint32", "-2147483648"},
       {"uint64", "18446744073709551615"},
       {"sint64", "-9223372036854775808"},
       {"real32", "0.1"},
       {"real32", "16777216.0"},
-      {"real64", "0.30000000000000004"},
       {"real64", "3", "3.0"},
       {"real64", "1.7976931348623157e+308"},
       {"real64", "5e-324", "5.0e-324"},
@@ -75,7 +63,6 @@ TEST_F(KeptProperty, Scalars) {
       {"string", "&#65;&#x20AC;", "A\xE2\x82\xAC"},
       {"string", "\x7F\xC3\xA9\xE2\x82\xAC\xF0\x9F\x98\x80"},
       {"char16", "\xE2\x82\xAC"},
-      {"char16", "&lt;"},
       {"datetime", "20260131235959.123456-060"},
       {"datetime", "00000001******.******:000"},
   };
@@ -89,11 +76,8 @@ TEST_F(KeptProperty, Elements) {
     const char* sent;
     const char* returned = sent;
   } cases[] = {
-      {"<PROPERTY NAME='P' TYPE='string'><VALUE/></PROPERTY>",
-       "<PROPERTY NAME='P' TYPE='string'><VALUE></VALUE></PROPERTY>"},
       {"<PROPERTY NAME='P' TYPE='uint8'/>", "<PROPERTY NAME='P' TYPE='uint8'></PROPERTY>"},
       {"<PROPERTY.ARRAY NAME='P' TYPE='uint8' ARRAYSIZE='3'></PROPERTY.ARRAY>"},
-      {"<PROPERTY.ARRAY NAME='P' TYPE='real64'><VALUE.ARRAY></VALUE.ARRAY></PROPERTY.ARRAY>"},
       {"<PROPERTY.ARRAY NAME='P' TYPE='string'><VALUE.ARRAY><VALUE>a,b</VALUE><VALUE></VALUE>"
        "<VALUE>[]</VALUE></VALUE.ARRAY></PROPERTY.ARRAY>"},
       {"<PROPERTY NAME='P' TYPE='string' CLASSORIGIN='Test_Base' PROPAGATED='true'><QUALIFIER "
@@ -166,14 +150,11 @@ std::string nestedKeys(int depth) {
   return "<PROPERTY.REFERENCE NAME='P'>" + key + "</PROPERTY.REFERENCE>";
 }
 
-TEST_F(KeptProperty, DepthOfEmbeddedInstances) {
-  expectKept(nestedInstances(8), nestedInstances(8));
-  EXPECT_THAT(modify(nestedInstances(9)), StartsWith("<ERROR CODE='4'"));
-}
-
 TEST_F(KeptProperty, WrongValuesAreRefused) {
   const std::string array = "<PROPERTY.ARRAY NAME='P' TYPE='uint8'";
   const std::string embedded = "<PROPERTY NAME='P' TYPE='string' EmbeddedObject=";
+  const std::string plain = "<PROPERTY NAME='P' TYPE='string'/>";
+  const std::string key = "<KEYBINDING NAME='k'><KEYVALUE VALUETYPE='numeric'>x</KEYVALUE>";
   for (const std::string& wrong :
        {scalar("uint8", "256"), scalar("uint32", ""), scalar("boolean", "1"), scalar("real64", "x"),
         scalar("char16", "ab"), scalar("datetime", "today"),
@@ -181,21 +162,19 @@ TEST_F(KeptProperty, WrongValuesAreRefused) {
         array + " ARRAYSIZE='2'><VALUE.ARRAY><VALUE>1</VALUE></VALUE.ARRAY></PROPERTY.ARRAY>",
         embedded + "'instance'><VALUE>no xml</VALUE></PROPERTY>",
         embedded + "'object'><VALUE>&lt;CLASS NAME='A'/&gt;</VALUE></PROPERTY>",
-        std::string("<PROPERTY NAME='1' TYPE='string'/>"),
-        std::string("<PROPERTY NAME='P' TYPE='string'/><PROPERTY NAME='p' TYPE='uint8'/>"),
-        reference("<INSTANCENAME CLASSNAME='A'><KEYBINDING NAME='k'><KEYVALUE "
-                  "VALUETYPE='numeric'>x</KEYVALUE></KEYBINDING></INSTANCENAME>"),
-        nestedKeys(17)}) {
+        std::string("<PROPERTY NAME='1' TYPE='string'/>"), plain + plain,
+        reference("<INSTANCENAME CLASSNAME='A'>" + key + "</KEYBINDING></INSTANCENAME>"),
+        nestedKeys(17), nestedInstances(9)}) {
     EXPECT_THAT(modify(wrong),
                 StartsWith("<ERROR CODE='4' DESCRIPTION='parameter ModifiedInstance: "))
         << wrong;
   }
-  EXPECT_EQ(answer(intrinsic("CreateInstance",
-                             parameter("NewInstance",
-                                       "<INSTANCE CLASSNAME='A'>"
-                                       "<PROPERTY NAME='P' TYPE='uint128'/></INSTANCE>")))
-                .headers["CIMError"],
-            "request-not-valid");
+  EXPECT_EQ(modify(nestedInstances(8)), "");
+  const std::string unknown =
+      "<INSTANCE CLASSNAME='A'><PROPERTY NAME='P' TYPE='uint128'/></INSTANCE>";
+  EXPECT_EQ(
+      answer(intrinsic("CreateInstance", parameter("NewInstance", unknown))).headers["CIMError"],
+      "request-not-valid");
 }
 
 // The provider gives back what it was called with, and 7.
