@@ -262,10 +262,14 @@ TEST_F(HttpServerTest, RunningRequestsEndBeforeTheServerDoes) {
   start();
   HttpClient client(port());
   HttpClient idle(port());
+  HttpClient half(port());
   ASSERT_EQ(idle.ask(post("x")).status, 200);
   client.send(post("wait"));
   waitForCalls(2);
+  half.send(head("Expect: 100-continue\r\nContent-Length: 2") + "x");
+  half.take(1);
   server->drain();
+  EXPECT_TRUE(half.isClosed());
   EXPECT_FALSE(HttpClient(port()).isConnected());
   EXPECT_EQ(idle.ask(kHealth).status, 503);
   EXPECT_FALSE(server->waitUntilIdle(std::chrono::milliseconds(10)));
@@ -280,8 +284,6 @@ TEST_F(HttpServerTest, RunningRequestsEndBeforeTheServerDoes) {
 TEST_F(HttpServerTest, StoppingCutsWhatIsStuck) {
   start();
   HttpClient stuck(port());
-  HttpClient sending(port());
-  sending.send(length("100"));
   SlowClient reading(port());
   stuck.send(post("wait"));
   waitForCalls(2);
@@ -289,10 +291,9 @@ TEST_F(HttpServerTest, StoppingCutsWhatIsStuck) {
   server->cut();
   EXPECT_EQ(stuck.receive().status, 503);
   EXPECT_FALSE(reading.receive().complete);
-  EXPECT_TRUE(sending.isClosed());
   go.open();
   server->stop();
-  EXPECT_EQ(records(3).size(), 3U);
+  EXPECT_EQ(records(2).size(), 2U);
 }
 
 }  // namespace

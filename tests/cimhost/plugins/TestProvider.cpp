@@ -213,7 +213,9 @@ class TestProvider final : public CIMInstanceProvider,
   void initialize(CIMOMHandle& handle) override {
     record("initialize");
     server_ = &handle;
-    if (name_ == "ThrowsInInitialize") throw CIMException(CIM_ERR_FAILED, "no luck");
+    const char* file = std::getenv("TEST_PROVIDER_FAILS_ONCE");
+    const bool fails = file != nullptr && std::remove(file) == 0;
+    if (fails || name_ == "ThrowsInInitialize") throw CIMException(CIM_ERR_FAILED, "no luck");
     if (name_ == "ThrowsIntInInitialize") throw 1;
   }
 
