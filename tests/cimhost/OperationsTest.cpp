@@ -35,6 +35,7 @@ TEST(Operations, InstancesAreThoseThatAServerWouldDeliver) {
       {"Test_LateDelivery", "0 ", {"a"}, ""},
       {"Test_TwoBatches", "0 ", {"b"}, ""},
       {"Test_ThrowsCim", "2 not for you", {}},
+      {"Test_ThrowsSuccess", "1 odd", {}},
       {"Test_ThrowsOddCode", "1 odd", {}},
       {"Test_ThrowsNotSupported", "0 ", {}, "7 no"},
       {"Test_ThrowsPegasus", "1 The CIM name is not valid: 1x", {}},

@@ -1,6 +1,9 @@
 #include "tests/cimhost/TestModel.h"
 
-#include <Pegasus/Common/CIMMethod.h>
+#include "cimhost/mof/MofReader.h"
+
+#include <sstream>
+#include <stdexcept>
 
 namespace cimhost::test {
 
@@ -40,33 +43,6 @@ bool RecordingSink::deliverMethodResult(const CIMValue& returned,
   return true;
 }
 
-CIMClass makeClass(const std::string& name, const std::string& superclass,
-                   const std::vector<std::string>& properties) {
-  CIMClass declaration(CIMName(name.c_str()),
-                       superclass.empty() ? CIMName() : CIMName(superclass.c_str()));
-  for (const std::string& each : properties) {
-    const CIMType type = each == "Size" ? CIMTYPE_UINT64 : CIMTYPE_STRING;
-    CIMProperty property(CIMName(each.c_str()), CIMValue(type, false));
-    if (each == "Name") property.addQualifier(CIMQualifier(CIMName("Key"), CIMValue(true)));
-    declaration.addProperty(property);
-  }
-  return declaration;
-}
-
-CIMClass makeAssociation(const std::string& name, const std::string& superclass,
-                         const std::vector<std::pair<const char*, const char*>>& ends) {
-  CIMClass declaration = makeClass(name, superclass, {});
-  if (superclass.empty()) {
-    declaration.addQualifier(CIMQualifier(CIMName("Association"), CIMValue(true)));
-  }
-  for (const auto& [role, className] : ends) {
-    CIMProperty reference(CIMName(role), CIMValue(CIMTYPE_REFERENCE, false), 0, CIMName(className));
-    reference.addQualifier(CIMQualifier(CIMName("Key"), CIMValue(true)));
-    declaration.addProperty(reference);
-  }
-  return declaration;
-}
-
 CIMObjectPath pathOf(const std::string& className) {
   return CIMObjectPath(String((className + ".Name=\"a\"").c_str()));
 }
@@ -81,60 +57,59 @@ std::string textOf(const OperationStatus& status) {
   return std::to_string(static_cast<int>(status.code)) + " " + status.message;
 }
 
+namespace {
+
 // Disks have well-behaved links, Test_Odd the others.
-void TestHost::addAssociations() {
-  repository.addClass(kNamespace, makeClass("Test_Port", "", {"Name"}));
-  repository.addClass(kNamespace, makeClass("Test_FastPort", "Test_Port", {}));
-  repository.addClass(kNamespace, makeClass("Test_Odd", "", {"Name"}));
-  repository.addClass(
-      kNamespace, makeAssociation("Link_Port", "", {{"Disk", "Test_Disk"}, {"Port", "Test_Port"}}));
-  repository.addClass(kNamespace, makeAssociation("Link_FastPort", "Link_Port", {}));
-  repository.addClass(
-      kNamespace,
-      makeAssociation("Link_Copy", "", {{"Original", "Test_Base"}, {"Copy", "Test_Base"}}));
-  repository.addClass(
-      kNamespace, makeAssociation("Link_Unserved", "", {{"A", "Test_Disk"}, {"B", "Test_Port"}}));
-  std::vector<std::string> links = {"Link_Port", "Link_FastPort", "Link_Copy"};
-  for (const char* name : {"Link_Echo", "Link_NoComplete", "Link_ThrowsNotSupported",
-                           "Link_ThrowsCim", "Link_Class"}) {
-    repository.addClass(kNamespace,
-                        makeAssociation(name, "", {{"Odd", "Test_Odd"}, {"Port", "Test_Port"}}));
-    links.push_back(name);
-  }
-  for (const std::string& name : links) {
-    served.add({kNamespace, CIMName(name.c_str()), true, false, "test.xml", {}});
-  }
-}
+constexpr const char* kClasses = R"(
+class Test_Base { [Key] string Name; uint32 Format(); };
+class Test_Unserved : Test_Base { uint64 Size; };
+class Test_Disk : Test_Base { string Text; };
+class Test_BigDisk : Test_Disk { uint64 Size; };
+class Test_Port { [Key] string Name; };
+class Test_FastPort : Test_Port {};
+class Test_Odd { [Key] string Name; };
+class Test_Typed {
+  [Key] string Name; uint32 Take(uint8 Count, string Names[], Test_Disk REF Ref); };
+[Association] class Link_Port { [Key] Test_Disk REF Disk; [Key] Test_Port REF Port; };
+class Link_FastPort : Link_Port {};
+[Association] class Link_Copy { [Key] Test_Base REF Original; [Key] Test_Base REF Copy; };
+[Association] class Link_Unserved { [Key] Test_Disk REF A; [Key] Test_Port REF B; };
+)";
+
+// Plain ones, and odd links.
+constexpr const char* kNames =
+    "Test_Array Test_Nothing Test_OnlyCompletes Test_NoComplete Test_LateDelivery Test_TwoBatches "
+    "Test_ThrowsCim Test_ThrowsSuccess Test_ThrowsOddCode Test_ThrowsNotSupported "
+    "Test_ThrowsPegasus Test_ThrowsStd Test_ThrowsInt Test_Uninitialized Test_Many "
+    "Test_ManyNoComplete Test_ManyThrows Test_Swallows Test_ServerDisks Test_Nested "
+    "Test_NoNamespace Test_EchoPath Test_Memory Test_User Link_Echo Link_NoComplete "
+    "Link_ThrowsNotSupported Link_ThrowsCim Link_Class";
+
+}  // namespace
 
 TestHost::TestHost(const std::string& providerName) {
-  repository.addNamespace(kNamespace);
-  CIMClass base = makeClass("Test_Base", "", {"Name"});
-  base.addMethod(CIMMethod(CIMName("Format"), CIMTYPE_UINT32));
-  repository.addClass(kNamespace, base);
-  repository.addClass(kNamespace, makeClass("Test_Unserved", "Test_Base", {"Size"}));
-  repository.addClass(kNamespace, makeClass("Test_Disk", "Test_Base", {"Text"}));
-  repository.addClass(kNamespace, makeClass("Test_BigDisk", "Test_Disk", {"Size"}));
-  for (const char* name : {"Test_Array",         "Test_Nothing",
-                           "Test_OnlyCompletes", "Test_NoComplete",
-                           "Test_LateDelivery",  "Test_TwoBatches",
-                           "Test_ThrowsCim",     "Test_ThrowsSuccess",
-                           "Test_ThrowsOddCode", "Test_ThrowsNotSupported",
-                           "Test_ThrowsPegasus", "Test_ThrowsStd",
-                           "Test_ThrowsInt",     "Test_Uninitialized",
-                           "Test_Many",          "Test_ManyNoComplete",
-                           "Test_ManyThrows",    "Test_Swallows",
-                           "Test_ServerDisks",   "Test_Nested",
-                           "Test_NoNamespace",   "Test_EchoPath",
-                           "Test_Memory"}) {
-    repository.addClass(kNamespace, makeClass(name, "", {"Name", "Size"}));
-    served.add({kNamespace, CIMName(name), false, false, "test.xml", {}});
+  std::string mof = kClasses;
+  for (const char* name : {"Link_Port", "Link_FastPort", "Link_Copy"}) serve(name, true);
+  std::istringstream names(kNames);
+  for (std::string name; names >> name;) {
+    const bool link = name[0] == 'L';
+    mof += (link ? "[Association] class " : "class ") + name +
+           (link ? " { [Key] Test_Odd REF Odd; [Key] Test_Port REF Port; };\n"
+                 : " { [Key] string Name; uint64 Size; };\n");
+    serve(name.c_str(), link);
   }
-  served.add({kNamespace, CIMName("Test_Disk"), false, true, "test.xml", {}});
-  served.add({CIMNamespaceName(), CIMName("Test_BigDisk"), false, false, "test.xml", {}});
-  addAssociations();
+  serve("Test_Disk", false, true);
+  serve("Test_Typed", false, true);
+  served.add({CIMNamespaceName(), "Test_BigDisk", false, false, "test.xml", {}});
+  MofReader reader(repository);
+  if (!reader.readText(mof, "test.mof", kNamespace)) throw std::runtime_error("malformed MOF");
   setEmbeddedHost(&cimom);
   handle_ = new CIMOMHandle;
   provider.load(TEST_PROVIDER_FILE, providerName, *handle_);
+}
+
+void TestHost::serve(const char* name, bool association, bool methods) {
+  served.add({kNamespace, name, association, methods, "test.xml", {}});
 }
 
 TestHost::~TestHost() {

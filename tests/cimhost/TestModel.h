@@ -5,7 +5,6 @@
 #include "cimhost/Text.h"
 
 #include <string>
-#include <utility>
 #include <vector>
 
 namespace cimhost::test {
@@ -31,14 +30,6 @@ class RecordingSink : public InstanceSink,
   std::string returnValue = "not delivered";
 };
 
-/// A class with the given properties, all strings but `Size` (uint64); Name is the key.
-Pegasus::CIMClass makeClass(const std::string& name, const std::string& superclass,
-                            const std::vector<std::string>& properties);
-
-/// An association class with references, each a role and a class; the references are its keys.
-Pegasus::CIMClass makeAssociation(const std::string& name, const std::string& superclass,
-                                  const std::vector<std::pair<const char*, const char*>>& ends);
-
 /// A repository with the classes of the test provider in root/test, that provider loaded, and the
 /// operations over both.
 class TestHost {
@@ -55,7 +46,7 @@ class TestHost {
   EmbeddedCimom cimom{repository, operations};
 
  private:
-  void addAssociations();
+  void serve(const char* name, bool association = false, bool methods = false);
 
   Pegasus::CIMOMHandle* handle_;
 };

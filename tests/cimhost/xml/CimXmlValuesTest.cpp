@@ -3,8 +3,6 @@
 #include "cimhost/output/XmlBuffer.h"
 #include "tests/cimhost/xml/CimXmlTestSupport.h"
 
-#include <Pegasus/Common/CIMMethod.h>
-#include <Pegasus/Common/CIMParameter.h>
 #include <gmock/gmock.h>
 
 namespace cimhost::test {
@@ -180,19 +178,6 @@ TEST_F(KeptProperty, WrongValuesAreRefused) {
 // The provider gives back what it was called with, and 7.
 class Parameters : public CimXmlTest {
  protected:
-  void SetUp() override {
-    using namespace Pegasus;
-    CIMClass declaration = makeClass("Test_Typed", "", {"Name"});
-    CIMMethod method(CIMName("Take"), CIMTYPE_UINT32);
-    method.addParameter(CIMParameter(CIMName("Count"), CIMTYPE_UINT8));
-    method.addParameter(CIMParameter(CIMName("Names"), CIMTYPE_STRING, true));
-    method.addParameter(
-        CIMParameter(CIMName("Ref"), CIMTYPE_REFERENCE, false, 0, CIMName("Test_Disk")));
-    declaration.addMethod(method);
-    host.repository.addClass(kNamespace, declaration);
-    host.served.add({kNamespace, CIMName("Test_Typed"), false, true, "test.xml", {}});
-  }
-
   // Without the return value and the object's path, which the provider adds.
   std::string take(const std::string& parameters) {
     const std::string result = answer(extrinsic("Take", parameters, "Test_Typed")).result();
@@ -251,6 +236,7 @@ TEST_F(CimXmlTest, MethodResults) {
   const Reply reply = answer(extrinsic("Format", ""));
   EXPECT_THAT(reply.body, testing::HasSubstr("<METHODRESPONSE NAME=\"Format\">\n<RETURNVALUE"));
   EXPECT_EQ(reply.summary.target, "root/test:Test_Disk");
+  EXPECT_EQ(reply.summary.objects, 2u) << "the return value and a parameter";
 }
 
 }  // namespace
