@@ -1,4 +1,3 @@
-#include <gmock/gmock.h>
 #include <mntent.h>
 #include <sys/statvfs.h>
 
@@ -8,7 +7,6 @@
 #include <set>
 
 #include "tests/examples/hostinfo/FakeHost.h"
-#include "tests/examples/hostinfo/HostinfoLibrary.h"
 
 using testing::ElementsAre;
 using testing::SizeIs;
@@ -33,7 +31,7 @@ long kib(fsblkcnt_t blocks, const struct statvfs& space) {
   return static_cast<long>(std::min<long double>(value, LONG_MAX));
 }
 
-TEST(FileSystems, AreThoseOfTheMountTable) {
+TEST(RealFileSystems, AreThoseOfTheMountTable) {
   HostinfoLibrary library;
   const auto names = library.textsOfAll("hostFileSystemCount", "hostFileSystemName");
   const std::set<std::string> distinct(names.begin(), names.end());
@@ -41,7 +39,7 @@ TEST(FileSystems, AreThoseOfTheMountTable) {
   EXPECT_EQ(distinct.size(), names.size());
 }
 
-TEST(FileSystems, HaveTheSizesThatStatvfsTells) {
+TEST(RealFileSystems, HaveTheSizesThatStatvfsTells) {
   HostinfoLibrary library;
   const int count = library.count("hostFileSystemCount");
   ASSERT_GT(count, 0);
@@ -60,38 +58,33 @@ TEST(FileSystems, HaveTheSizesThatStatvfsTells) {
   }
 }
 
-TEST(FileSystems, AMountOverAnotherReplacesIt) {
-  FakeHost host;
-  const std::string a = host.makeDirectory("a");
-  const std::string b = host.makeDirectory("b");
-  host.writeMounts("/dev/one " + a + " ext4 rw 0 0\n/dev/two " + b + " xfs rw 0 0\n/dev/three " +
-                   a + " vfat ro 0 0\n");
-  HostinfoLibrary library;
-  EXPECT_THAT(library.textsOfAll("hostFileSystemCount", "hostFileSystemName"), ElementsAre(b, a));
-  EXPECT_EQ(library.text("hostFileSystemDevice", 1), "/dev/three");
-  EXPECT_EQ(library.text("hostFileSystemType", 1), "vfat");
-  EXPECT_EQ(library.integer("hostFileSystemReadOnly", 0), 0);
-  EXPECT_EQ(library.integer("hostFileSystemReadOnly", 1), 1);
+using FileSystems = FakeHostTest;
+
+TEST_F(FileSystems, AMountOverAnotherReplacesIt) {
+  EXPECT_EQ(library_.count("hostFileSystemCount"), 0) << "no mount table";
+  const std::string a = host_.makeDirectory("a");
+  const std::string b = host_.makeDirectory("b");
+  host_.writeMounts("/dev/one " + a + " ext4 rw 0 0\n/dev/two " + b + " xfs rw 0 0\n/dev/three " +
+                    a + " vfat ro 0 0\n");
+  EXPECT_THAT(library_.textsOfAll("hostFileSystemCount", "hostFileSystemName"), ElementsAre(b, a));
+  EXPECT_EQ(library_.text("hostFileSystemDevice", 1), "/dev/three");
+  EXPECT_EQ(library_.text("hostFileSystemType", 1), "vfat");
+  EXPECT_EQ(library_.integer("hostFileSystemReadOnly", 0), 0);
+  EXPECT_EQ(library_.integer("hostFileSystemReadOnly", 1), 1);
 }
 
-TEST(FileSystems, AnEscapedMountPointIsFoundAndTold) {
-  FakeHost host;
-  const std::string directory = host.makeDirectory("my disk\t#1\\2");
-  host.writeMounts("/dev/x " + host.makeDirectory("my") + "\\040disk\\011#1\\1342 ext4 rw 0 0\n");
-  HostinfoLibrary library;
-  EXPECT_THAT(library.textsOfAll("hostFileSystemCount", "hostFileSystemName"),
-              ElementsAre(directory));
-}
-
-TEST(FileSystems, AMountPointThatIsNoUtf8IsMeasuredUnderItsRealName) {
-  FakeHost host;
-  const std::string directory = host.makeDirectory("caf\xE9");
-  host.writeMounts("/dev/x " + directory + " ext4 rw 0 0\n");
-  HostinfoLibrary library;
-  ASSERT_EQ(library.count("hostFileSystemCount"), 1);
-  EXPECT_EQ(library.text("hostFileSystemName", 0),
-            directory.substr(0, directory.size() - 1) + "\xEF\xBF\xBD");
-  EXPECT_GT(library.longInteger("hostFileSystemSizeKiB", 0), 0);
+TEST_F(FileSystems, AreMeasuredUnderTheirRealNames) {
+  const std::string root = host_.makeDirectory("");
+  const std::tuple<const char*, const char*, const char*> cases[] = {
+      {"my disk\t#1\\2", "my\\040disk\\011#1\\1342", "my disk\t#1\\2"},
+      {"caf\xE9", "caf\xE9", "caf\xEF\xBF\xBD"}};  // no UTF-8
+  for (const auto& [directory, inTable, told] : cases) {
+    host_.makeDirectory(directory);
+    host_.writeMounts("/dev/x " + root + inTable + " ext4 rw 0 0\n");
+    EXPECT_THAT(library_.textsOfAll("hostFileSystemCount", "hostFileSystemName"),
+                ElementsAre(root + told));
+    EXPECT_GT(library_.longInteger("hostFileSystemSizeKiB", 0), 0);
+  }
 }
 
 std::string repeated(const std::string& text, int times) {
@@ -100,7 +93,7 @@ std::string repeated(const std::string& text, int times) {
   return result;
 }
 
-TEST(FileSystems, LinesThatAreNoneDoNotHideTheOthers) {
+TEST_F(FileSystems, LinesThatAreNoneDoNotHideTheOthers) {
   const std::string ignored[] = {"proc /proc proc rw 0 0\n",  // no blocks
                                  "map /tmp autofs rw 0 0\n", "x /no/such/directory ext4 rw 0 0\n",
                                  "\n", "        \n", "/dev/x\n", "/dev/x /tmp ext4\n",
@@ -108,25 +101,17 @@ TEST(FileSystems, LinesThatAreNoneDoNotHideTheOthers) {
                                  // "/" for the kernel, too long for a buffer
                                  "/dev/x " + repeated("/.", 600) + " ext4 rw 0 0\n",
                                  "/dev/x /tmp ext4 " + std::string(70000, 'o') + " 0 0\n"};
-  FakeHost host;
-  HostinfoLibrary library;
   for (const std::string& line : ignored) {
-    host.writeMounts(line + "good / ext4 rw 0 0\n");
-    EXPECT_THAT(library.textsOfAll("hostFileSystemCount", "hostFileSystemDevice"),
+    host_.writeMounts(line + "good / ext4 rw 0 0\n");
+    EXPECT_THAT(library_.textsOfAll("hostFileSystemCount", "hostFileSystemDevice"),
                 ElementsAre("good"))
         << line.substr(0, 80);
   }
-  host.writeMounts("good / ext4 rw 0 0\ncut /tmp ext4 r");  // unfinished
-  EXPECT_EQ(library.count("hostFileSystemCount"), 1);
+  host_.writeMounts("good / ext4 rw 0 0\ncut /tmp ext4 r");  // unfinished
+  EXPECT_EQ(library_.count("hostFileSystemCount"), 1);
 }
 
-TEST(FileSystems, NoMountTableMeansNoInstance) {
-  FakeHost host;
-  HostinfoLibrary library;
-  EXPECT_EQ(library.count("hostFileSystemCount"), 0);
-}
-
-TEST(FileSystems, TextIsUtf8ThatXmlCanCarry) {
+TEST_F(FileSystems, TextIsUtf8ThatXmlCanCarry) {
   const std::string bad = "\xEF\xBF\xBD";  // U+FFFD
   const std::pair<std::string, std::string> cases[] = {
       {"\\040\\134040\\", " \\040\\"},
@@ -148,16 +133,14 @@ TEST(FileSystems, TextIsUtf8ThatXmlCanCarry) {
       {"x" + repeated("\xE2\x82\xAC", 400), "x" + repeated("\xE2\x82\xAC", 340)},
       {std::string(1023, '\xFF'), repeated(bad, 341)},
   };
-  FakeHost host;
-  HostinfoLibrary library;
   for (const auto& [inFile, told] : cases) {
-    host.writeMounts(inFile + " / ext4 rw 0 0\n");
-    ASSERT_EQ(library.count("hostFileSystemCount"), 1);
-    EXPECT_EQ(library.text("hostFileSystemDevice", 0), told);
+    host_.writeMounts(inFile + " / ext4 rw 0 0\n");
+    ASSERT_EQ(library_.count("hostFileSystemCount"), 1);
+    EXPECT_EQ(library_.text("hostFileSystemDevice", 0), told);
   }
 }
 
-class MountOptions : public testing::Test {
+class MountOptions : public FakeHostTest {
  protected:
   std::string bytesFor(const std::string& options) {
     host_.writeMounts("x / ext4 " + options + " 0 0\n");
@@ -168,9 +151,6 @@ class MountOptions : public testing::Test {
     bytesFor(options);
     return library_.texts("hostFileSystemMountOptions", 0);
   }
-
-  FakeHost host_;
-  HostinfoLibrary library_;
 };
 
 TEST_F(MountOptions, LieAsTheProviderReadsThem) {

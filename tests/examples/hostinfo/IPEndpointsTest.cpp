@@ -10,31 +10,22 @@
 
 namespace {
 
-struct Endpoint {
-  std::string port, address;
-  int prefix, protocol;
-  bool operator<(const Endpoint& other) const {
-    return std::tie(port, address, prefix, protocol) <
-           std::tie(other.port, other.address, other.prefix, other.protocol);
-  }
-  bool operator==(const Endpoint& other) const { return !(*this < other) && !(other < *this); }
-};
-
-std::string numericText(const sockaddr* address, socklen_t size) {
-  char text[NI_MAXHOST] = "";
-  EXPECT_EQ(getnameinfo(address, size, text, sizeof text, nullptr, 0, NI_NUMERICHOST), 0);
-  return std::string(text).substr(0, std::string(text).find('%'));  // without a zone
-}
+// Port, address, prefix length, and 4 or 6.
+using Endpoint = std::tuple<std::string, std::string, int, int>;
 
 template <class Address>
 Endpoint endpointOf(const ifaddrs& from, int protocol, std::size_t offset, std::size_t length) {
-  Endpoint result{from.ifa_name, numericText(from.ifa_addr, sizeof(Address)), 0, protocol};
-  result.port = result.port.substr(0, result.port.find(':'));
-  for (std::size_t i = 0; i < length; ++i) {
-    const char byte = reinterpret_cast<const char*>(from.ifa_netmask)[offset + i];
-    result.prefix += static_cast<int>(std::bitset<8>(static_cast<unsigned char>(byte)).count());
+  char address[NI_MAXHOST] = "";
+  EXPECT_EQ(getnameinfo(from.ifa_addr, sizeof(Address), address, sizeof address, nullptr, 0,
+                        NI_NUMERICHOST),
+            0);
+  address[std::strcspn(address, "%")] = '\0';  // without a zone
+  std::size_t prefix = 0;
+  for (std::size_t i = offset; i < offset + length; ++i) {
+    prefix += std::bitset<8>(reinterpret_cast<const unsigned char*>(from.ifa_netmask)[i]).count();
   }
-  return result;
+  const std::string name = from.ifa_name;
+  return {name.substr(0, name.find(':')), address, static_cast<int>(prefix), protocol};
 }
 
 std::set<Endpoint> kernelEndpoints() {

@@ -1,6 +1,5 @@
 // The methods of Host_FileSystem, called by the provider's engine.
 
-#include <gtest/gtest.h>
 #include <sys/statvfs.h>
 
 #include <memory>
@@ -9,11 +8,10 @@
 #include "engine/ProviderDefModule.h"
 #include "tests/engine/ValueText.h"
 #include "tests/examples/hostinfo/FakeHost.h"
-#include "tests/examples/hostinfo/HostinfoLibrary.h"
 
 namespace {
 
-class Methods : public testing::Test {
+class Methods : public FakeHostTest {
  protected:
   Methods() {
     int consumed = 0;
@@ -23,22 +21,19 @@ class Methods : public testing::Test {
   // Outputs as text, and behind them what the method returned.
   std::string findByType(const Values& inputs) const {
     Values outputs;
-    ProviderDefFunction function("hostFileSystemFindByType", functionTypeCode("execC"),
-                                 module_.get());
-    const int result = function.exec(inputs, outputs);
+    ProviderDefFunction find("hostFileSystemFindByType", functionTypeCode("execC"), module_.get());
+    const int result = find.exec(inputs, outputs);
     return valueText(outputs) + "-> " + std::to_string(result);
   }
   std::string checkSpace(int index, const Values& inputs) const {
     Values outputs;
-    ProviderDefFunction function("hostFileSystemCheckSpace", functionTypeCode("execCi"),
-                                 module_.get());
-    const int result = function.exec(ProviderDefValue(index), inputs, outputs);
+    ProviderDefFunction check("hostFileSystemCheckSpace", functionTypeCode("execCi"),
+                              module_.get());
+    const int result = check.exec(ProviderDefValue(index), inputs, outputs);
     return valueText(outputs) + "-> " + std::to_string(result);
   }
 
   const std::string text_ = "<module name='" HOSTINFO_LIBRARY "'/>";
-  FakeHost host_;
-  HostinfoLibrary library_;
   std::unique_ptr<ProviderDefModule> module_;
 };
 
@@ -47,17 +42,17 @@ TEST_F(Methods, FindByTypeTakesWhatTheClientSends) {
   const std::string b = host_.makeDirectory("b");
   const std::string c = host_.makeDirectory("c");
   host_.writeMounts("x " + a + " ext4 rw 0 0\nx " + b + " xfs rw 0 0\nx " + c + " ext4 rw 0 0\n");
-  const std::pair<Values, std::string> cases[] = {
-      {Values{"ext4", 5}, "0 2; 3 {" + a + ", " + c + "}; -> 0"},
-      {Values{"ext4", 1}, "0 2; 3 {" + a + "}; -> 1"},
-      {Values{"ext4", 2}, "0 2; 3 {" + a + ", " + c + "}; -> 0"},
-      {Values{"ext4", -1}, "0 2; 3 {" + a + ", " + c + "}; -> 0"},
-      {Values{2}, "0 3; 3 {" + a + ", " + b + "}; -> 1"},
-      {Values{"", 1}, "0 3; 3 {" + a + "}; -> 1"},
-      {Values{"ext", 5}, "0 0; 3 {}; -> 0"},
-      {Values{5, "ext4"}, "-> 2"},
-      {Values{std::vector<int>{5}}, "-> 2"},
-      {Values{"ext4", 5, 5}, "-> 2"}};
+  const std::string both = "0 2; 3 {" + a + ", " + c + "}; -> 0";
+  const std::pair<Values, std::string> cases[] = {{{"ext4", 5}, both},
+                                                  {{"ext4", 2}, both},
+                                                  {{"ext4", -1}, both},
+                                                  {{"ext4", 1}, "0 2; 3 {" + a + "}; -> 1"},
+                                                  {{2}, "0 3; 3 {" + a + ", " + b + "}; -> 1"},
+                                                  {{"", 1}, "0 3; 3 {" + a + "}; -> 1"},
+                                                  {{"ext", 5}, "0 0; 3 {}; -> 0"},
+                                                  {{5, "ext4"}, "-> 2"},
+                                                  {{Ints{5}}, "-> 2"},
+                                                  {{"ext4", 5, 5}, "-> 2"}};
   for (const auto& [inputs, expected] : cases) {
     EXPECT_EQ(findByType(inputs), expected) << valueText(inputs);
   }
@@ -66,10 +61,9 @@ TEST_F(Methods, FindByTypeTakesWhatTheClientSends) {
 }
 
 TEST_F(Methods, FindByTypeNamesAsManyAsFit) {
-  std::string mounts;
   const std::string longest = host_.makeDirectory("long") + std::string(850, '/');
   const std::string names = host_.makeDirectory("n");
-  mounts = "x " + longest + " ext4 rw 0 0\n";
+  std::string mounts = "x " + longest + " ext4 rw 0 0\n";
   for (int i = 10; i < 99; ++i) {
     mounts += "x " + host_.makeDirectory("n/" + std::to_string(i)) + " ext4 rw 0 0\n";
   }
@@ -84,16 +78,19 @@ TEST_F(Methods, CheckSpaceAnswersForItsInstance) {
   host_.writeMounts("x / xfs rw 0 0\nx " + directory + " ext4 rw 0 0\n");
   ASSERT_EQ(library_.count("hostFileSystemCount"), 2);
   const long freeMiB = library_.longInteger("hostFileSystemFreeKiB", 1) / 1024;
-  const std::string rest = "; 1 " + directory + "; -> ";
   const int mib = static_cast<int>(std::min(freeMiB, 2147483646L));
-  const std::string told = std::to_string(mib);
-  EXPECT_EQ(checkSpace(1, {0}), "0 1; 0 " + told + rest + "0");
-  EXPECT_EQ(checkSpace(1, {mib}), "0 1; 0 " + told + rest + "0");
-  EXPECT_EQ(checkSpace(1, {mib + 1}), "0 0; 0 " + told + rest + "1");
-  EXPECT_EQ(checkSpace(1, {-1}), "0 0; 0 " + told + rest + "1") << "4294967295 MiB";
-  EXPECT_EQ(checkSpace(2, {1}), "-> 3") << "where a client's path matches no instance";
-  EXPECT_EQ(checkSpace(1, {}), "-> 2");
-  EXPECT_EQ(checkSpace(1, {"1"}), "-> 2");
+  const std::string told = std::to_string(mib) + "; 1 " + directory + "; -> ";
+  const std::tuple<int, Values, std::string> cases[] = {
+      {1, {0}, "0 1; 0 " + told + "0"},
+      {1, {mib}, "0 1; 0 " + told + "0"},
+      {1, {mib + 1}, "0 0; 0 " + told + "1"},
+      {1, {-1}, "0 0; 0 " + told + "1"},  // 4294967295 MiB
+      {2, {1}, "-> 3"},                   // where a client's path matches no instance
+      {1, {}, "-> 2"},
+      {1, {"1"}, "-> 2"}};
+  for (const auto& [index, inputs, expected] : cases) {
+    EXPECT_EQ(checkSpace(index, inputs), expected);
+  }
 }
 
 }  // namespace

@@ -1,18 +1,15 @@
 // Host_FileSystem.Owner: the property that clients set, and the file that keeps it.
 
-#include <gmock/gmock.h>
-
 #include <thread>
 
 #include "tests/examples/hostinfo/FakeHost.h"
-#include "tests/examples/hostinfo/HostinfoLibrary.h"
 
 using namespace std::string_literals;
 namespace fs = std::filesystem;
 
 namespace {
 
-class Notes : public testing::Test {
+class Notes : public FakeHostTest {
  protected:
   Notes() { setenv("HOSTINFO_STATE", state_.c_str(), 1); }
   ~Notes() override { unsetenv("HOSTINFO_STATE"); }
@@ -21,7 +18,7 @@ class Notes : public testing::Test {
   void mount(const std::vector<std::string>& directories) {
     std::string lines;
     for (const std::string& directory : directories) {
-      lines += "x " + host_.makeDirectory("") + directory + " ext4 rw 0 0\n";
+      lines += "x " + root_ + directory + " ext4 rw 0 0\n";
     }
     host_.writeMounts(lines);
     ASSERT_EQ(library_.count("hostFileSystemCount"), static_cast<int>(directories.size()));
@@ -31,18 +28,12 @@ class Notes : public testing::Test {
   }
   std::string get(int index) const { return library_.text("hostFileSystemOwner", index); }
 
-  std::string file() const {
-    std::ifstream stream(state_ + "/hostinfo.notes", std::ios::binary);
-    return {std::istreambuf_iterator<char>(stream), {}};
-  }
-  void writeFile(const std::string& text) const {
-    std::ofstream(state_ + "/hostinfo.notes", std::ios::binary) << text;
-  }
+  std::string file() const { return TemporaryTree::read(file_); }
+  void writeFile(const std::string& text) const { TemporaryTree::write(file_, text); }
 
-  FakeHost host_;
   const std::string state_ = host_.makeDirectory("state");
+  const std::string file_ = state_ + "/hostinfo.notes";
   const std::string root_ = host_.makeDirectory("");
-  HostinfoLibrary library_;
 };
 
 TEST_F(Notes, AreOneEscapedLineEach) {
@@ -84,11 +75,12 @@ TEST_F(Notes, KeepTheLinesThatTheyDoNotUnderstand) {
   EXPECT_EQ(get(0), "bad \xEF\xBF\xBD\\777\xEF\xBF\xBD");
   EXPECT_EQ(set("good", 0), 0);
   EXPECT_EQ(file(), others + others + root_ + "state good\n");
-  const std::string longLine = std::string(20000, 'x') + root_ + "state y\n" + root_ + "state2 ";
-  writeFile(longLine + std::string(8191, 'z'));
+  const std::string longLines =
+      std::string(20000, 'x') + root_ + "state y\n" + root_ + "state2 " + std::string(8191, 'z');
+  writeFile(longLines);
   EXPECT_EQ(get(0), "");
   EXPECT_EQ(set("good", 0), 0);
-  EXPECT_EQ(file(), longLine + std::string(8191, 'z') + "\n" + root_ + "state good\n");
+  EXPECT_EQ(file(), longLines + "\n" + root_ + "state good\n");
   writeFile(root_ + "state " + std::string(20000, 'x'));
   EXPECT_EQ(get(0), std::string(1023, 'x'));
   EXPECT_EQ(set("good", 0), 0);
@@ -117,19 +109,19 @@ TEST_F(Notes, AreNotTouchedWhenTheyCannotBeReplaced) {
   EXPECT_EQ(set("new", 0), 1);
   EXPECT_EQ(get(0), "");
   setenv("HOSTINFO_STATE", state_.c_str(), 1);
-  fs::create_directories(state_ + "/hostinfo.notes.new/busy");
+  fs::create_directories(file_ + ".new/busy");
   EXPECT_EQ(set("new", 0), 1);
   EXPECT_EQ(get(0), "kept");
-  fs::remove(state_ + "/hostinfo.notes");
-  fs::create_directory(state_ + "/hostinfo.notes");
-  fs::remove_all(state_ + "/hostinfo.notes.new");
+  fs::remove(file_);
+  fs::create_directory(file_);
+  fs::remove_all(file_ + ".new");
   EXPECT_EQ(set("new", 0), 1) << "what cannot be read is not overwritten";
 }
 
 TEST_F(Notes, ALeftOverFileIsNotFollowed) {
   mount({"state"});
-  std::ofstream(state_ + "/victim") << "precious";
-  fs::create_symlink(state_ + "/victim", state_ + "/hostinfo.notes.new");
+  TemporaryTree::write(state_ + "/victim", "precious");
+  fs::create_symlink(state_ + "/victim", file_ + ".new");
   EXPECT_EQ(set("new", 0), 0);
   EXPECT_EQ(get(0), "new");
   EXPECT_EQ(fs::file_size(state_ + "/victim"), 8u);

@@ -1,23 +1,17 @@
-#include <gmock/gmock.h>
-
 #include <atomic>
 #include <climits>
 #include <thread>
 
 #include "tests/examples/hostinfo/FakeHost.h"
-#include "tests/examples/hostinfo/HostinfoLibrary.h"
-
-using testing::IsEmpty;
 
 namespace {
 
-TEST(Snapshot, AnIndexThatDoesNotExistGivesNothing) {
+TEST(Library, GivesNothingForAnIndexThatDoesNotExist) {
   HostinfoLibrary library;
   ASSERT_EQ(library.count("hostInit"), 0);
-  const int files = library.count("hostFileSystemCount");
-  const int ports = library.count("hostNetworkPortCount");
-  const int endpoints = library.count("hostIPEndpointCount");
-  const int last = std::max({files, ports, endpoints});
+  const int last =
+      std::max({library.count("hostFileSystemCount"), library.count("hostNetworkPortCount"),
+                library.count("hostIPEndpointCount")});
   for (const int index : {INT_MIN, -1, last, last + 1, INT_MAX}) {
     SCOPED_TRACE(index);
     for (const char* name :
@@ -31,8 +25,9 @@ TEST(Snapshot, AnIndexThatDoesNotExistGivesNothing) {
                              "hostIPEndpointPrefixLength", "hostIPEndpointProtocolIFType"}) {
       EXPECT_EQ(library.integer(name, index), 0) << name;
     }
-    EXPECT_EQ(library.longInteger("hostFileSystemSizeKiB", index), 0);
-    EXPECT_EQ(library.longInteger("hostFileSystemFreeKiB", index), 0);
+    for (const char* name : {"hostFileSystemSizeKiB", "hostFileSystemFreeKiB"}) {
+      EXPECT_EQ(library.longInteger(name, index), 0) << name;
+    }
     EXPECT_EQ(library.bytes("hostFileSystemMountOptions", index).substr(0, 8),
               std::string("\3\0\0\0\0\0\0\0", 8));
     EXPECT_EQ(library.bytes("hostNetworkPortTraffic", index).substr(0, 8),
@@ -40,54 +35,32 @@ TEST(Snapshot, AnIndexThatDoesNotExistGivesNothing) {
   }
 }
 
-TEST(Snapshot, StaysUntilTheNextCount) {
-  FakeHost host;
+TEST(Library, KeepsNothingWhenItIsClosed) {
+  const FakeHost host;
   host.writeMounts("first / ext4 rw 0 0\n");
-  HostinfoLibrary library;
-  EXPECT_EQ(library.text("hostFileSystemDevice", 0), "");
-  library.count("hostInit");
-  host.writeMounts("second / ext4 rw 0 0\n");
-  EXPECT_EQ(library.text("hostFileSystemDevice", 0), "first");
-  EXPECT_EQ(library.count("hostFileSystemCount"), 1);
-  EXPECT_EQ(library.text("hostFileSystemDevice", 0), "second");
+  EXPECT_EQ(HostinfoLibrary().count("hostFileSystemCount"), 1);
+  EXPECT_EQ(HostinfoLibrary().text("hostFileSystemDevice", 0), "");
 }
 
-TEST(Snapshot, IsGoneWhenTheLibraryIsClosed) {
-  FakeHost host;
-  host.writeMounts("first / ext4 rw 0 0\n");
-  { EXPECT_EQ(HostinfoLibrary().count("hostFileSystemCount"), 1); }
-  HostinfoLibrary library;
-  EXPECT_EQ(library.text("hostFileSystemDevice", 0), "");
+using Snapshot = FakeHostTest;
+
+TEST_F(Snapshot, StaysUntilTheNextCount) {
+  host_.writeMounts("first / ext4 rw 0 0\n");
+  library_.count("hostInit");
+  host_.writeMounts("second / ext4 rw 0 0\n");
+  EXPECT_EQ(library_.text("hostFileSystemDevice", 0), "first");
+  EXPECT_EQ(library_.count("hostFileSystemCount"), 1);
+  EXPECT_EQ(library_.text("hostFileSystemDevice", 0), "second");
 }
 
-TEST(Snapshot, ManyThreadsLeaveNoneBehind) {
-  FakeHost host;
-  host.writeMounts("x / ext4 rw 0 0\n");
-  HostinfoLibrary library;
+TEST_F(Snapshot, ManyThreadsLeaveNoneBehind) {
+  host_.writeMounts("x / ext4 rw 0 0\n");
   for (int i = 0; i < 100; ++i) {
-    std::thread([&] { EXPECT_EQ(library.count("hostFileSystemCount"), 1); }).join();
+    std::thread([&] { EXPECT_EQ(library_.count("hostFileSystemCount"), 1); }).join();
   }
   // This thread has never counted: it reads the newest.
-  EXPECT_EQ(library.text("hostFileSystemDevice", 0), "x");
+  EXPECT_EQ(library_.text("hostFileSystemDevice", 0), "x");
 }
-
-// Two states of the mount table that differ in every row; what one count saw must not mix them.
-class MixingHost {
- public:
-  MixingHost() {
-    for (int i = 0; i < 4; ++i) {
-      const std::string directory = host_.makeDirectory("d" + std::to_string(i));
-      states_[0] += "even" + std::to_string(i) + " " + directory + " even rw 0 0\n";
-      states_[1] = "odd" + std::to_string(i) + " " + directory + " odd rw 0 0\n" + states_[1];
-    }
-    change(0);
-  }
-  void change(int i) const { host_.writeMounts(states_[i % 2]); }
-
- private:
-  FakeHost host_;
-  std::string states_[2];
-};
 
 bool countIsConsistent(const HostinfoLibrary& library) {
   const int count = library.count("hostFileSystemCount");
@@ -101,17 +74,23 @@ bool countIsConsistent(const HostinfoLibrary& library) {
   return consistent;
 }
 
-TEST(Snapshot, OfOneThreadIsNotMixedWithAnothers) {
-  MixingHost host;
-  HostinfoLibrary library;
+// Two states of the mount table that differ in every row; what one count saw must not mix them.
+TEST_F(Snapshot, OfOneThreadIsNotMixedWithAnothers) {
+  std::string states[2];
+  for (int i = 0; i < 4; ++i) {
+    const std::string directory = host_.makeDirectory("d" + std::to_string(i));
+    states[0] += "even" + std::to_string(i) + " " + directory + " even rw 0 0\n";
+    states[1] = "odd" + std::to_string(i) + " " + directory + " odd rw 0 0\n" + states[1];
+  }
+  host_.writeMounts(states[0]);
   std::atomic<int> torn{0};
   std::vector<std::thread> threads;
   for (int i = 0; i < 4; ++i) {
     threads.emplace_back([&] {
-      for (int round = 0; round < 300; ++round) torn += countIsConsistent(library) ? 0 : 1;
+      for (int round = 0; round < 300; ++round) torn += countIsConsistent(library_) ? 0 : 1;
     });
   }
-  for (int round = 0; round < 300; ++round) host.change(round);
+  for (int round = 0; round < 300; ++round) host_.writeMounts(states[round % 2]);
   for (std::thread& thread : threads) thread.join();
   EXPECT_EQ(torn, 0);
 }
