@@ -63,22 +63,16 @@ TEST_F(MisbehavingPlugin, GetResultsStayWithinTheBuffer) {
       {"fill", "getSi", 3, "1 xxx"},  // The buffer's zero bytes end it.
       {"fill", "getSi", 1023, "1 " + std::string(1023, 'x')},
       {"fill", "getSi", 1024, noFit("fill")},
-      {"fill", "getASi", 1024, noFit("fill")},
-      {"poke", "getSi", 1023, "1 "},
       {"countIntegers", "getAIi", 127, ones(127)},
       {"countIntegers", "getAIi", 128, noFit("countIntegers")},
       {"countIntegers", "getAIi", INT_MAX, noFit("countIntegers")},
-      {"countIntegers", "getAIi", 0, "2 {}"},
-      {"countIntegers", "getAIi", INT_MIN, "2 {}"},
       // Empty strings stand 33 bytes apart: 31 in 1016 bytes.
       {"countStrings", "getASi", 3, "3 {, , }"},
       {"countStrings", "getASi", 32, noFit("countStrings")},
       {"countStrings", "getASi", INT_MAX, noFit("countStrings")},
-      {"countStrings", "getASi", INT_MIN, "3 {}"},
       // Header, the first string and its stride leave 9 bytes for an empty second one, or less.
       {"longString", "getASi", 974, "3 {" + std::string(974, 'x') + ", }"},
       {"longString", "getASi", 975, noFit("longString")},
-      {"longString", "getASi", 1008, noFit("longString")},
   };
   for (const auto& c : cases) {
     std::string got;

@@ -2,6 +2,7 @@
 
 #include "tests/engine/RecorderTest.h"
 
+#include <climits>
 #include <functional>
 
 using namespace std::string_literals;
@@ -10,127 +11,81 @@ namespace {
 
 const ProviderDefFunction kFunction("f", 100, nullptr);
 
-// What `pack` writes into a buffer of `size` bytes; checks the position that it returns.
-template <class Pack>
-std::string packed(Pack pack, size_t size = 1024) {
-  std::string buffer(size, '?');
-  const char* end = pack(buffer.data(), buffer.data() + size);
-  return buffer.substr(0, static_cast<size_t>(end - buffer.data()));
-}
-
-std::string packI(int value, size_t size = 1024) {
-  return packed([&](char* at, char* end) { return kFunction.packI(at, end, value); }, size);
-}
-std::string packS(const std::string& value, size_t size = 1024) {
-  return packed([&](char* at, char* end) { return kFunction.packS(at, end, value); }, size);
-}
-std::string packAI(const Ints& values, size_t size = 1024) {
-  return packed([&](char* at, char* end) { return kFunction.packAI(at, end, values); }, size);
-}
-std::string packAS(const Texts& values, size_t size = 1024) {
-  return packed([&](char* at, char* end) { return kFunction.packAS(at, end, values); }, size);
-}
-
 const std::string kGap(24, '?');  // What plug-ins leave behind each string of an array.
-
-const char kInputError[] = "The input of function f does not fit into its buffer";
-const char kResultError[] = "The result of function f does not fit into its buffer";
 
 }  // namespace
 
+// Each fills a buffer to its last byte, and none that is smaller.
 TEST(PackedValues, AreWrittenAsPluginsReadThem) {
-  EXPECT_EQ(packI(7), "\0\0\0\0\x07\0\0\0"s);
-  EXPECT_EQ(packI(-2), "\0\0\0\0\xfe\xff\xff\xff"s);
-  EXPECT_EQ(packS("abc"), "\1\0\0\0\3\0\0\0abc\0"s);
-  EXPECT_EQ(packS(""), "\1\0\0\0\0\0\0\0\0"s);
-  EXPECT_EQ(packS("a\0b"s), "\1\0\0\0\3\0\0\0a\0b\0"s);
-  EXPECT_EQ(packAI({}), "\2\0\0\0\0\0\0\0"s);
-  EXPECT_EQ(packAI({1, 258}),
-            "\2\0\0\0\2\0\0\0"
-            "\0\0\0\0\1\0\0\0"
-            "\0\0\0\0\2\1\0\0"s);
-  EXPECT_EQ(packAS({}), "\3\0\0\0\0\0\0\0"s);
-  EXPECT_EQ(packAS({"a", "bc"}),
-            "\3\0\0\0\2\0\0\0"
-            "\1\0\0\0\1\0\0\0a\0"
-            "\1\0\0\0\2\0\0\0bc\0"s);
-}
-
-TEST(PackedValues, FillABufferToItsLastByteAndNoFurther) {
-  const std::pair<std::function<std::string(size_t)>, size_t> cases[] = {
-      {[](size_t size) { return packI(7, size); }, 8},
-      {[](size_t size) { return packS("", size); }, 9},
-      {[](size_t size) { return packS("abc", size); }, 12},
-      {[](size_t size) { return packAI(Ints(), size); }, 8},
-      {[](size_t size) { return packAI(Ints(2, 1), size); }, 24},
-      {[](size_t size) { return packAS(Texts(), size); }, 8},
-      {[](size_t size) { return packAS(Texts(2, "bc"), size); }, 30},
+  const std::pair<std::function<char*(char*, const char*)>, std::string> cases[] = {
+      {[](auto... at) { return kFunction.packI(at..., -2); }, words({0, -2})},
+      {[](auto... at) { return kFunction.packS(at..., ""); }, words({1, 0}) + "\0"s},
+      {[](auto... at) { return kFunction.packS(at..., "a\0b"s); }, words({1, 3}) + "a\0b\0"s},
+      {[](auto... at) { return kFunction.packAI(at..., {}); }, words({2, 0})},
+      {[](auto... at) {
+         return kFunction.packAI(at..., {1, 258});
+       },
+       words({2, 2, 0, 1, 0, 258})},
+      {[](auto... at) { return kFunction.packAS(at..., {}); }, words({3, 0})},
+      {[](auto... at) {
+         return kFunction.packAS(at..., {"a", "bc"});
+       },
+       words({3, 2, 1, 1}) + "a\0"s + words({1, 2}) + "bc\0"s},
   };
-  for (const auto& [pack, needed] : cases) {
-    EXPECT_EQ(pack(needed).size(), needed);
-    for (size_t size = 0; size < needed; ++size) {
-      EXPECT_EQ(errorOf([&, &write = pack] { write(size); }), kInputError)
-          << size << " of " << needed;
+  for (const auto& [pack, bytes] : cases) {
+    for (size_t size = 0; size <= bytes.size(); ++size) {
+      std::vector<char> buffer(size);
+      char* end = buffer.data();
+      const std::string error =
+          errorOf([&, &write = pack] { end = write(buffer.data(), buffer.data() + size); });
+      const bool fits = size == bytes.size();
+      EXPECT_EQ(error, fits ? "" : "The input of function f does not fit into its buffer");
+      EXPECT_EQ(std::string(buffer.data(), end), fits ? bytes : "");
     }
   }
 }
 
+// No reader looks at the tag, and none beyond the buffer.
 TEST(PackedValues, AreReadAsPluginsWriteThem) {
-  const auto read = [](auto make, const std::string& item, size_t length) {
+  const auto readI = [](auto... of) { return valueText(kFunction.makeI(of...)); };
+  const auto readS = [](auto... of) { return valueText(kFunction.makeS(of...)); };
+  const auto readAI = [](auto... of) { return valueText(kFunction.makeAI(of...)); };
+  const auto readAS = [](auto... of) { return valueText(kFunction.makeAS(of...)); };
+  const struct {
+    std::function<std::string(const char*, const char**, const char*)> read;
+    std::string item;
+    size_t needed, next;  // Bytes; where the next item starts.
+    std::string text;
+  } cases[] = {
+      {readI, words({77, -2}), 8, 8, "0 -2"},
+      // A string ends at its NUL, whatever its length says, and the next item starts there.
+      {readS, words({77, 99}) + "abc\0?"s, 12, 11, "1 abc"},
+      {readS, words({77, 77, 0}), 9, 8, "1 "},
+      {readAI, words({77, 2, 77, 1, 77, 258, 77}), 24, 24, "2 {1, 258}"},
+      {readAI, words({77, 0}), 8, 8, "2 {}"},
+      {readAI, words({77, -1}), 8, 8, "2 {}"},
+      {readAS, words({77, 0}), 8, 8, "3 {}"},
+      {readAS, words({77, INT_MIN}), 8, 8, "3 {}"},
+      // The second string starts 33 bytes and its length behind the start of the first.
+      {readAS, words({77, 2, 77, 77}) + "a\0"s + kGap + words({77, 77}) + "bc\0"s + kGap, 53, 77,
+       "3 {a, bc}"},
+  };
+  for (const auto& c : cases) {
     const char* next = nullptr;
-    const auto value = make(item.data(), &next, item.data() + item.size());
-    EXPECT_EQ(next - item.data(), static_cast<std::ptrdiff_t>(length));
-    return value;
-  };
-  const auto makeI = [](auto... of) { return kFunction.makeI(of...); };
-  const auto makeS = [](auto... of) { return kFunction.makeS(of...); };
-  const auto makeAI = [](auto... of) { return kFunction.makeAI(of...); };
-  const auto makeAS = [](auto... of) { return kFunction.makeAS(of...); };
-
-  // No reader looks at the tag; a string ends at its NUL, whatever its length word says, and the
-  // next item starts there.
-  EXPECT_EQ(read(makeI, "????\xfe\xff\xff\xff"s, 8), -2);
-  EXPECT_EQ(read(makeS, "????\x63\0\0\0abc\0?"s, 11), "abc");
-  EXPECT_EQ(read(makeS, "????????\0"s, 8), "");
-  EXPECT_EQ(read(makeAI,
-                 "????\2\0\0\0"
-                 "????\1\0\0\0"
-                 "????\2\1\0\0"
-                 "????"s,
-                 24),
-            (Ints{1, 258}));
-  EXPECT_EQ(read(makeAI, "????\0\0\0\0"s, 8), Ints());
-  EXPECT_EQ(read(makeAI, "????\xff\xff\xff\xff"s, 8), Ints());
-  EXPECT_EQ(read(makeAS, "????\0\0\0\0"s, 8), Texts());
-  EXPECT_EQ(read(makeAS, "????\x80\x80\x80\x80"s, 8), Texts());
-  // The second string starts 33 bytes and its length behind the start of the first.
-  EXPECT_EQ(read(makeAS,
-                 "????\2\0\0\0"
-                 "????????a\0"s +
-                     kGap + "????????bc\0"s + kGap,
-                 77),
-            (Texts{"a", "bc"}));
-}
-
-TEST(PackedValues, AreNotReadBeyondTheBuffer) {
-  const std::string strings =
-      "????\2\0\0\0"
-      "????????a\0"s +
-      kGap + "????????bc\0"s;
-  const auto failsBelow = [](size_t needed, const std::string& item, auto make) {
-    for (size_t size = 0; size < needed; ++size) {
+    const char* const start = c.item.data();
+    EXPECT_EQ(c.read(start, &next, start + c.item.size()), c.text);
+    EXPECT_EQ(next - start, static_cast<std::ptrdiff_t>(c.next)) << c.text;
+    for (size_t size = 0; size < c.item.size(); ++size) {
       // A copy of exactly this size, so that a sanitizer sees a read beyond it.
-      const std::vector<char> exact(item.begin(), item.begin() + static_cast<std::ptrdiff_t>(size));
-      EXPECT_EQ(errorOf([&] { make(exact.data(), nullptr, exact.data() + size); }), kResultError)
-          << size << " of " << needed;
+      const std::vector<char> exact(start, start + size);
+      std::string text;
+      const std::string error =
+          errorOf([&] { text = c.read(exact.data(), nullptr, exact.data() + size); });
+      EXPECT_EQ(text, size < c.needed ? "" : c.text) << size;
+      EXPECT_EQ(error,
+                size < c.needed ? "The result of function f does not fit into its buffer" : "");
     }
-    make(item.data(), nullptr, item.data() + needed);
-  };
-  failsBelow(8, "????????", [](auto... of) { return kFunction.makeI(of...); });
-  failsBelow(12, "????????abc\0"s, [](auto... of) { return kFunction.makeS(of...); });
-  failsBelow(24, "????\2\0\0\0????????????????"s,
-             [](auto... of) { return kFunction.makeAI(of...); });
-  failsBelow(strings.size(), strings, [](auto... of) { return kFunction.makeAS(of...); });
+  }
 }
 
 class PackedLists : public RecorderTest {};
@@ -138,12 +93,7 @@ class PackedLists : public RecorderTest {};
 TEST_F(PackedLists, InputsLeaveOutIndexStringsBooleansAndLongs) {
   Values outputs;
   const std::string items =
-      "\0\0\0\0\7\0\0\0"
-      "\1\0\0\0\5\0\0\0seven\0"
-      "\2\0\0\0\1\0\0\0"
-      "\0\0\0\0\7\0\0\0"
-      "\3\0\0\0\1\0\0\0"
-      "\1\0\0\0\5\0\0\0seven\0"s;
+      words({0, 7, 1, 5}) + "seven\0"s + words({2, 1, 0, 7}) + words({3, 1, 1, 5}) + "seven\0"s;
   answer("\x63");
   function("getIv").get(oneOfEachType());
   EXPECT_EQ(trimmed(recorder_->extra), trimmed(items));
@@ -158,44 +108,21 @@ TEST_F(PackedLists, InputsLeaveOutIndexStringsBooleansAndLongs) {
 }
 
 TEST_F(PackedLists, OutputsAreReadUpToTheEndMark) {
+  const std::string text = words({1, 2}) + "ab", end = words({99});
   const std::pair<std::string, std::string> cases[] = {
-      {"\x63\0\0\0"s, ""},
-      {"\0\0\0\0\5\0\0\0"
-       "\x63\0\0\0"
-       "\0\0\0\0\6\0\0\0"s,
-       "0 5; "},
-      {"\2\0\0\0\2\0\0\0"
-       "????\1\0\0\0"
-       "????\2\0\0\0"
-       "\0\0\0\0\5\0\0\0"
-       "\x63\0\0\0"s,
-       "2 {1, 2}; 0 5; "},
-      {"\3\0\0\0\2\0\0\0"
-       "????????a\0"s +
-           kGap + "????????bc\0"s + kGap + "\x63\0\0\0"s,
+      {end, ""},
+      {words({0, 5, 99, 0, 6}), "0 5; "},
+      {words({2, 2, 77, 1, 77, 2, 0, 5, 99}), "2 {1, 2}; 0 5; "},
+      {words({3, 2, 77, 77}) + "a\0"s + kGap + words({77, 77}) + "bc\0"s + kGap + end,
        "3 {a, bc}; "},
       // An integer's tag begins with the NUL of the string before it.
-      {"\1\0\0\0\2\0\0\0ab"
-       "\0\0\0\0\5\0\0\0"
-       "\x63\0\0\0"s,
-       "1 ab; 0 5; "},
+      {text + words({0, 5, 99}), "1 ab; 0 5; "},
       // The other tags cannot: they stand behind the NUL.
-      {"\1\0\0\0\2\0\0\0ab\0"
-       "\x63\0\0\0"s,
-       "1 ab; "},
-      {"\1\0\0\0\2\0\0\0ab\0"
-       "\1\0\0\0\1\0\0\0c\0"
-       "\1\0\0\0\0\0\0\0\0"
-       "\x63\0\0\0"s,
-       "1 ab; 1 c; 1 ; "},
-      {"\1\0\0\0\2\0\0\0ab\0"
-       "\3\0\0\0\0\0\0\0"
-       "\x63\0\0\0"s,
-       "1 ab; 3 {}; "},
+      {text + "\0"s + end, "1 ab; "},
+      {text + "\0"s + words({1, 1}) + "c\0"s + words({1, 0}) + "\0"s + end, "1 ab; 1 c; 1 ; "},
+      {text + "\0"s + words({3, 0, 99}), "1 ab; 3 {}; "},
       // Only behind a string: elsewhere a tag stands where the item before it ends.
-      {"\0\0\0\0\5\0\0\0"
-       "\0\1\0\0\0\1\0\0\0c\0"s,
-       "0 5; "},
+      {words({0, 5}) + "\0"s + words({1, 1}) + "c\0"s, "0 5; "},
   };
   recorder_->result = -3;
   for (const auto& [bytes, expected] : cases) {
@@ -207,17 +134,15 @@ TEST_F(PackedLists, OutputsAreReadUpToTheEndMark) {
 }
 
 TEST_F(PackedLists, EndAnywhereWithinTheBuffer) {
-  const std::string integer = "\0\0\0\0\1\0\0\0"s;
-  std::string bytes;
-  for (int i = 0; i < 127; ++i) bytes += integer;
-  for (const size_t offset : {1016u, 1020u}) {
-    answer(bytes + std::string(offset - 1016, '?') + "\x63");
+  std::string integers;
+  for (int i = 0; i < 127; ++i) integers += words({0, 1});
+  for (const size_t gap : {0u, 4u}) {  // An unknown tag ends the list, too.
+    answer(integers + std::string(gap, '?') + "\x63");
     Values outputs;
-    const std::string error = errorOf([&] { function("execC").exec(Values(), outputs); });
+    EXPECT_EQ(errorOf([&] { function("execC").exec(Values(), outputs); }), "");
     EXPECT_EQ(outputs.size(), 127u);
-    EXPECT_EQ(error, "") << "an unknown tag ends the list, too";
   }
-  answer("\1\0\0\0????"s + std::string(1011, 'x') + "\0\x63\0\0\0"s);
+  answer(words({1, 77}) + std::string(1011, 'x') + "\0\x63\0\0\0"s);
   Values outputs;
   function("execC").exec(Values(), outputs);
   EXPECT_EQ(valueText(outputs), "1 " + std::string(1011, 'x') + "; ");

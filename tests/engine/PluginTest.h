@@ -41,7 +41,9 @@ class PluginTest : public testing::Test {
       tree_.addPlugin(name, pluginFile(name));
     }
   }
-  ~PluginTest() override {
+  ~PluginTest() override { release(); }
+
+  static void release() {
     releaseFunctions();
     releaseModules();
   }
@@ -73,6 +75,12 @@ class PluginTest : public testing::Test {
                               const std::string& type, const std::string& arguments = "") {
     return "<functioncall><function name=\"" + name + "\" type=\"" + type + "\"><module name=\"" +
            module + "\" path=\"short\"/></function>" + arguments + "</functioncall>";
+  }
+
+  /// Gives a module an initialisation call that its definition has.
+  static void setInit(const std::string& module, const std::string& call) {
+    PluginTest::module(module).setInit(keepInitCall(
+        std::make_unique<ProviderDefFunctionCall>(fromText<ProviderDefFunctionCall>(call))));
   }
 
   const TemporaryTree tree_;

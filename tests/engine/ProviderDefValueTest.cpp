@@ -11,13 +11,13 @@
 
 namespace {
 
+using Value = const ProviderDefValue&;
+
 ProviderDefValue indexString(const char* text) {
   ProviderDefValue value(text);
   value.setIndexStringType();
   return value;
 }
-
-const char kEqualTrace[] = "ProviderDefValue::equal(ProviderDefValue value)";
 
 }  // namespace
 
@@ -64,49 +64,45 @@ TEST(ProviderDefValue, StringConstructorAloneIsLogged) {
 }
 
 TEST(ProviderDefValue, Equal) {
-  struct Case {
-    ProviderDefValue a, b;
-    bool equal;
-    std::string strings;  // What the trace says of two strings.
+  const std::tuple<ProviderDefValue, ProviderDefValue, bool> cases[] = {
+      {5, 5, true},
+      {5, 6, false},
+      {5, 5L, false},
+      {5L, 5L, false},
+      {true, true, false},
+      {indexString("a"), indexString("a"), false},
+      {indexString("a"), "a", false},
+      {"abc", "abc", true},
+      {"abc", "ABC", false},
+      {"", "%n%s", false},
+      {std::string("a\0b", 3), std::string("a\0c", 3), false},
+      {"1", 1, false},
+      {Ints{}, Ints{}, true},
+      {Ints{1, 2}, Ints{1, 2}, true},
+      {Ints{1, 2}, Ints{2, 1}, false},
+      {Ints{1}, Ints{1, 2}, false},
+      {Ints{}, Texts{}, false},
+      {Texts{"a", "b"}, Texts{"a", "b"}, true},
+      {Texts{"a", "b"}, Texts{"a", "B"}, false},
+      {Texts{"a"}, Texts{"a", "a"}, false},
   };
-  const Case cases[] = {
-      {5, 5, true, ""},
-      {5, 6, false, ""},
-      {5, 5L, false, ""},
-      {5L, 5L, false, ""},
-      {true, true, false, ""},
-      {indexString("a"), indexString("a"), false, ""},
-      {indexString("a"), "a", false, ""},
-      {"abc", "abc", true, "Comparing strings: abc, abc\n"},
-      {"abc", "ABC", false, "Comparing strings: abc, ABC\n"},
-      {"", "%n%s", false, "Comparing strings: , %n%s\n"},
-      {std::string("a\0b", 3), std::string("a\0c", 3), false, "Comparing strings: a, a\n"},
-      {"1", 1, false, ""},
-      {Ints{}, Ints{}, true, ""},
-      {Ints{1, 2}, Ints{1, 2}, true, ""},
-      {Ints{1, 2}, Ints{2, 1}, false, ""},
-      {Ints{1}, Ints{1, 2}, false, ""},
-      {Ints{}, Texts{}, false, ""},
-      {Texts{"a", "b"}, Texts{"a", "b"}, true, ""},
-      {Texts{"a", "b"}, Texts{"a", "B"}, false, ""},
-      {Texts{"a"}, Texts{"a", "a"}, false, ""},
-  };
-  for (const Case& c : cases) {
+  for (const auto& [a, b, expected] : cases) {
+    const auto text = [](Value value) { return std::string(value.getStringValue().c_str()); };
     StdoutCapture out;
-    const bool equal = c.a.equal(c.b);
+    const bool equal = a.equal(b);
     const std::string trace = out.text();
-    SCOPED_TRACE(valueText(Values{c.a, c.b}));
-    EXPECT_EQ(equal, c.equal);
-    EXPECT_EQ(trace, kEqualTrace + c.strings);
+    SCOPED_TRACE(valueText(Values{a, b}));
+    EXPECT_EQ(equal, expected);
+    EXPECT_EQ(trace, "ProviderDefValue::equal(ProviderDefValue value)" +
+                         (a.getType() == 1 && b.getType() == 1
+                              ? "Comparing strings: " + text(a) + ", " + text(b) + "\n"
+                              : ""));
   }
 }
 
 // include() is the mirror of partof(), row by row; neither writes a trace.
 TEST(PartOf, AndInclude) {
-  const struct {
-    ProviderDefValue part, whole;
-    bool expected;
-  } cases[] = {
+  const std::tuple<ProviderDefValue, ProviderDefValue, bool> cases[] = {
       // Two strings: true unless the first match is at position 0.
       {"abc", "xabc", true},
       {"abc", "abcd", false},
@@ -129,14 +125,13 @@ TEST(PartOf, AndInclude) {
       {Ints{1}, Texts{}, true},
       {Texts{"a"}, Texts{"a"}, false},
   };
-  for (const auto& c : cases) {
-    SCOPED_TRACE(valueText(Values{c.part, c.whole}));
+  for (const auto& [part, whole, expected] : cases) {
+    SCOPED_TRACE(valueText(Values{part, whole}));
     StdoutCapture out;
-    const bool isPart = c.part.partof(c.whole);
-    const bool includes = c.whole.include(c.part);
+    const bool isPart = part.partof(whole), includes = whole.include(part);
     EXPECT_EQ(out.text(), "");
-    EXPECT_EQ(isPart, c.expected);
-    EXPECT_EQ(includes, c.expected);
+    EXPECT_EQ(isPart, expected);
+    EXPECT_EQ(includes, expected);
   }
 }
 
@@ -150,8 +145,7 @@ TEST(PartOf, IsFalseForEveryOtherPairOfTypes) {
   for (const ProviderDefValue& part : oneOfEachType()) {
     for (const ProviderDefValue& whole : oneOfEachType()) {
       if (decidedByContent[part.getType()][whole.getType()]) continue;
-      EXPECT_FALSE(part.partof(whole)) << valueText(Values{part, whole});
-      EXPECT_FALSE(whole.include(part)) << valueText(Values{part, whole});
+      EXPECT_FALSE(part.partof(whole) || whole.include(part)) << valueText(Values{part, whole});
     }
   }
 }

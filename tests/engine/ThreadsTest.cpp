@@ -20,16 +20,6 @@ class Threads : public PluginTest {
     }
     for (std::thread& thread : threads) thread.join();
   }
-
-  static void setInit(const std::string& module, const std::string& call) {
-    PluginTest::module(module).setInit(keepInitCall(
-        std::make_unique<ProviderDefFunctionCall>(fromText<ProviderDefFunctionCall>(call))));
-  }
-
-  static void release() {
-    releaseFunctions();
-    releaseModules();
-  }
 };
 
 TEST_F(Threads, OpenAModuleOnceAndSeeItInitialised) {

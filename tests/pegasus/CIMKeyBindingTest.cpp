@@ -90,6 +90,7 @@ TEST(CIMKeyBinding, ReadsItsTextAsTheTypeOfAValue) {
       {".05", kNumeric, 0.05, true},
       {"+1.5E+2", kNumeric, 150.0f, true},
       {"1", kNumeric, 1.0, false},
+      {"1.", kNumeric, 1.0, false},
       {"1e0", kNumeric, 1.0, false},
       {"1.5e", kNumeric, 1.5, false},
       {" 1.5", kNumeric, 1.5, false},
