@@ -22,11 +22,6 @@ std::string association(const std::string& name, const std::string& groups) {
   return "<association name='" + name + "'>" + groups + "</association>";
 }
 
-std::string classText(const std::string& name, int instances) {
-  return "<class name='" + name + "'><instances><constant type='int'>" + std::to_string(instances) +
-         "</constant></instances></class>";
-}
-
 // Property 0 of the first class equals property 0, or 1, of the second.
 const std::string kSame = "<equal>0 0</equal>";
 const std::string kSameAsNext = "<equal>0 1</equal>";

@@ -8,6 +8,7 @@
 #include "definition/DefinitionRegistry.h"
 #include "tests/definition/Reading.h"
 #include "tests/support/LogLevel.h"
+#include "tests/support/StdoutCapture.h"
 #include "tests/support/TemporaryTree.h"
 
 namespace {
@@ -17,11 +18,6 @@ using definition::Problem;
 
 class DefinitionCheck : public Registered {
  protected:
-  CheckResult check(const std::string& text) {
-    TemporaryTree::write("a.xml", text);
-    return definition::checkDefinitionFiles({"a.xml"});
-  }
-
   TemporaryTree tree_;
   LogLevel level_{0};
 };
@@ -54,7 +50,8 @@ TEST_F(DefinitionCheck, PointsAtTheUnitThatWasFound) {
   };
   for (const auto& c : cases) {
     SCOPED_TRACE(c.text);
-    const CheckResult result = check(c.text);
+    TemporaryTree::write("a.xml", c.text);
+    const CheckResult result = definition::checkDefinitionFiles({"a.xml"});
     ASSERT_EQ(result.problems.size(), 1u);
     const Problem& problem = result.problems[0];
     EXPECT_EQ(problem.file, "a.xml");
@@ -66,34 +63,28 @@ TEST_F(DefinitionCheck, PointsAtTheUnitThatWasFound) {
   }
 }
 
-TEST_F(DefinitionCheck, ListsWhatTheFilesServeAndLeavesNothingBehind) {
-  const CheckResult result =
-      definition::checkDefinitionFiles({"no.xml", DATA_FOLDER "/every_element.xml"});
+TEST_F(DefinitionCheck, ListsOrDumpsWhatTheFilesServeAndLeavesNothingBehind) {
+  const std::string sample = DATA_FOLDER "/every_element.xml";
+  const CheckResult result = definition::checkDefinitionFiles({"no.xml", sample});
   ASSERT_EQ(result.problems.size(), 1u);
   EXPECT_EQ(result.problems[0].file, "no.xml");
   EXPECT_EQ(result.problems[0].line, 0);
   EXPECT_EQ(result.problems[0].message, "No such file or directory");
-
   std::string served;
   for (const auto& one : result.served) {
     served += one.nameSpace + ":" + one.className + (one.association ? " association" : "") +
               (one.hasMethods ? " methods" : "") + "\n";
   }
   EXPECT_EQ(served,
-            "root/sample:Sample_Disk methods\n"
-            "root/sample:Sample_Part\n"
+            "root/sample:Sample_Disk methods\nroot/sample:Sample_Part\n"
             "root/sample:Sample_DiskPart association\n");
   EXPECT_TRUE(registeredClasses().empty());
   EXPECT_EQ(getModule("sample"), nullptr);
   EXPECT_EQ(functionCount(), 0u);
-}
 
-TEST_F(DefinitionCheck, DumpsModulesThenClassesThenAssociationsAndLeavesNothingBehind) {
-  testing::internal::CaptureStdout();
-  const auto problems =
-      definition::dumpDefinitionFiles({DATA_FOLDER "/every_element.xml", "no.xml"});
-  const std::string dumped = testing::internal::GetCapturedStdout();
-  EXPECT_EQ(problems.size(), 1u);
+  StdoutCapture out;
+  EXPECT_EQ(definition::dumpDefinitionFiles({sample, "no.xml"}).size(), 1u);
+  const std::string dumped = out.text();
   EXPECT_THAT(dumped, testing::StartsWith("*** Start of ProviderDefModule Dump ***\n"));
   EXPECT_THAT(dumped, testing::EndsWith("*** End   of ProviderDefAssociation Dump ***\n"));
   EXPECT_LT(dumped.find("Module Name: linker"), dumped.find("Class Name: Sample_Disk"));

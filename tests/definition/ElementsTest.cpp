@@ -4,95 +4,73 @@
 
 #include <climits>
 #include <string>
+#include <tuple>
 #include <vector>
 
 #include "definition/DefinitionRegistry.h"
 #include "engine/ProviderDefClass.h"
 #include "engine/ProviderDefFunctionCall.h"
 #include "tests/definition/Reading.h"
+#include "tests/engine/ValueText.h"
 
 namespace {
 
 using testing::ElementsAre;
 
-std::string shown(const ProviderDefValue& value) {
-  switch (value.getType()) {
-    case ProviderDefValue::kInteger:
-      return "int " + std::to_string(value.getIntValue());
-    case ProviderDefValue::kBoolean:
-      return value.getBoolValue() ? "true" : "false";
-    default:
-      return (value.getType() == ProviderDefValue::kString ? "string " : "indexstring ") +
-             value.getStringValue();
-  }
-}
-
 class Elements : public Registered {};
 
 // Arguments, get sides and instance counts read the same constants.
 TEST_F(Elements, ConstantsBecomeValues) {
-  const struct {
-    const char *type, *text;
-    std::string shown;
-  } cases[] = {
-      {"int", " 42 ", "int 42"},
-      {"int", "12abc", "int 12"},
-      {"int", "0x10", "int 0"},
-      {"int", "", "int 0"},
-      {"int", "4294967296", "int " + std::to_string(INT_MAX)},
-      {"int", "-2147483649", "int " + std::to_string(INT_MIN)},
-      {"string", "  a  b\n", "string a  b"},
-      {"string", " ", "string "},
-      {"indexstring", "disk", "indexstring disk"},
-      {"boolean", " true ", "true"},
-      {"boolean", "TRUE", "false"},
-      {"real64", "5", "int 0"},
-      {"INT", "5", "int 0"},
+  const std::tuple<std::string, const char*, std::string> cases[] = {
+      {"int", " 42 ", "0 42"},
+      {"int", "12abc", "0 12"},
+      {"int", "0x10", "0 0"},
+      {"int", "", "0 0"},
+      {"int", "4294967296", "0 " + std::to_string(INT_MAX)},
+      {"int", "-2147483649", "0 " + std::to_string(INT_MIN)},
+      {"string", "  a  b\n", "1 a  b"},
+      {"string", " ", "1 "},
+      {"indexstring", "disk", "4 disk"},
+      {"boolean", " true ", "5 true"},
+      {"boolean", "TRUE", "5 false"},
+      {"real64", "5", "0 0"},
+      {"INT", "5", "0 0"},
   };
-  for (const auto& c : cases) {
-    const std::string constant =
-        "<constant type='" + std::string(c.type) + "'>" + c.text + "</constant>";
+  for (const auto& [type, text, expected] : cases) {
+    const std::string constant = "<constant type='" + type + "'>" + text + "</constant>";
     SCOPED_TRACE(constant);
     const auto argument =
         element<ProviderDefArgument>("<argument type='element'>" + constant + "</argument>");
     EXPECT_EQ(argument.getElementType(), ProviderDefArgument::kConstant);
-    EXPECT_EQ(shown(argument.getConstant()), c.shown);
+    EXPECT_EQ(valueText(argument.getConstant()), expected);
     const auto property =
         element<ProviderDefProperty>("<property name='P'><get>" + constant + "</get></property>");
-    EXPECT_EQ(shown(property.getValue(7)), c.shown);
+    EXPECT_EQ(valueText(property.getValue(7)), expected);
     const auto counted =
         element<ProviderDefClass>("<class><instances>" + constant + "</instances></class>");
-    EXPECT_EQ("int " + std::to_string(counted.getNumberOfInstances()),
-              c.type == std::string("int") ? c.shown : "int 0");
+    EXPECT_EQ("0 " + std::to_string(counted.getNumberOfInstances()),
+              type == "int" ? expected : "0 0");
   }
 }
 
-ProviderDefModule module(const std::string& text) {
-  int used = 0;
-  ProviderDefModule built(text.data(), static_cast<int>(text.size()), &used);
-  EXPECT_EQ(used, static_cast<int>(text.size())) << text;
-  return built;
-}
-
 TEST_F(Elements, ModulesTakePathTypeAndInitialisationCall) {
-  struct {
-    std::string text;
-    int path;
-    bool needInit;
-  } const cases[] = {
+  const std::string call = "<functioncall><function name='i' type='getI'/></functioncall>";
+  const std::tuple<std::string, int, bool> cases[] = {
       {"<module name='m' path='short'/>", 1, false},
       {"<module path='Short' name='m'/>", 0, false},
       {"<module name='m' path='fullpath'></module>", 0, false},
       {"<module name='m' other='x'/>", 0, false},
-      {"<module name='m'><functioncall><function name='i' type='getI'/></functioncall></module>", 0,
-       true},
+      {"<module name='m'>" + call + "</module>", 0, true},
   };
-  for (const auto& c : cases) {
-    const ProviderDefModule built = module(c.text);
-    EXPECT_EQ(built.getName(), "m") << c.text;
-    EXPECT_EQ(built.getPath(), c.path) << c.text;
-    EXPECT_EQ(built.getNeedInit(), c.needInit) << c.text;
-    EXPECT_EQ(built.getInit() != nullptr, c.needInit) << c.text;
+  for (const auto& [text, path, needInit] : cases) {
+    SCOPED_TRACE(text);
+    int used = 0;
+    const ProviderDefModule built(text.data(), static_cast<int>(text.size()), &used);
+    EXPECT_EQ(used, static_cast<int>(text.size()));
+    EXPECT_EQ(built.getName(), "m");
+    EXPECT_EQ(built.getPath(), path);
+    EXPECT_EQ(built.getNeedInit(), needInit);
+    EXPECT_EQ(built.getInit() != nullptr, needInit);
   }
 }
 

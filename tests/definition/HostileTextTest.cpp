@@ -17,13 +17,6 @@ namespace {
 using namespace std::string_literals;
 using testing::StartsWith;
 
-std::string times(int count, const std::string& text) {
-  std::string result;
-  result.reserve(text.size() * static_cast<size_t>(count));
-  for (int i = 0; i < count; ++i) result += text;
-  return result;
-}
-
 class HostileText : public Registered {};
 
 const std::string kCallInArgument =
@@ -33,10 +26,7 @@ const std::string kAssociation =
     kModule + "<association name='A'><classname name='B'/><classname name='C'/>";
 
 TEST_F(HostileText, NestingEndsAtFiveHundredLevels) {
-  const struct {
-    std::string before, open;
-    const char* innermost;
-  } cases[] = {
+  const std::tuple<std::string, std::string, std::string> cases[] = {
       {"<plugin><module name='m'>", kCallInArgument, "functioncall"},
       {"<plugin><module name='m'>", kCallInModule, "functioncall"},
       {kClass + "<instances>", kCallInArgument, "functioncall"},
@@ -44,10 +34,9 @@ TEST_F(HostileText, NestingEndsAtFiveHundredLevels) {
       {kAssociation, "<condition><or><condition><true/></condition>", "condition"},
       {kAssociation + "<condition><equal>", kCallInArgument, "functioncall"},
   };
-  for (const auto& c : cases) {
-    EXPECT_THAT(errorOfReading(c.before + times(100000, c.open)),
-                StartsWith("elements are nested too deeply before: "s + c.innermost + "\n"))
-        << c.open;
+  for (const auto& [before, open, innermost] : cases) {
+    EXPECT_THAT(errorOfReading(before + times(100000, open)),
+                StartsWith("elements are nested too deeply before: " + innermost + "\n"));
   }
 }
 
@@ -128,21 +117,11 @@ TEST_F(HostileText, MutationsOfAGoodFileLeaveTheRegistriesConsistent) {
   for (int i = 0; i < 20000; ++i) {
     std::string text = good;
     for (size_t changes = 1 + below(4); changes > 0; --changes) {
-      const size_t at = below(text.size());
-      switch (below(4)) {
-        case 0:
-          text[at] = static_cast<char>(random());
-          break;
-        case 1:
-          text.erase(at, 1 + below(40));
-          break;
-        case 2:
-          text.insert(at, pieces[below(pieces.size())]);
-          break;
-        default:
-          text.insert(at, good.substr(below(good.size()), below(200)));
-          break;
-      }
+      const size_t at = below(text.size()), kind = below(4);
+      if (kind == 0) text[at] = static_cast<char>(random());
+      if (kind == 1) text.erase(at, 1 + below(40));
+      if (kind == 2) text.insert(at, pieces[below(pieces.size())]);
+      if (kind == 3) text.insert(at, good.substr(below(good.size()), below(200)));
     }
     errors += errorOfReading(text).empty() ? 0 : 1;
     for (const ProviderDefClass& one : registeredClasses()) {
@@ -154,10 +133,7 @@ TEST_F(HostileText, MutationsOfAGoodFileLeaveTheRegistriesConsistent) {
       if (function == nullptr || function->getModule() == nullptr) continue;
       ASSERT_EQ(getModule(function->getModule()->getName()), function->getModule()) << text;
     }
-    if (i % 5 == 0) {
-      const auto copies = registeredAssociations();
-      release();
-    }
+    if (i % 5 == 0) release();
   }
   // Most changes must have been noticed, else this tests nothing; some must have gone through.
   EXPECT_GT(errors, 5000);

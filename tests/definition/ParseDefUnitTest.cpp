@@ -108,25 +108,11 @@ TEST(Trace, NotesEveryCharacterBeforeItIsHandled) {
   shown("<a b='c'/>");
   shown(" x <b>");
   EXPECT_EQ(tree.log(),
-            "Enter ParseDefUnit length=10\n"
-            "state 0, char <\n"
-            "state 2, char a\n"
-            "state 3, char  \n"
-            "element a\n"
-            "state 4, char b\n"
-            "state 5, char =\n"
-            "state 7, char '\n"
-            "state 9, char c\n"
-            "state 9, char '\n"
-            "Attribute: b=c\n"
-            "state 4, char /\n"
-            "state 10, char >\n"
-            "Enter ParseDefUnit length=6\n"
-            "state 0, char  \n"
-            "state 0, char x\n"
-            "state 1, char  \n"
-            "state 1, char <\n"
-            "CDATA x\n");
+            "Enter ParseDefUnit length=10\nstate 0, char <\nstate 2, char a\nstate 3, char  \n"
+            "element a\nstate 4, char b\nstate 5, char =\nstate 7, char '\nstate 9, char c\n"
+            "state 9, char '\nAttribute: b=c\nstate 4, char /\nstate 10, char >\n"
+            "Enter ParseDefUnit length=6\nstate 0, char  \nstate 0, char x\nstate 1, char  \n"
+            "state 1, char <\nCDATA x\n");
 }
 
 }  // namespace

@@ -8,9 +8,6 @@
 #include "definition/ProviderDefXMLError.h"
 #include "engine/Registry.h"
 
-/// Names a table's cases by their member `name`.
-inline const auto kCaseName = [](const auto& row) { return row.param.name; };
-
 /// Tests that register definitions: every one begins and ends with empty registries.
 class Registered : public testing::Test {
  protected:
@@ -44,8 +41,21 @@ T element(const std::string& text, ProviderDefModule* module = nullptr) {
   return built;
 }
 
-// Beginnings of definition texts.
+inline std::string times(int count, const std::string& text) {
+  std::string result;
+  result.reserve(text.size() * static_cast<size_t>(count));
+  for (int i = 0; i < count; ++i) result += text;
+  return result;
+}
+
+// Parts of definition texts.
+inline std::string instances(int count) {
+  return "<instances><constant type='int'>" + std::to_string(count) + "</constant></instances>";
+}
+inline std::string classText(const std::string& name, int count = 1) {
+  return "<class name='" + name + "'>" + instances(count) + "</class>";
+}
 inline const std::string kModule = "<plugin><module name='m'/>";
 inline const std::string kClass = kModule + "<class name='C' namespace='n'>";
-inline const std::string kOneInstance = "<instances><constant type='int'>1</constant></instances>";
+inline const std::string kOneInstance = instances(1);
 inline const std::string kClassBody = kClass + kOneInstance;
