@@ -1,3 +1,4 @@
+#include "cimhost/mof/MofReader.h"
 #include "cimhost/output/MofText.h"
 #include "cimhost/output/ResultWriter.h"
 
@@ -58,15 +59,16 @@ std::string table(const std::vector<CIMInstance>& instances) {
   return printed(OutputFormat::table, ResultForm::list, instances);
 }
 
-TEST(Table, Lists) {
+TEST(Output, Tables) {
   EXPECT_EQ(table({}), "");
   EXPECT_EQ(table({disk("/", {property("Size", CIMValue(Uint64(18446744073709551615ULL)))}),
                    disk("/home", {property("Free", CIMValue(CIMTYPE_UINT32, false)),
-                                  property("Flags", arrayOf({Uint32(1), Uint32(2)}))})}),
-            "Name   Size                  Free  Flags\n"
-            "-----  --------------------  ----  ------\n"
+                                  property("Drive", CIMValue(Char16('C'))),
+                                  property("Tags", arrayOf<String>({"a b", "\n"}))})}),
+            "Name   Size                  Free  Drive  Tags\n"
+            "-----  --------------------  ----  -----  -------------\n"
             "/      18446744073709551615\n"
-            "/home                              {1, 2}\n");
+            "/home                              'C'    {\"a b\", \"\\n\"}\n");
   // Wide characters, and such as would obey a terminal.
   EXPECT_EQ(table({disk("\u65e5\u672c\x1b[2J\n", {property("B", CIMValue(true))}),
                    disk("x", {property("B", CIMValue(false))})}),
@@ -83,16 +85,10 @@ TEST(Table, Lists) {
               testing::StartsWith("(class)     Name\n"));
   const std::string many = table(std::vector<CIMInstance>(1001, disk("a")));
   EXPECT_EQ(std::count(many.begin(), many.end(), '\n'), 1001 + 2 * 2 + 1);
-}
-
-TEST(Table, OneInstanceIsAListOfItsProperties) {
   EXPECT_EQ(printed(OutputFormat::table, ResultForm::single,
                     {disk("/", {property("Size", CIMValue(Uint64(5)))})}),
             "root/demo:Demo_Disk.Name=\"/\"\n"
-            "Property  Value\n"
-            "--------  -----\n"
-            "Name      /\n"
-            "Size      5\n");
+            "Property  Value\n--------  -----\nName      /\nSize      5\n");
 }
 
 TEST(Output, ValuesAreExact) {
@@ -104,12 +100,8 @@ TEST(Output, ValuesAreExact) {
     const char* json;
   } cases[] = {
       {CIMValue(true), "TRUE", "true"},
-      {CIMValue(Uint8(65)), "65", "65"},
       {CIMValue(Sint8(-128)), "-128", "-128"},
       {CIMValue(Uint64(18446744073709551615ULL)), "18446744073709551615", "18446744073709551615"},
-      {CIMValue(std::numeric_limits<Sint64>::min()), "-9223372036854775808",
-       "-9223372036854775808"},
-      {CIMValue(Real64(2.9)), "2.9", "2.9"},
       {CIMValue(Real64(5)), "5.0", "5.0"},
       {CIMValue(Real64(1e300)), "1.0e+300", "1e300"},
       {CIMValue(Real64(-inf)), "NULL", "\"-INF\""},
@@ -126,8 +118,8 @@ TEST(Output, ValuesAreExact) {
       {CIMValue(CIMTYPE_UINT8, true), "NULL", "null"},
       {CIMValue(CIMObjectPath("root:A.k=\"v\"")), "\"root:A.k=\\\"v\\\"\"",
        "\"root:A.k=\\\"v\\\"\""},
-      {CIMValue(CIMDateTime("20260101120000.000000+060")), "\"20260101120000.000000+060\"",
-       "\"20260101120000.000000+060\""},
+      {CIMValue(CIMDateTime("00000001******.******:000")), "\"00000001******.******:000\"",
+       "\"00000001******.******:000\""},
   };
   for (const auto& row : cases) {
     EXPECT_EQ(mofValue(row.value), row.mof);
@@ -139,79 +131,62 @@ TEST(Output, ValuesAreExact) {
 
 TEST(Output, Lists) {
   EXPECT_EQ(printed(OutputFormat::mof, ResultForm::list, {disk("/"), disk("%s")}),
-            "instance of Demo_Disk {\n  Name = \"/\";\n};\n"
-            "\n"
+            "instance of Demo_Disk {\n  Name = \"/\";\n};\n\n"
             "instance of Demo_Disk {\n  Name = \"%s\";\n};\n");
-  const Json list =
-      Json::parse(printed(OutputFormat::json, ResultForm::list, {disk("a"), disk("b")}));
-  ASSERT_EQ(list.size(), 2u);
-  EXPECT_EQ(list[1]["path"], "root/demo:Demo_Disk.Name=\"b\"");
-  EXPECT_EQ(list[1]["class"], "Demo_Disk");
+  EXPECT_EQ(
+      Json::parse(printed(OutputFormat::json, ResultForm::list, {disk("a"), disk("b")}))[1],
+      Json::parse(
+          R"({"path": "root/demo:Demo_Disk.Name=\"b\"", "class": "Demo_Disk", "properties": {"Name": "b"}})"));
   EXPECT_EQ(printed(OutputFormat::json, ResultForm::list, {}), "[]\n");
 }
 
-CIMClass demoClass() {
-  CIMClass declaration(CIMName("Demo_Disk"), CIMName("Demo_Base"));
-  declaration.addQualifier(CIMQualifier(CIMName("Description"), CIMValue(String("A \"disk\""))));
-  CIMProperty key(CIMName("Name"), CIMValue(CIMTYPE_STRING, false));
-  key.addQualifier(CIMQualifier(CIMName("Key"), CIMValue(true), CIMFlavor::DISABLEOVERRIDE));
-  declaration.addProperty(key);
-  CIMProperty status(CIMName("Status"), CIMValue(Uint16(2)), 0, CIMName(), CIMName("Demo_Base"),
-                     true);
-  status.addQualifier(CIMQualifier(CIMName("Key"), CIMValue(false)));
-  status.addQualifier(CIMQualifier(CIMName("ValueMap"), arrayOf({String("0"), String("2")})));
-  declaration.addProperty(status);
-  declaration.addProperty(CIMProperty(CIMName("Bytes"), CIMValue(CIMTYPE_UINT8, true, 3), 3));
-  declaration.addProperty(
-      CIMProperty(CIMName("Other"), CIMValue(CIMTYPE_REFERENCE, false), 0, CIMName("Demo_Disk")));
-  CIMMethod reset(CIMName("Reset"), CIMTYPE_UINT32);
-  reset.addQualifier(CIMQualifier(CIMName("Static"), CIMValue(true)));
-  CIMParameter delay(CIMName("Delay"), CIMTYPE_SINT64);
-  delay.addQualifier(CIMQualifier(CIMName("In"), CIMValue(true)));
-  reset.addParameter(delay);
-  reset.addParameter(CIMParameter(CIMName("Texts"), CIMTYPE_STRING, true));
-  declaration.addMethod(reset);
-  return declaration;
-}
+constexpr const char* kDemoClass = R"([Description("A \"disk\"") : Translatable]
+class Demo_Disk : Demo_Base {
+  [Key : DisableOverride]
+  string Name;
+  [Key(FALSE) : DisableOverride, ValueMap{"0", "2"}]
+  uint16 Status = 2;
+  uint8 Bytes[3];
+  Demo_Disk REF Other;
+  [Static : DisableOverride]
+  uint32 Reset(
+    [In : DisableOverride] sint64 Delay,
+    string Texts[]);
+};
+)";
 
 TEST(Output, ClassDeclarations) {
-  const auto printedAs = [](OutputFormat format) {
+  const CIMNamespaceName space("root/demo");
+  ClassRepository repository;
+  MofReader reader(repository);
+  ASSERT_TRUE(reader.readText("class Demo_Base { uint16 Status; };", "base.mof", space));
+  ASSERT_TRUE(reader.readText(kDemoClass, "demo.mof", space));
+  const CIMClass demo = repository.getClass(space, "Demo_Disk", false, true, true, {});
+  const auto printedAs = [&](OutputFormat format) {
     return print(format, ResultForm::single,
-                 [](ResultWriter& writer) { writer.deliverClass(demoClass()); });
+                 [&](ResultWriter& writer) { writer.deliverClass(demo); });
   };
-  EXPECT_EQ(printedAs(OutputFormat::mof),
-            "[Description(\"A \\\"disk\\\"\")]\n"
-            "class Demo_Disk : Demo_Base {\n"
-            "  [Key : DisableOverride]\n"
-            "  string Name;\n"
-            "  [Key(FALSE), ValueMap{\"0\", \"2\"}]\n"
-            "  uint16 Status = 2;\n"
-            "  uint8 Bytes[3];\n"
-            "  Demo_Disk REF Other;\n"
-            "  [Static]\n"
-            "  uint32 Reset(\n"
-            "    [In] sint64 Delay,\n"
-            "    string Texts[]);\n"
-            "};\n");
+  EXPECT_EQ(printedAs(OutputFormat::mof), kDemoClass);
   EXPECT_EQ(printedAs(OutputFormat::table),
             "class Demo_Disk : Demo_Base\n"
             "Property  Type           Key  Origin     Default\n"
             "--------  -------------  ---  ---------  -------\n"
-            "Name      string         yes\n"
+            "Name      string         yes  Demo_Disk\n"
             "Status    uint16              Demo_Base  2\n"
-            "Bytes     uint8[3]\n"
-            "Other     Demo_Disk REF\n"
+            "Bytes     uint8[3]            Demo_Disk\n"
+            "Other     Demo_Disk REF       Demo_Disk\n"
             "\n"
             "Method  Returns  Static  Parameters\n"
             "------  -------  ------  -------------------------------\n"
             "Reset   uint32   yes     in sint64 Delay, string[] Texts\n");
   const Json json = Json::parse(printedAs(OutputFormat::json));
   EXPECT_EQ(json["superclass"], "Demo_Base");
-  EXPECT_EQ(json["properties"][0]["qualifiers"]["Key"], true);
-  EXPECT_EQ(json["properties"][0]["default"], nullptr);
-  EXPECT_EQ(json["properties"][1]["classOrigin"], "Demo_Base");
-  EXPECT_EQ(json["properties"][2]["size"], 3);
-  EXPECT_EQ(json["properties"][3]["referenceClass"], "Demo_Disk");
+  const Json& properties = json["properties"];
+  EXPECT_EQ(properties[0]["qualifiers"]["Key"], true);
+  EXPECT_EQ(properties[0]["default"], nullptr);
+  EXPECT_EQ(properties[1]["classOrigin"], "Demo_Base");
+  EXPECT_EQ(properties[2]["size"], 3);
+  EXPECT_EQ(properties[3]["referenceClass"], "Demo_Disk");
   EXPECT_EQ(json["methods"][0]["parameters"][1]["array"], true);
 }
 
@@ -250,25 +225,24 @@ TEST(Output, MethodResults) {
   parameters.append(CIMParamValue("Flags", arrayOf({Uint32(1), Uint32(2)})));
   parameters.append(CIMParamValue("Odd\x1b", CIMValue(String("a\nb"))));
   parameters.append(CIMParamValue("None", CIMValue(CIMTYPE_STRING, false)));
-  const auto result = [&](OutputFormat format, const CIMValue& returned,
-                          const Array<CIMParamValue>& values) {
+  const auto result = [&](OutputFormat format) {
     return print(format, ResultForm::single, [&](ResultWriter& writer) {
-      EXPECT_TRUE(writer.deliverMethodResult(returned, values));
+      EXPECT_TRUE(writer.deliverMethodResult(CIMValue(Sint32(-1)), parameters));
     });
   };
-  EXPECT_EQ(result(OutputFormat::table, CIMValue(Sint32(-1)), parameters),
+  EXPECT_EQ(result(OutputFormat::table),
             "Parameter       Value\n"
             "--------------  ------\n"
             "(return value)  -1\n"
             "Flags           {1, 2}\n"
             "Odd\\x1b         a\\nb\n"
             "None\n");
-  EXPECT_EQ(result(OutputFormat::mof, CIMValue(Sint32(-1)), parameters),
+  EXPECT_EQ(result(OutputFormat::mof),
             "ReturnValue = -1;\nFlags = {1, 2};\nOdd\\x1b = \"a\\nb\";\nNone = NULL;\n");
-  EXPECT_EQ(Json::parse(result(OutputFormat::json, CIMValue(Sint32(-1)), parameters)),
-            Json::parse(R"({"returnValue": -1,
+  EXPECT_EQ(Json::parse(result(OutputFormat::json)), Json::parse(R"({"returnValue": -1,
                             "parameters": {"Flags": [1, 2], "Odd\u001b": "a\nb", "None": null}})"));
-  EXPECT_EQ(Json::parse(result(OutputFormat::json, CIMValue(), {})),
+  const auto deliverNothing = [](ResultWriter& writer) { writer.deliverMethodResult({}, {}); };
+  EXPECT_EQ(Json::parse(print(OutputFormat::json, ResultForm::single, deliverNothing)),
             Json::parse(R"({"returnValue": null, "parameters": {}})"));
 }
 

@@ -69,7 +69,10 @@ class Test_Port { [Key] string Name; };
 class Test_FastPort : Test_Port {};
 class Test_Odd { [Key] string Name; };
 class Test_Typed {
-  [Key] string Name; uint32 Take(uint8 Count, string Names[], Test_Disk REF Ref); };
+  [Key] string Name;
+  [Key(false)] uint8 Size = 5;
+  uint32 Take(uint8 Count, string Names[2], Test_Disk REF Ref, Test_Disk REF Refs[]);
+};
 [Association] class Link_Port { [Key] Test_Disk REF Disk; [Key] Test_Port REF Port; };
 class Link_FastPort : Link_Port {};
 [Association] class Link_Copy { [Key] Test_Base REF Original; [Key] Test_Base REF Copy; };

@@ -42,15 +42,14 @@ TEST(MofError, Tokens) {
       {in("char16 P = 'ab';"), "2:12: unterminated character literal"},
       {in("char16 P = '\xF0\x9F\x98\x80';"), "2:12: the character does not fit in 16 bits"},
       {in("uint8 P = 08;"), "2:11: malformed number '08'"},
-      {in("uint8 P = 12b;"), "2:11: malformed number '12b'"},
       {in("uint8 P = 0x;"), "2:11: malformed number '0x'"},
       {in("uint8 P = - 1;"), "2:11: malformed number '-'"},
       {in("real32 P = 1.;"), "2:12: malformed number '1.'"},
       {in("real32 P = 1.2.3;"), "2:12: malformed number '1.2.3'"},
       {in("uint64 P = 18446744073709551616;"), "2:12: number '18446744073709551616' is too large"},
       {in("real64 P = 1.0e999;"), "2:12: number '1.0e999' is too large"},
-      {"class " + std::string(1000000, 'x') + " {};", "1:7: name of more than 1024 bytes"},
       {"#pragme x", "1:1: expected '#pragma'"},
+      {"class " + std::string(1025, 'x') + " {};", "1:7: name of more than 1024 bytes"},
       {"\x1B[31m", "1:1: unexpected character U+001B"},
       {"%n%s%s%n", "1:1: unexpected '%'"},
       {"class A as $", "1:12: expected a name after '$'"},
@@ -58,18 +57,14 @@ TEST(MofError, Tokens) {
 }
 
 TEST(MofError, Grammar) {
-  const std::string noReference = " (a reference is written CLASS REF name)";
   expectErrors({
       {"A", "1:1: expected a declaration, found 'A'"},
       {"class", "1:6: expected the name of a class, found the end of the text"},
-      {"class A {}\n", "2:1: expected ';', found the end of the text"},
       {"class A : {};", "1:11: expected the name of the superclass, found '{'"},
       {"class A as B {};", "1:12: expected an alias ('$name'), found 'B'"},
       {"[Abstract] uint8", "1:12: expected 'class' or 'instance', found 'uint8'"},
       {"[[[[[[", "1:2: expected the name of a qualifier, found '['"},
       {in("uint8 P\nuint8 Q;"), "3:1: expected ';', found 'uint8'"},
-      {in("void P();"), "2:1: unknown data type 'void'" + noReference},
-      {in("uint8 1P;"), "2:7: malformed number '1P'"},
       {in("uint8 P[] = {1,};"), "2:16: expected a value, found '}'"},
       {in("uint8 P[] = {{1}};"), "2:14: expected a value, found '{'"},
       {in("uint8 P[0];"), "2:9: array size outside 1 to 65536"},
@@ -82,14 +77,12 @@ TEST(MofError, Grammar) {
       {in("[Key : Sometimes] uint8 P;"), "2:8: expected a flavor, found 'Sometimes'"},
       {in("[Description(\"x\") : ToSubclass Restricted] uint8 P;"),
        "2:32: flavor 'Restricted' contradicts an earlier one"},
-      {"Qualifier Q : foo, scope(any);", "1:15: expected a data type, found 'foo'"},
       {"Qualifier Q : uint8;", "1:20: expected ', scope(...)', found ';'"},
       {"Qualifier Q : uint8, scope(all);", "1:28: expected a kind of element, found 'all'"},
       {"instance A {};", "1:10: expected 'of', found 'A'"},
       {"instance of A { P = 1 };", "1:23: expected ';', found '}'"},
       {"instance of A { P; };", "1:18: expected '=', found ';'"},
       {"#pragma include", "1:9: #pragma include needs a string in parentheses"},
-      {"#pragma foo (\"a\"", "1:17: expected ')', found the end of the text"},
       {"#pragma namespace(\"root/1\")", "1:19: 'root/1' is not a namespace"},
       {"#pragma include(\"nowhere/no.mof\")",
        "1:17: cannot read 'nowhere/no.mof': No such file or directory"},
@@ -98,15 +91,11 @@ TEST(MofError, Grammar) {
 
 TEST(MofError, Values) {
   expectErrors({
-      {in("uint8 P = 256;"), "2:11: the value is out of range for uint8"},
       {in("uint8 P = -1;"), "2:11: the value is out of range for uint8"},
-      {in("sint8 P = 128;"), "2:11: the value is out of range for sint8"},
       {in("sint64 P = 9223372036854775808;"), "2:12: the value is out of range for sint64"},
       {in("sint64 P = -9223372036854775809;"), "2:12: the value is out of range for sint64"},
       {in("real32 P = 1.0e39;"), "2:12: the value is out of range for real32"},
       {in("uint8 P = 1.5;"), "2:11: expected a uint8 value, found a real"},
-      {in("boolean P = 1;"), "2:13: expected a boolean value, found an integer"},
-      {in("string P = 'a';"), "2:12: expected a string value, found a character"},
       {in("datetime P = \"20261301000000.000000+000\";"),
        "2:14: \"20261301000000.000000+000\" is not a datetime"},
       {in("datetime P = \"\\x1B[31m\\x0\\xD800\";"), "2:14: \" [31m ???\" is not a datetime"},
@@ -179,10 +168,10 @@ TEST(MofError, Limits) {
   });
 }
 
-TEST(MofDiagnostic, ShowsTheLineWithACaretUnderThePlace) {
+TEST(MofError, ShowsTheLineWithACaretUnderThePlace) {
+  const std::string blanks(1000, ' ');
   const struct {
-    const char* mof;
-    const char* expected;
+    std::string mof, expected;
   } cases[] = {
       {"class A {\n\t/* \xC3\xA9 */ uint8 P = 256;\r\n};",
        "t.mof:2:21: error: the value is out of range for uint8\n"
@@ -190,22 +179,16 @@ TEST(MofDiagnostic, ShowsTheLineWithACaretUnderThePlace) {
        "                   ^\n"},
       // What a terminal would obey is replaced.
       {"~ \x1B[2J \x9B \x7F \xC2\x9B", "t.mof:1:1: error: unexpected '~'\n~  [2J ?    \n^\n"},
+      // Long lines are cut around the place.
+      {"class A {" + blanks + "uint8 P = 256;" + blanks + "};",
+       "t.mof:1:1020: error: the value is out of range for uint8\n..." + std::string(70, ' ') +
+           "uint8 P = 256;" + std::string(76, ' ') + "...\n" + std::string(83, ' ') + "^\n"},
   };
   for (const auto& row : cases) {
     Mof mof;
     EXPECT_FALSE(mof.read(row.mof));
     EXPECT_EQ(mof.diagnostics(), row.expected);
   }
-}
-
-TEST(MofDiagnostic, CutsLongLinesAroundThePlace) {
-  Mof mof;
-  const std::string blanks(1000, ' ');
-  EXPECT_FALSE(mof.read("class A {" + blanks + "uint8 P = 256;" + blanks + "};"));
-  const cimhost::MofDiagnostic& diagnostic = mof.reader.diagnostics()[0];
-  EXPECT_EQ(diagnostic.column, 1020);
-  EXPECT_LT(diagnostic.source.size(), 200u);
-  EXPECT_EQ(diagnostic.source.substr(static_cast<std::size_t>(diagnostic.caret) - 1, 4), "256;");
 }
 
 }  // namespace

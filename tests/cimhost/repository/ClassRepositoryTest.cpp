@@ -5,8 +5,6 @@
 
 #include <gtest/gtest.h>
 
-#include <thread>
-
 namespace cimhost_test {
 namespace {
 
@@ -69,8 +67,6 @@ TEST(ClassRepository, Inheritance) {
       // That a class is an association is inherited, for scopes too.
       {"[Association] class A {}; [Aggregation] class B : A {};", "B",
        "[Aggregation=TRUE Association^=TRUE] B : A\n"},
-      {"class A { [Key(false)] uint8 P; uint8 Q; };", "A",
-       "A\n[Key=FALSE] uint8 P (A)\nuint8 Q (A)\n"},
   };
   for (const auto& row : cases) {
     Mof mof;
@@ -101,8 +97,6 @@ TEST(ClassRepository, Filters) {
       {true, true, true, CIMPropertyList(),
        "[Description^=a] B : A\n[Write=TRUE] uint8 Q (B)\nuint8 p (A)\n"
        "[Static=TRUE] uint8 N() (B)\n"},
-      {false, false, true, CIMPropertyList(),
-       "B : A\nuint8 K (A^)\nuint8 Q (B)\nuint8 p (A)\nuint8 M(uint8 p) (A^)\nuint8 N() (B)\n"},
       {true, false, false, CIMPropertyList(), "B : A\nuint8 Q ()\nuint8 p ()\nuint8 N() ()\n"},
       {false, false, true, listOf({"P", "k", "Other"}),
        "B : A\nuint8 K (A^)\nuint8 p (A)\nuint8 M(uint8 p) (A^)\nuint8 N() (B)\n"},
@@ -139,25 +133,6 @@ TEST(ClassRepository, EveryFetchedClassIsAnother) {
             "(A)\n");
 }
 
-TEST(ClassRepository, ThreadsMayFetchAndChangeAtOnce) {
-  Mof mof;
-  ASSERT_TRUE(mof.read(std::string(kModel) + "class C : B {}; class D : C {};"));
-  const std::string before = mof.classAsText("D");
-  std::vector<std::thread> threads;
-  for (int i = 0; i < 4; ++i) {
-    threads.emplace_back([&mof] {
-      for (int n = 0; n < 300; ++n) {
-        CIMClass d = mof.get(n % 2 == 0 ? "D" : "C");
-        d.getProperty(0).setValue(CIMValue(Uint8(1)));
-        mof.repository.getClass(kNamespace, "D", true, false, false, CIMPropertyList());
-        mof.repository.subclassNames(kNamespace, "A", true);
-      }
-    });
-  }
-  for (std::thread& thread : threads) thread.join();
-  EXPECT_EQ(mof.classAsText("D"), before);
-}
-
 TEST(ClassRepository, Hierarchy) {
   Mof mof;
   ASSERT_TRUE(
@@ -166,7 +141,6 @@ TEST(ClassRepository, Hierarchy) {
   const cimhost::ClassRepository& repository = mof.repository;
   EXPECT_EQ(names(repository.subclassNames(kNamespace, "a", false)), "B C F ");
   EXPECT_EQ(names(repository.subclassNames(kNamespace, "A", true)), "B C D F ");
-  EXPECT_EQ(names(repository.subclassNames(kNamespace, "D", true)), "");
   EXPECT_EQ(names(repository.subclassNames(kNamespace, CIMName(), false)), "A X ");
   EXPECT_EQ(names(repository.subclassNames(kNamespace, CIMName(), true)), "A X B C D E F ");
   EXPECT_TRUE(repository.isSubclass(kNamespace, "d", "A"));
@@ -175,17 +149,14 @@ TEST(ClassRepository, Hierarchy) {
   EXPECT_FALSE(repository.isSubclass(kNamespace, "D", "X"));
   EXPECT_FALSE(repository.isSubclass(kNamespace, "Nope", "Nope"));
   EXPECT_FALSE(repository.isSubclass("root/none", "A", "A"));
-}
-
-TEST(ClassRepository, DeepHierarchiesNeedNoStack) {
-  std::string mof = "class C0 {};";
+  // Deep ones need no stack.
+  std::string deep = "class C0 {};";
   for (int i = 1; i < 20000; ++i) {
-    mof += "class C" + std::to_string(i) + " : C" + std::to_string(i - 1) + " {};";
+    deep += "class C" + std::to_string(i) + " : C" + std::to_string(i - 1) + " {};";
   }
-  Mof chain;
-  ASSERT_TRUE(chain.read(mof));
-  EXPECT_TRUE(chain.repository.isSubclass(kNamespace, "C19999", "C0"));
-  EXPECT_EQ(chain.repository.subclassNames(kNamespace, "C0", true).size(), 19999u);
+  ASSERT_TRUE(mof.read(deep));
+  EXPECT_TRUE(repository.isSubclass(kNamespace, "C19999", "C0"));
+  EXPECT_EQ(repository.subclassNames(kNamespace, "C0", true).size(), 19999u);
 }
 
 TEST(ClassRepository, ErrorsHaveTheCodesOfTheServer) {
@@ -210,23 +181,21 @@ TEST(ClassRepository, ErrorsHaveTheCodesOfTheServer) {
 TEST(ClassRepository, ARefusedClassLeavesNoTraceAndTellsThePart) {
   Mof mof;
   ASSERT_TRUE(mof.read("class A { uint8 P; };"));
-  CIMClass b("B", "A");
-  CIMMethod method("M", CIMTYPE_UINT8);
   CIMParameter parameter("p", CIMTYPE_UINT8);
   parameter.addQualifier(CIMQualifier("In", CIMValue(String("yes"))));
+  CIMMethod method("M", CIMTYPE_UINT8);
   method.addParameter(parameter);
+  CIMClass b("B", "A");
   b.addMethod(method);
   try {
     mof.repository.addClass(kNamespace, b);
     FAIL() << "was added";
   } catch (const cimhost::ClassDeclarationError& error) {
     EXPECT_EQ(text(error.getMessage()), "qualifier 'In' has a value of another type than declared");
-    EXPECT_EQ(text(error.part().feature.getString()), "M");
-    EXPECT_EQ(text(error.part().parameter.getString()), "p");
-    EXPECT_EQ(text(error.part().qualifier.getString()), "In");
+    EXPECT_EQ(names({error.part().feature, error.part().parameter, error.part().qualifier}),
+              "M p In ");
   }
-  EXPECT_FALSE(mof.repository.hasClass(kNamespace, "B"));
-  EXPECT_EQ(names(mof.repository.subclassNames(kNamespace, "A", true)), "");
+  EXPECT_EQ(names(mof.repository.subclassNames(kNamespace, CIMName(), true)), "A ");
 }
 
 // Qualifiers without a flavor, as code rather than a MOF text gives them, follow the declaration.

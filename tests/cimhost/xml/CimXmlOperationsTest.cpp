@@ -101,6 +101,16 @@ TEST_F(CimXmlTest, Classes) {
                      "<VALUE>TRUE</VALUE></QUALIFIER></PROPERTY><PROPERTY NAME='Text' "
                      "TYPE='string' CLASSORIGIN='Test_Disk'></PROPERTY><METHOD NAME='Format' "
                      "TYPE='uint32' CLASSORIGIN='Test_Base' PROPAGATED='true'></METHOD></CLASS>"));
+  EXPECT_EQ(ask("GetClass", className("ClassName", "Test_Typed")),
+            returned("<CLASS NAME='Test_Typed'><PROPERTY NAME='Name' TYPE='string'><QUALIFIER "
+                     "NAME='Key' TYPE='boolean' OVERRIDABLE='false'><VALUE>TRUE</VALUE>"
+                     "</QUALIFIER></PROPERTY><PROPERTY NAME='Size' TYPE='uint8'><VALUE>5</VALUE>"
+                     "</PROPERTY><METHOD NAME='Take' TYPE='uint32'><PARAMETER NAME='Count' "
+                     "TYPE='uint8'></PARAMETER><PARAMETER.ARRAY NAME='Names' TYPE='string' "
+                     "ARRAYSIZE='2'></PARAMETER.ARRAY><PARAMETER.REFERENCE NAME='Ref' "
+                     "REFERENCECLASS='Test_Disk'></PARAMETER.REFERENCE><PARAMETER.REFARRAY "
+                     "NAME='Refs' REFERENCECLASS='Test_Disk'></PARAMETER.REFARRAY></METHOD>"
+                     "</CLASS>"));
   EXPECT_THAT(ask("EnumerateClasses", className("ClassName", "Link_Port")),
               StartsWith("<IRETURNVALUE><CLASS NAME='Link_FastPort' SUPERCLASS='Link_Port'>"));
 }
