@@ -27,9 +27,13 @@ struct Parsed {
   std::string out, error;
 };
 
-CommandLine parse(Words words) {
+Words withHome(Words words) {
   words.insert(words.begin(), {"--home", "h"});
-  const Parsed parsed(words);
+  return words;
+}
+
+CommandLine parse(const Words& words) {
+  const Parsed parsed(withHome(words));
   EXPECT_TRUE(parsed.line) << parsed.error;
   return parsed.line.value_or(CommandLine());
 }
@@ -75,31 +79,52 @@ TEST(CommandLine, UsageErrors) {
     Words arguments;
     const char* message;
   } cases[] = {
-      {{"check"}, "--home"},
-      {{"--home", "h"}, "subcommand"},
-      {{"--home", "h", "frobnicate"}, "subcommand"},
-      {{"--home", "h", "enumerate"}, "NS:CLASS"},
-      {{"--home", "h", "check", "--what"}, "--what"},
-      {{"--home", "h", "check", "x"}, "x"},
-      {{"--home", "h", "--format", "yaml", "check"}, "yaml"},
-      {{"--home", "h", "get", "root:A.k="}, "column 8"},
-      {{"--home", "h", "enumerate", "root:A", "--property", "1x"}, "1x"},
-      {{"--home", "h", "enumerate", "root:A", "--property", ""}, "not valid"},
-      {{"--home", "h", "modify", "root:A.k=1"}, "NAME=VALUE"},
-      {{"--home", "h", "modify", "root:A", "S=1"}, "no keys"},
-      {{"--home", "h", "invoke", "root:A.k=1"}, "METHOD"},
-      {{"--home", "h", "names", "root:A", "--role", "x"}, "--role"},
-      {{"--home", "h", "registration", "--location", ""}, "--location"},
-      {{"--home", "h", "registration", "--module-name", "a\nb"}, "--module-name"},
-      {{"--home", "h", "registration", "--vendor", "\xff"}, "UTF-8"},
+      {{}, "subcommand"},
+      {{"frobnicate"}, "subcommand"},
+      {{"enumerate"}, "NS:CLASS"},
+      {{"check", "--what"}, "--what"},
+      {{"check", "x"}, "x"},
+      {{"--format", "yaml", "check"}, "yaml"},
+      {{"get", "root:A.k="}, "column 8"},
+      {{"enumerate", "root:A", "--property", "1x"}, "1x"},
+      {{"enumerate", "root:A", "--property", ""}, "not valid"},
+      {{"modify", "root:A.k=1"}, "NAME=VALUE"},
+      {{"modify", "root:A", "S=1"}, "no keys"},
+      {{"invoke", "root:A.k=1"}, "METHOD"},
+      {{"names", "root:A", "--role", "x"}, "--role"},
+      {{"registration", "--location", ""}, "--location"},
+      {{"registration", "--module-name", "a\nb"}, "--module-name"},
+      {{"registration", "--vendor", "\xff"}, "UTF-8"},
+      // Other machines need TLS and users.
+      {{"serve", "--bind", "0.0.0.0"}, "it needs --tls-cert"},
+      {{"serve", "--bind", "::"}, "it needs --tls-cert"},
+      {{"serve", "--bind", "::ffff:127.0.0.1"}, "it needs --tls-cert"},
+      {{"serve", "--bind", "0.0.0.0", "--users", "u"}, "it needs --tls-cert"},
+      {{"serve", "--bind", "0.0.0.0", "--tls-cert", "c", "--tls-key", "k"}, "it needs --tls-cert"},
+      {{"serve", "--tls-cert", "c"}, "go together"},
+      {{"serve", "--bind", "localhost"}, "not an IPv4 or IPv6 address"},
+      {{"serve", "--port", "65536"}, "--port"},
+      {{"serve", "--threads", "0"}, "--threads"},
+      {{"serve", "--idle-timeout", "0"}, "--idle-timeout"},
+      {{"serve", "--max-request-size", "1"}, "--max-request-size"},
   };
   for (const auto& row : cases) {
     SCOPED_TRACE(row.message);
-    const Parsed parsed(row.arguments);
+    const Parsed parsed(withHome(row.arguments));
     EXPECT_FALSE(parsed.line);
     EXPECT_EQ(parsed.exitCode, ExitCode::kUsage);
     EXPECT_THAT(parsed.error, HasSubstr(row.message));
     EXPECT_EQ(parsed.out, "");
+  }
+  EXPECT_THAT(Parsed({"check"}).error, HasSubstr("--home"));
+  for (const Words& fine :
+       {Words{"serve"},
+        {"serve", "--bind", "127.0.0.2"},
+        {"serve", "--bind", "::1"},
+        {"serve", "--bind", "0.0.0.0", "--insecure"},
+        {"serve", "--bind", "0.0.0.0", "--tls-cert", "c", "--tls-key", "k", "--users", "u"},
+        {"serve", "--max-request-size", "1048576"}}) {
+    parse(fine);
   }
 }
 

@@ -41,6 +41,11 @@ TEST(Operations, InstancesAreThoseThatAServerWouldDeliver) {
       {"Test_ThrowsPegasus", "1 The CIM name is not valid: 1x", {}},
       {"Test_ThrowsStd", "1 std \xEF\xBF\xBD", {}},
       {"Test_ThrowsInt", "1 Unknown error.", {}},
+      {"Test_ServerDisks",
+       "0 ",
+       {"seen root/test:Test_Disk.Name=\"a\"", "seen root/test:Test_Disk.Name=\"b\"",
+        "seen root/test:Test_BigDisk.Name=\"big\""},
+       "1 Too many objects delivered."},
       {"Test_Uninitialized", "1 uninitialized object", {}},
       {"Test_Missing", "5 Test_Missing", {}},
   };
@@ -70,6 +75,25 @@ TEST(Operations, WhatWasStreamedStaysButTheRestOfAFailedCallIsLost) {
   RecordingSink failed;
   EXPECT_EQ(enumerate(host, "Test_ManyThrows", failed).message, "in the middle");
   EXPECT_EQ(failed.names.size(), DeliveryBuffer<CIMInstance>::kLimit + 1);
+}
+
+// How calls end is tested with the operations; here, what happens at the limit.
+TEST(DeliveryBuffer, OverTheLimitAllThatWaitsGoesOutInOrder) {
+  std::vector<int> out;
+  cimhost::DeliveryBuffer<int> buffer([&out](int value) { return out.push_back(value), true; }, 3);
+  buffer.deliver(1);
+  buffer.complete();
+  buffer.endCall();
+  buffer.deliver(2);
+  buffer.complete();
+  buffer.deliver(3);
+  EXPECT_THAT(out, ElementsAre());
+  buffer.deliver(4);  // 2 waits as completed, 3 and 4 as pending.
+  EXPECT_THAT(out, ElementsAre(1, 2, 3, 4));
+  buffer.deliver(5);
+  buffer.endCall();  // without complete()
+  buffer.finish();
+  EXPECT_THAT(out, ElementsAre(1, 2, 3, 4));
 }
 
 class FailingSink : public InstanceSink {
@@ -173,11 +197,42 @@ TEST(Operations, WhatIsNotThere) {
   EXPECT_EQ(operations.enumerateInstances(context, {kNamespace, CIMName(), {}}, sink).code, 5);
   EXPECT_EQ(operations.enumerateInstanceNames(context, {kNamespace, missing}, sink).code, 5);
   EXPECT_EQ(operations.getClass({kNamespace, missing, true, true, false, {}}, sink).code, 6);
-  EXPECT_EQ(operations.getClass({nowhere, disk, true, true, false, {}}, sink).code, 3);
   EXPECT_EQ(operations.enumerateClassNames({kNamespace, missing, true}, sink).code, 5);
-  EXPECT_EQ(operations.enumerateClassNames({nowhere, CIMName(), true}, sink).code, 3);
   EXPECT_EQ(operations.enumerateClasses({nowhere, disk}, sink).message, "root/nowhere");
   EXPECT_EQ(operations.invokeMethod(context, {nowhere, path, "Any", {}}, sink).code, 3);
+}
+
+TEST(Operations, EndlessRecursionFailsAndTheHostGoesOn) {
+  TestHost host;
+  setenv("TEST_PROVIDER_EVENTS", "", 1);
+  for (int round = 0; round < 2; ++round) {
+    RecordingSink sink;
+    const OperationStatus status = enumerate(host, "Test_Nested", sink);
+    EXPECT_EQ(status.code, CIM_ERR_FAILED);
+    EXPECT_THAT(status.message, HasSubstr("inside each other"));
+  }
+  const std::string events = getenv("TEST_PROVIDER_EVENTS");
+  EXPECT_EQ(std::count(events.begin(), events.end(), ';'), 2 * (EmbeddedCimom::kMaximumDepth + 1));
+}
+
+TEST(Operations, ErrorsOfTheProvidersHandleAreThoseOfAServer) {
+  TestHost host;
+  CIMOMHandle handle;
+  const OperationContext context;
+  const CIMNamespaceName nowhere("root/nowhere");
+  const auto getClass = [&](const CIMNamespaceName& space, const CIMName& name) {
+    return textOf(
+        runOperation([&] { handle.getClass(context, space, name, false, true, true, {}); }));
+  };
+  const auto instance = [&](const char* name) {
+    return textOf(runOperation(
+        [&] { handle.getInstance(context, kNamespace, pathOf(name), false, true, true, {}); }));
+  };
+  EXPECT_EQ(getClass(kNamespace, CIMName()), "6 ");
+  EXPECT_EQ(getClass(nowhere, CIMName("Test_Disk")), "3 root/nowhere");
+  EXPECT_EQ(instance("Nope"), "5 Nope");
+  EXPECT_EQ(instance("Test_Unserved"), "6 Test_Unserved.Name=\"a\"");
+  EXPECT_EQ(instance("Test_BigDisk"), "0 ");
 }
 
 }  // namespace

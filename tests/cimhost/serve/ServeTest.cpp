@@ -14,7 +14,6 @@
 #include <sys/un.h>
 #include <sys/wait.h>
 
-#include <sstream>
 #include <thread>
 
 extern char** environ;
@@ -250,42 +249,6 @@ TEST_F(ServeTest, WhatCannotStartSaysWhy) {
     start(row.options);
     EXPECT_EQ(wait(), ExitCode::kCannotStart);
     EXPECT_THAT(read("log"), HasSubstr(row.problem));
-  }
-}
-
-TEST(ServeCommandLine, OtherMachinesNeedTlsAndUsers) {
-  const struct {
-    std::vector<const char*> options;
-    const char* problem;  // Empty: fine.
-  } cases[] = {
-      {{}, ""},
-      {{"--bind", "127.0.0.2"}, ""},
-      {{"--bind", "::1"}, ""},
-      {{"--bind", "0.0.0.0"}, "it needs --tls-cert"},
-      {{"--bind", "::"}, "it needs --tls-cert"},
-      {{"--bind", "::ffff:127.0.0.1"}, "it needs --tls-cert"},
-      {{"--bind", "0.0.0.0", "--insecure"}, ""},
-      {{"--bind", "0.0.0.0", "--users", "u"}, "it needs --tls-cert"},
-      {{"--bind", "0.0.0.0", "--tls-cert", "c", "--tls-key", "k"}, "it needs --tls-cert"},
-      {{"--bind", "0.0.0.0", "--tls-cert", "c", "--tls-key", "k", "--users", "u"}, ""},
-      {{"--tls-cert", "c"}, "go together"},
-      {{"--bind", "localhost"}, "not an IPv4 or IPv6 address"},
-      {{"--port", "65536"}, "--port"},
-      {{"--threads", "0"}, "--threads"},
-      {{"--idle-timeout", "0"}, "--idle-timeout"},
-      {{"--max-request-size", "1"}, "--max-request-size"},
-      {{"--max-request-size", "1048576"}, ""},
-  };
-  for (const auto& each : cases) {
-    std::vector<const char*> argv = {"cimhost", "--home", "h", "serve"};
-    argv.insert(argv.end(), each.options.begin(), each.options.end());
-    std::ostringstream out;
-    std::ostringstream error;
-    int code = -1;
-    const auto line =
-        parseCommandLine(static_cast<int>(argv.size()), argv.data(), out, error, code);
-    EXPECT_EQ(line.has_value(), *each.problem == '\0') << error.str();
-    EXPECT_THAT(error.str(), HasSubstr(each.problem));
   }
 }
 
