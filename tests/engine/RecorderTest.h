@@ -5,17 +5,6 @@
 
 #include <cstring>
 
-/// Packed words of 32 bits, low byte first.
-inline std::string words(std::initializer_list<int> list) {
-  std::string bytes;
-  for (const int word : list) {
-    for (int shift = 0; shift < 32; shift += 8) {
-      bytes += static_cast<char>(static_cast<unsigned>(word) >> shift);
-    }
-  }
-  return bytes;
-}
-
 /// Tests with the plug-in "alltypes", whose function of each type has the type's name.
 class RecorderTest : public PluginTest {
  protected:

@@ -50,6 +50,16 @@ std::string valueText(const Values& values) {
   return text;
 }
 
+std::string words(std::initializer_list<int> list) {
+  std::string bytes;
+  for (const int word : list) {
+    for (int shift = 0; shift < 32; shift += 8) {
+      bytes += static_cast<char>(static_cast<unsigned>(word) >> shift);
+    }
+  }
+  return bytes;
+}
+
 void PrintTo(const ProviderDefValue& value, std::ostream* stream) {
   *stream << valueText(value);
 }

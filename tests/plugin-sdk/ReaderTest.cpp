@@ -2,11 +2,13 @@
 
 #include <gtest/gtest.h>
 
+#include <climits>
 #include <cstring>
 #include <memory>
 #include <random>
 
 #include "commonprovider/plugin.h"
+#include "tests/engine/ValueText.h"
 
 using namespace std::string_literals;
 
@@ -25,26 +27,26 @@ struct Buffer {
 
 std::string ints(size_t count) {
   std::string result;
-  for (size_t i = 0; i < count; ++i) result += "\0\0\0\0\7\0\0\0"s;
+  for (size_t i = 0; i < count; ++i) result += words({0, 7});
   return result;
 }
 
 TEST(Reader, RefusesWhatIsNoItem) {
   const std::pair<std::string, int> cases[] = {
-      {"\4\0\0\0\0\0\0\0"s, CP_BAD_BUFFER},
-      {"\xff\xff\xff\xff\0\0\0\0"s, CP_BAD_BUFFER},
-      {"\1\0\0\0\xff\xff\xff\xff"s, CP_BAD_BUFFER},
-      {"\1\0\0\0\xf8\3\0\0"s, CP_BAD_BUFFER},  // 1016 bytes: the NUL would be behind the end
-      {"\1\0\0\0\2\0\0\0abc\0"s, CP_BAD_BUFFER},
-      {"\1\0\0\0\xf7\3\0\0"s, CP_OK},
-      {"\2\0\0\0\xff\xff\xff\xff"s, CP_BAD_BUFFER},
-      {"\2\0\0\0\x80\0\0\0"s, CP_BAD_BUFFER},
-      {"\2\0\0\0\x7f\0\0\0"s, CP_OK},
-      {"\2\0\0\0\2\0\0\0\0\0\0\0\1\0\0\0\1\0\0\0\0\0\0\0\0"s, CP_BAD_BUFFER},
-      {"\3\0\0\0\1\0\0\0\0\0\0\0\1\0\0\0"s, CP_BAD_BUFFER},
-      {"\3\0\0\0\1\0\0\0\3\0\0\0\0\0\0\0"s, CP_BAD_BUFFER},
-      {"\3\0\0\0\2\0\0\0\1\0\0\0\1\0\0\0a\0\1\0\0\0\xff\3\0\0"s, CP_BAD_BUFFER},
-      {"\x63\0\0\0"s, CP_END}};
+      {words({4, 0}), CP_BAD_BUFFER},
+      {words({-1, 0}), CP_BAD_BUFFER},
+      {words({1, -1}), CP_BAD_BUFFER},
+      {words({1, 1016}), CP_BAD_BUFFER},  // the NUL would be behind the end
+      {words({1, 2}) + "abc\0"s, CP_BAD_BUFFER},
+      {words({1, 1015}), CP_OK},
+      {words({2, -1}), CP_BAD_BUFFER},
+      {words({2, 128}), CP_BAD_BUFFER},
+      {words({2, 127}), CP_OK},
+      {words({2, 2, 0, 1, 1, 0, 0}), CP_BAD_BUFFER},
+      {words({3, 1, 0, 1}), CP_BAD_BUFFER},
+      {words({3, 1, 3, 0}), CP_BAD_BUFFER},
+      {words({3, 2, 1, 1}) + "a\0"s + words({1, 1023}), CP_BAD_BUFFER},
+      {words({99}), CP_END}};
   for (const auto& [bytes, expected] : cases) {
     Buffer buffer(bytes);
     cp_item item;
@@ -56,10 +58,10 @@ TEST(Reader, RefusesWhatIsNoItem) {
 TEST(Reader, StopsAtTheBuffersEnd) {
   const std::pair<std::string, int> cases[] = {
       {ints(128), CP_END},
-      {ints(127) + "\1\0\0\0\0\0\0\0"s, CP_BAD_BUFFER},
-      {ints(126) + "\1\0\0\0\4\0\0\0abcd\0"s, CP_BAD_BUFFER},  // three bytes are left
-      {ints(126) + "\1\0\0\0\3\0\0\0abc\0\x63\0\0\0"s, CP_END},
-      {ints(126) + "\1\0\0\0\3\0\0\0abc\0\0\0\0\0"s, CP_BAD_BUFFER}};
+      {ints(127) + words({1, 0}), CP_BAD_BUFFER},
+      {ints(126) + words({1, 4}) + "abcd", CP_BAD_BUFFER},  // three bytes are left
+      {ints(126) + words({1, 3}) + "abc\0"s + words({99}), CP_END},
+      {ints(126) + words({1, 3}) + "abc\0"s, CP_BAD_BUFFER}};
   for (const auto& [bytes, expected] : cases) {
     Buffer buffer(bytes);
     cp_item item;
@@ -70,7 +72,7 @@ TEST(Reader, StopsAtTheBuffersEnd) {
 }
 
 TEST(Reader, TellsTheLengthOfATextWithANul) {
-  Buffer buffer("\1\0\0\0\3\0\0\0a\0b\0\0\0\0\0\5\0\0\0"s);
+  Buffer buffer(words({1, 3}) + "a\0b\0"s + words({0, 5}));
   cp_item item;
   int number = 0;
   EXPECT_EQ(cp_next(&buffer.reader, &item), CP_OK);
@@ -82,11 +84,11 @@ TEST(Reader, TellsTheLengthOfATextWithANul) {
 // Items of random tags, lengths and counts: whatever comes, reading ends and stays inside.
 TEST(Reader, StaysInTheBufferWhateverItHolds) {
   std::mt19937 random(20260131);
-  const std::uint32_t words[] = {0, 1, 2, 3, 99, 4, 16, 127, 1007, 1015, 1016, 0x7fffffff, ~0u};
+  const int values[] = {0, 1, 2, 3, 99, 4, 16, 127, 1007, 1015, 1016, INT_MAX, -1};
   for (int round = 0; round < 20000; ++round) {
     Buffer buffer("");
     for (int i = 0; i < 40; ++i) {
-      const std::uint32_t word = words[random() % (random() % 4 == 0 ? std::size(words) : 4)];
+      const int word = values[random() % (random() % 4 == 0 ? std::size(values) : 4)];
       std::memcpy(buffer.bytes.get() + random() % 300, &word, sizeof word);
     }
     const char* const end = buffer.reader.end;

@@ -23,35 +23,23 @@ struct Buffer {
 
 const std::string kGap(CP_STRING_GAP, '?');
 const char* const kTexts[] = {"a", "bc"};
+const std::string kPackedTexts =
+    words({3, 2, 1, 1}) + "a\0"s + kGap + words({1, 2}) + "bc\0"s;  // without the last gap
 const int kInts[] = {7, -1};
 
 TEST(Writer, LaysListsAsTheProviderReadsThem) {
   const std::pair<std::function<void(cp_writer*)>, std::string> cases[] = {
-      {[](cp_writer*) {}, "\x63\0\0\0"s},
-      {[](cp_writer* w) { cp_put_int(w, -2); }, "\0\0\0\0\xfe\xff\xff\xff\x63\0\0\0"s},
-      {[](cp_writer* w) { cp_put_string(w, "ok"); }, "\1\0\0\0\2\0\0\0ok\0\x63\0\0\0"s},
-      {[](cp_writer* w) {
-         cp_put_string(w, "ok");
-         cp_put_int(w, 5);
-       },
-       "\1\0\0\0\2\0\0\0ok\0\0\0\0\5\0\0\0\x63\0\0\0"s},
-      {[](cp_writer* w) {
-         cp_put_string(w, "ok");
-         cp_put_string(w, "");
-         cp_put_ints(w, kInts, 1);
-       },
-       "\1\0\0\0\2\0\0\0ok\0\1\0\0\0\0\0\0\0\0\2\0\0\0\1\0\0\0\0\0\0\0\x07\0\0\0\x63\0\0\0"s},
-      {[](cp_writer* w) {
-         cp_put_strings(w, kTexts, 2);
-         cp_put_int(w, 5);
-       },
-       "\3\0\0\0\2\0\0\0\1\0\0\0\1\0\0\0a\0"s + kGap + "\1\0\0\0\2\0\0\0bc\0"s + kGap +
-           "\0\0\0\0\5\0\0\0\x63\0\0\0"s},
-      {[](cp_writer* w) {
-         cp_put_strings(w, nullptr, 0);
-         cp_put_string(w, "x");
-       },
-       "\3\0\0\0\0\0\0\0\1\0\0\0\1\0\0\0x\0\x63\0\0\0"s}};
+      {[](cp_writer*) {}, words({99})},
+      {[](cp_writer* w) { cp_put_int(w, -2); }, words({0, -2, 99})},
+      {[](cp_writer* w) { cp_put_string(w, "ok"); }, words({1, 2}) + "ok\0"s + words({99})},
+      {[](cp_writer* w) { cp_put_string(w, "ok"), cp_put_int(w, 5); },
+       words({1, 2}) + "ok" + words({0, 5, 99})},
+      {[](cp_writer* w) { cp_put_string(w, "ok"), cp_put_string(w, ""), cp_put_ints(w, kInts, 1); },
+       words({1, 2}) + "ok\0"s + words({1, 0}) + "\0"s + words({2, 1, 0, 7, 99})},
+      {[](cp_writer* w) { cp_put_strings(w, kTexts, 2), cp_put_int(w, 5); },
+       kPackedTexts + kGap + words({0, 5, 99})},
+      {[](cp_writer* w) { cp_put_strings(w, nullptr, 0), cp_put_string(w, "x"); },
+       words({3, 0, 1, 1}) + "x\0"s + words({99})}};
   for (const auto& [write, expected] : cases) {
     Buffer buffer;
     cp_writer writer = cp_write_list(&buffer.bytes[0]);
@@ -66,10 +54,9 @@ TEST(Writer, LaysResultsAsTheProviderReadsThem) {
   EXPECT_EQ(cp_return_string(&text.bytes[0], "abc"), CP_OK);
   EXPECT_EQ(text.written(), "abc\0"s);
   EXPECT_EQ(cp_return_ints(&ints.bytes[0], kInts, 2), CP_OK);
-  EXPECT_EQ(ints.written(), "\2\0\0\0\2\0\0\0\0\0\0\0\x07\0\0\0\0\0\0\0\xff\xff\xff\xff"s);
+  EXPECT_EQ(ints.written(), words({2, 2, 0, 7, 0, -1}));
   EXPECT_EQ(cp_return_strings(&texts.bytes[0], kTexts, 2), CP_OK);
-  EXPECT_EQ(texts.written(),
-            "\3\0\0\0\2\0\0\0\1\0\0\0\1\0\0\0a\0"s + kGap + "\1\0\0\0\2\0\0\0bc\0"s);
+  EXPECT_EQ(texts.written(), kPackedTexts);
 }
 
 TEST(Writer, RefusesWhatDoesNotBelongThere) {
@@ -84,7 +71,7 @@ TEST(Writer, RefusesWhatDoesNotBelongThere) {
   EXPECT_EQ(cp_put_int(&ints, 1), CP_WRONG_KIND);
   EXPECT_EQ(cp_begin_strings(&ints), CP_WRONG_KIND);
   EXPECT_EQ(cp_add_int(&ints, 1), CP_OK);
-  EXPECT_EQ(buffer.bytes.substr(0, 16), "\2\0\0\0\1\0\0\0\0\0\0\0\1\0\0\0"s);
+  EXPECT_EQ(buffer.bytes.substr(0, 16), words({2, 1, 0, 1}));
 }
 
 class WriterAtTheEnd : public RecorderTest {
