@@ -69,7 +69,7 @@ const Errors kErrors[] = {
     {kModule + "<class name='C'/></plugin>", kInClass, {{"", kNoInstances + "plugin"}}},
     {kClassBody + "<property name='P'>",
      "\nproperty:P\n" + kInClass,
-     {{"<get/></property>", kNoProperty + "property"},
+     {{"<get/>" + kConstant + "</get>", kNoProperty + "constant"},
       {kGet + "<set>1", kNoProperty + "1"},
       {"<get>" + kConstant + "<conversion type='valuemap'/><conversion/>",
        "end of the get element is missing before: conversion"}}},

