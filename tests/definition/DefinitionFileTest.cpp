@@ -44,33 +44,15 @@ class DefinitionFile : public Registered {
   LogLevel level_{1};
 };
 
-TEST_F(DefinitionFile, EveryElementIsReadAndRegistered) {
+// What the elements become: every_element.dump.
+TEST_F(DefinitionFile, EveryElementIsRegistered) {
   EXPECT_EQ(readingOf(DATA_FOLDER "/every_element.xml"), "");
-  ASSERT_NE(getModule("sample"), nullptr);
-  EXPECT_EQ(getModule("sample")->getInit()->getDefFunction(), getFunction("startUp"));
+  ASSERT_NE(getModule("resetter"), nullptr);
   EXPECT_EQ(getModule("resetter")->getInit()->getDefFunction(), getFunction("startReset"));
-  const std::pair<const char*, const char*> functions[] = {{"startUp", "sample"},
-                                                           {"diskCount", "sample"},
-                                                           {"diskName", "sample"},
-                                                           {"renameDisk", "sample"},
-                                                           {"diskLabel", "sample"},
-                                                           {"startReset", "resetter"},
-                                                           {"resetDisk", "resetter"},
-                                                           {"linkedParts", "linker"},
-                                                           {"partName", "/opt/sample/libparts.so"}};
-  for (const auto& [name, module] : functions) {
-    ASSERT_NE(getFunction(name), nullptr) << name;
-    EXPECT_EQ(getFunction(name)->getModule(), getModule(module)) << name;
-  }
-  EXPECT_EQ(functionCount(), std::size(functions));
-
+  EXPECT_EQ(functionCount(), 9u);
   EXPECT_THAT(classes(), ElementsAre("Sample_Disk", "Sample_Part"));
-  const ProviderDefClass* disk = getProviderDefClass("SAMPLE_disk");
-  ASSERT_EQ(disk, &registeredClasses()[0]);
-  EXPECT_EQ(disk->getProperties().size(), 4u);
-  const ProviderDefAssociation* linked = getProviderDefAssociation("sample_diskpart");
-  ASSERT_NE(linked, nullptr);
-  EXPECT_EQ(linked->getClassNamePairs().size(), 3u);
+  EXPECT_EQ(getProviderDefClass("SAMPLE_disk"), &registeredClasses()[0]);
+  EXPECT_EQ(getProviderDefAssociation("sample_diskpart"), &registeredAssociations()[0]);
 }
 
 TEST_F(DefinitionFile, AFileReadTwiceAddsItsClassesOnly) {

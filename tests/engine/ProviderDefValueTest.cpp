@@ -22,36 +22,19 @@ ProviderDefValue indexString(const char* text) {
 }  // namespace
 
 TEST(ProviderDefValue, EachConstructorSetsItsTypeAndItsFieldAlone) {
-  struct Case {
-    ProviderDefValue value;
-    int type, number;
-    long longNumber;
-    bool truth;
-    const char* text;
-    Ints numbers;
-    Texts texts;
-  };
-  const Case cases[] = {
-      {ProviderDefValue(), 0, 0, 0, false, "", {}, {}},
-      {INT_MIN, 0, INT_MIN, INT_MIN, false, "", {}, {}},
-      {LONG_MAX, 6, 0, LONG_MAX, false, "", {}, {}},
-      {true, 5, 0, 0, true, "", {}, {}},
-      {"a", 1, 0, 0, false, "a", {}, {}},
-      {std::string("b"), 1, 0, 0, false, "b", {}, {}},
-      {Ints{3, 4}, 2, 0, 0, false, "", {3, 4}, {}},
-      {Texts{"c", ""}, 3, 0, 0, false, "", {}, {"c", ""}},
-      {indexString("d"), 4, 0, 0, false, "d", {}, {}},
-  };
-  for (const Case& c : cases) {
-    SCOPED_TRACE(valueText(c.value));
-    EXPECT_EQ(c.value.getType(), c.type);
-    EXPECT_EQ(c.value.getIntValue(), c.number);
-    EXPECT_EQ(c.value.getLongValue(), c.longNumber);
-    EXPECT_EQ(c.value.getBoolValue(), c.truth);
-    EXPECT_EQ(c.value.getStringValue(), c.text);
-    EXPECT_EQ(c.value.getIntArray(), c.numbers);
-    EXPECT_EQ(c.value.getStringArray(), c.texts);
+  for (int type = 0; type < 7; ++type) {
+    SCOPED_TRACE(type);
+    const ProviderDefValue& value = oneOfEachType().at(static_cast<size_t>(type));
+    EXPECT_EQ(value.getType(), type);
+    EXPECT_EQ(value.getIntValue(), type == 0 ? 7 : 0);
+    EXPECT_EQ(value.getLongValue(), type == 0 || type == 6 ? 7 : 0);
+    EXPECT_EQ(value.getBoolValue(), type == 5);
+    EXPECT_EQ(value.getStringValue(), type == 1 ? "seven" : type == 4 ? "index" : "");
+    EXPECT_EQ(value.getIntArray(), type == 2 ? Ints{7} : Ints());
+    EXPECT_EQ(value.getStringArray(), type == 3 ? Texts{"seven"} : Texts());
   }
+  EXPECT_EQ(valueText({ProviderDefValue(), INT_MIN, LONG_MAX, std::string("b")}),
+            "0 0; 0 -2147483648; 6 " + std::to_string(LONG_MAX) + "; 1 b; ");
 }
 
 TEST(ProviderDefValue, StringConstructorAloneIsLogged) {
