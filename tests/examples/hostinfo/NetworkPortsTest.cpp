@@ -124,14 +124,14 @@ TEST_F(FakePorts, NumbersStayInTheRangeOfInt) {
 TEST_F(FakePorts, BytesAreToldInKiBAndFlagsInHexadecimal) {
   add("p", {{"ifindex", "1\n"},
             {"flags", "0x1043\n"},
-            {"statistics/rx_bytes", "10240\n"},
+            {"statistics/rx_bytes", "102400\n"},
             {"statistics/tx_bytes", "2047\n"}});
   add("q", {{"ifindex", "2\n"}, {"flags", "0x1042\n"}});
   ASSERT_EQ(library_.count("hostNetworkPortCount"), 2);
   EXPECT_EQ(library_.integer("hostNetworkPortUp", 0), 1);
   EXPECT_EQ(library_.integer("hostNetworkPortUp", 1), 0);
   EXPECT_EQ(library_.bytes("hostNetworkPortTraffic", 0).substr(0, 24),
-            std::string("\2\0\0\0\4\0\0\0\0\0\0\0\x0A\0\0\0\0\0\0\0\1\0\0\0", 24));
+            std::string("\2\0\0\0\4\0\0\0\0\0\0\0\x64\0\0\0\0\0\0\0\1\0\0\0", 24));
 }
 
 }  // namespace
