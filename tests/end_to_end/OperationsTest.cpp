@@ -53,9 +53,8 @@ TEST_F(HostOperations, EveryKindOfValueArrives) {
   EXPECT_EQ(run({"check"}).out, "4 definitions, 0 errors, 0 warnings\n");
   for (const std::string name : {"Host_FileSystem", "Host_NetworkPort", "Host_IPEndpoint"}) {
     const json instance = enumerate(name).at(0);
-    for (const json& declared : runJson({"class", "root/host:" + name}).at("properties")) {
-      EXPECT_TRUE(instance.at("properties").contains(declared.at("name"))) << declared;
-    }
+    const json cimClass = runJson({"class", "root/host:" + name});
+    EXPECT_EQ(instance.at("properties").size(), cimClass.at("properties").size()) << name;
   }
   for (const json& system : enumerate("Host_FileSystem")) {
     const json& properties = system.at("properties");
@@ -112,18 +111,19 @@ TEST_F(HostOperations, ModifiedPropertyIsReadBackByAnotherProcess) {
 TEST_F(HostOperations, MethodOfTheClassDeliversAnArray) {
   const json systems = enumerate("Host_FileSystem");
   const std::string type = textOf(systems[0], "FileSystemType");
-  json expected = json::array();
+  json ofType = json::array();
   for (const json& system : systems) {
-    if (textOf(system, "FileSystemType") == type) expected.push_back(textOf(system, "Name"));
+    if (textOf(system, "FileSystemType") == type) ofType.push_back(textOf(system, "Name"));
   }
-  std::vector<std::string> command = {"invoke", "root/host:Host_FileSystem", "FindByType",
-                                      "FileSystemType=" + type};
-  const json result = runJson(command);
-  EXPECT_EQ(result.at("returnValue"), 0);
-  EXPECT_EQ(result.at("parameters").at("Count"), expected.size());
-  EXPECT_EQ(result.at("parameters").at("Names"), expected);
-  command.push_back("Limit=1");
-  EXPECT_EQ(runJson(command).at("parameters").at("Names"), json::array({expected[0]}));
+  const json first = json::array({textOf(systems[0], "Name")});
+  const std::tuple<std::string, std::size_t, json> cases[] = {
+      {"FileSystemType=" + type, ofType.size(), ofType}, {"Limit=1", systems.size(), first}};
+  for (const auto& [input, count, names] : cases) {
+    const json result = runJson({"invoke", "root/host:Host_FileSystem", "FindByType", input});
+    EXPECT_EQ(result.at("returnValue"), names.size() < count ? 1 : 0);
+    EXPECT_EQ(result.at("parameters").at("Count"), count);
+    EXPECT_EQ(result.at("parameters").at("Names"), names);
+  }
 }
 
 TEST_F(HostOperations, MethodOfAnInstanceRunsOnThatInstance) {

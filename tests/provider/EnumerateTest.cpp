@@ -11,12 +11,13 @@ namespace {
 
 using Enumerate = ProviderTest;
 
+const CIMProperty kName = declared("Name", CIMTYPE_STRING, Key::kYes);
+
 TEST_F(Enumerate, EachIndexGivesAnInstanceAndFetchesTheClassAnew) {
   setTable(state->left, {"a", "b"});
   state->numbers[1] = 7;
   host.add(makeClass("T_Item", {declared("Undefined", CIMTYPE_STRING, Key::kUnqualified),
-                                declared("Size", CIMTYPE_UINT8, Key::kYes),
-                                declared("Name", CIMTYPE_STRING, Key::kYes)}));
+                                declared("Size", CIMTYPE_UINT8, Key::kYes), kName}));
   start(itemClass(property("Size", call("number", "getIi")) +
                   property("NotInTheClass", constant("int", "1"))));
   // The class's order, not the definition's; its name as the client spells it.
@@ -26,13 +27,14 @@ TEST_F(Enumerate, EachIndexGivesAnInstanceAndFetchesTheClassAnew) {
                   "root/t:t_item.Name=\"b\",Size=7 {Size=uint8 7, Name=string b}", "complete"));
   EXPECT_THAT(host.calls, ElementsAre("getClass root/t t_item 0 1 1 null",
                                       "getClass root/t t_item 0 1 1 null"));
+  EXPECT_THAT(enumerate("root/t:T_Nothing").events, ElementsAre());
 }
 
 TEST_F(Enumerate, DeliversPropertiesOfNameAndValueOnly) {
   setTable(state->left, {"a"});
   CIMProperty name(CIMName("Name"), CIMValue(CIMTYPE_STRING, false), 0, CIMName(),
                    CIMName("T_Origin"), true);
-  name.addQualifier(CIMQualifier(CIMName("Key"), CIMValue(true)));
+  name.addQualifier(flag("Key", true));
   host.add(makeClass("T_Item", {name}));
   start(itemClass());
   Array<CIMInstance> delivered = enumerate("root/t:T_Item").instances;
@@ -44,30 +46,20 @@ TEST_F(Enumerate, DeliversPropertiesOfNameAndValueOnly) {
 }
 
 TEST_F(Enumerate, CountsThatGiveNoInstance) {
-  host.add(makeClass("T_Item", {declared("Name", CIMTYPE_STRING, Key::kYes)}));
-  start(itemClass());
+  host.add(makeClass("T_Item", {kName}));
+  start(itemClass() + definedClass("T_Failing", call("nowhere", "getI", ""), ""));
   for (const int count : {0, -1, INT_MIN}) {
     state->left.count = count;
     EXPECT_THAT(enumerate("root/t:T_Item").events, ElementsAre("processing", "complete")) << count;
   }
+  const LogLevel errors(1);
+  EXPECT_THROW(enumerate("root/t:T_Failing"), ProviderDefError);
+  EXPECT_EQ(tree.log(), "Couldn't load function nowhere\n");
   EXPECT_THAT(host.calls, ElementsAre());
 }
 
-TEST_F(Enumerate, CountThatFailsLeavesAndIsLogged) {
-  host.add(makeClass("T_Item", {declared("Name", CIMTYPE_STRING, Key::kYes)}));
-  start(definedClass("T_Item", call("nowhere", "getI", ""), ""));
-  const LogLevel errors(1);
-  EXPECT_THROW(enumerate("root/t:T_Item"), ProviderDefError);
-  EXPECT_EQ(tree.log(), "Couldn't load function nowhere\n");
-}
-
-TEST_F(Enumerate, UnknownClassIsSilent) {
-  start(itemClass());
-  EXPECT_THAT(enumerate("root/t:T_Nothing").events, ElementsAre());
-}
-
 TEST_F(Enumerate, IndexStringsTellInstancesApart) {
-  host.add(makeClass("T_Item", {declared("Name", CIMTYPE_STRING, Key::kYes)}));
+  host.add(makeClass("T_Item", {kName}));
   start(definedClass("T_Item", constant("int", "2"),
                      property("Name", constant("indexstring", "Disk"))));
   EXPECT_THAT(enumerate("root/t:T_Item").events,
@@ -88,60 +80,51 @@ TEST_F(Enumerate, DatetimeIsEvaluatedTwiceAndOthersOnce) {
   }
 }
 
-// What keeps an instance from being built; the second property of T_Item, next to its key.
-struct Fault {
-  const char* name;
-  CIMProperty declaration;
-  std::string definition;
-  const char* message;  ///< Of the log; null when it is not a ProviderDefError.
-};
-
-std::ostream& operator<<(std::ostream& out, const Fault& fault) {
-  return out << fault.name;
-}
-
-class FaultyProperty : public ProviderTest, public testing::WithParamInterface<Fault> {};
-
-TEST_P(FaultyProperty, DropsTheInstance) {
-  setTable(state->left, {"\xff"});
-  state->numbersCount = 2;
-  const Fault& fault = GetParam();
-  host.add(makeClass("T_Item", {declared("Name", CIMTYPE_STRING, Key::kYes), fault.declaration}));
-  start(definedClass(
-      "T_Item", constant("int", "1"),
-      property("Name", constant("string", "n")) + property("Fault", fault.definition)));
-  LogLevel level(9);
-  StdoutCapture capture;
-  EXPECT_THAT(enumerate("root/t:T_Item").events, ElementsAre("processing", "complete"));
-  const std::string output = capture.text();
-  if (fault.message == nullptr) {
-    EXPECT_THAT(tree.log(), HasSubstr("Unknown exception\n"));
-    EXPECT_THAT(output, Not(HasSubstr("ProviderDefError")));
-  } else {
-    EXPECT_THAT(tree.log(), HasSubstr(fault.message));
-    EXPECT_THAT(output, HasSubstr("ProviderDefError $s\n"));
-  }
-}
-
-INSTANTIATE_TEST_SUITE_P(
-    Enumerate, FaultyProperty,
-    testing::Values(
-        Fault{"NoKeyQualifier", declared("Fault", CIMTYPE_STRING, Key::kUnqualified),
-              constant("string", "x"), nullptr},
-        Fault{"NotUtf8", declared("Fault", CIMTYPE_STRING), call("leftText", "getSi"), nullptr},
-        Fault{"FixedArrayOfAnotherSize", declared("Fault", CIMTYPE_UINT8, Key::kNo, true, 3),
-              call("numbers", "getAIi"), nullptr},
-        Fault{"NoSuchFunction", declared("Fault", CIMTYPE_UINT8), call("nowhere", "getIi"),
-              "Couldn't load function nowhere\n"}),
-    kByName);
-
 TEST_F(Enumerate, OneBadInstanceLeavesTheOthers) {
   setTable(state->left, {"a", nullptr, "\xff", "d"});
-  host.add(makeClass("T_Item", {declared("Name", CIMTYPE_STRING, Key::kYes)}));
+  host.add(makeClass("T_Item", {kName}));
   start(itemClass());
   EXPECT_THAT(enumerate("root/t:T_Item").events,
               ElementsAre("processing", "root/t:T_Item.Name=\"a\" {Name=string a}",
                           "root/t:T_Item.Name=\"d\" {Name=string d}", "complete"));
+}
+
+TEST_F(Enumerate, FaultyPropertiesDropTheInstance) {
+  setTable(state->left, {"\xff"});
+  state->numbersCount = 2;
+  const struct {
+    CIMProperty declaration;
+    std::string definition;
+    bool isDefinitionError;
+    const char* message;
+  } faults[] = {
+      {declared("Fault", CIMTYPE_STRING, Key::kUnqualified), constant("string", "x"), false,
+       "Unknown exception\n"},
+      // Not UTF-8.
+      {declared("Fault", CIMTYPE_STRING), call("leftText", "getSi"), false, "Unknown exception\n"},
+      // An array of another size.
+      {declared("Fault", CIMTYPE_UINT8, Key::kNo, true, 3), call("numbers", "getAIi"), false,
+       "Unknown exception\n"},
+      {declared("Fault", CIMTYPE_UINT8), call("nowhere", "getIi"), true,
+       "Couldn't load function nowhere\n"}};
+  for (const auto& fault : faults) {
+    TestHost other;
+    other.add(makeClass("T_Item", {kName, fault.declaration}));
+    use(other);
+    start(definedClass(
+        "T_Item", constant("int", "1"),
+        property("Name", constant("string", "n")) + property("Fault", fault.definition)));
+    {
+      const LogLevel level(9);
+      StdoutCapture capture;
+      EXPECT_THAT(enumerate("root/t:T_Item").events, ElementsAre("processing", "complete"));
+      EXPECT_EQ(capture.text().find("ProviderDefError $s\n") != std::string::npos,
+                fault.isDefinitionError);
+    }
+    EXPECT_THAT(tree.log(), HasSubstr(fault.message)) << fault.definition;
+    std::filesystem::remove(tree.logs() / "CommonProvider.log");
+    stop();
+  }
 }
 
 }  // namespace

@@ -14,7 +14,7 @@ struct Line {
 
 struct LogCase {
   const char* name;
-  void (*operation)(Vaneth::CommonProvider& provider);
+  void (*operation)(ProviderTest& test);
   std::vector<Line> lines;  ///< In the order of the log.
 };
 
@@ -28,13 +28,10 @@ class Log : public LinkTest, public testing::WithParamInterface<LogCase> {
     LinkTest::SetUp();
     setTable(state->right, {"20260101120000.000000+060"});
     setTable(state->left, {"a"});
-    CIMClass full =
-        makeClass("T_Full", {declared("Other", CIMTYPE_STRING), declared("When", CIMTYPE_DATETIME),
-                             declared("Name", CIMTYPE_STRING, Key::kYes)});
-    CIMMethod method(CIMName("Run"), CIMTYPE_SINT32);
-    method.addQualifier(CIMQualifier(CIMName("static"), CIMValue(Boolean(false))));
-    full.addMethod(method);
-    host.add(full);
+    host.add(makeClass("T_Full",
+                       {declared("Other", CIMTYPE_STRING), declared("When", CIMTYPE_DATETIME),
+                        declared("Name", CIMTYPE_STRING, Key::kYes)},
+                       {method("Run", false)}));
     start(classes() +
           definedClass("T_Full", constant("int", "1"),
                        property("When", call("rightText", "getSi")) +
@@ -48,7 +45,7 @@ TEST_P(Log, HasTheLinesOfItsLevelInOrder) {
   for (int level = 6; level <= 9; ++level) {
     std::filesystem::remove(tree.logs() / "CommonProvider.log");
     const LogLevel set(level);
-    GetParam().operation(*provider);
+    GetParam().operation(*this);
     const std::string log = tree.log();
     size_t from = 0;
     for (const auto& [atLevel, text] : GetParam().lines) {
@@ -59,43 +56,11 @@ TEST_P(Log, HasTheLinesOfItsLevelInOrder) {
   }
 }
 
-void enumerateOf(Vaneth::CommonProvider& provider, const char* path) {
-  RecordingHandler handler;
-  provider.enumerateInstances(OperationContext(), pathOf(path), false, false, CIMPropertyList(),
-                              handler);
-}
-
-void enumerateFull(Vaneth::CommonProvider& provider) {
-  enumerateOf(provider, "root/t:T_Full");
-}
-
-void enumerateLink(Vaneth::CommonProvider& provider) {
-  enumerateOf(provider, "root/t:T_Link");
-}
-
-void modifyFull(Vaneth::CommonProvider& provider) {
-  RecordingHandler handler;
-  provider.modifyInstance(OperationContext(), pathOf("root/t:T_Full.Name=\"n 0\""),
-                          CIMInstance(CIMName("T_Full")), false, CIMPropertyList(), handler);
-}
-
-void invokeFull(Vaneth::CommonProvider& provider) {
-  RecordingHandler handler;
-  provider.invokeMethod(OperationContext(), pathOf("root/t:T_Full"), CIMName("Run"),
-                        Array<CIMParamValue>(), handler);
-}
-
-void namesOfItem(Vaneth::CommonProvider& provider) {
-  RecordingHandler handler;
-  provider.associatorNames(OperationContext(), pathOf("//h/root/t:T_Item.Name=\"a\""),
-                           CIMName("T_Link"), CIMName(), String(), String(), handler);
-}
-
 INSTANTIATE_TEST_SUITE_P(
     Operations, Log,
     testing::Values(
         LogCase{"Enumerate",
-                enumerateFull,
+                [](ProviderTest& test) { test.enumerate("root/t:T_Full"); },
                 {{8, "CommonProvider:enumerateInstances T_Full Entry\n"},
                  {8, "CommonProvider:ProviderDefClass found\n"},
                  {9, "CommonProvider: for each instance 0\n"},
@@ -111,7 +76,7 @@ INSTANTIATE_TEST_SUITE_P(
                  {9, "delever instances: root/t:T_Full.Name=\"n 0\"\n"},
                  {9, "CommonProvider:End of ProviderDefClass process\n"}}},
         LogCase{"Association",
-                enumerateLink,
+                [](ProviderTest& test) { test.enumerate("root/t:T_Link"); },
                 {{9, "CommonProvider:End of ProviderDefClass process\n"},
                  {9, "CommonProvider:ProviderDefAssociation found\n"},
                  {9, "Source Instances T_Item: 1\n"},
@@ -124,20 +89,22 @@ INSTANTIATE_TEST_SUITE_P(
                  {9, "delever instances: root/t:T_Link.Item="},
                  {9, "CommonProvider:End of ProviderDefAssociation process\n"}}},
         LogCase{"Modify",
-                modifyFull,
+                [](ProviderTest& test) { test.modify("root/t:T_Full.Name=\"n 0\"", {}); },
                 {{8, "CommonProvider:modifyInstances T_Full Entry\n"},
                  {9, "getClass - ns:root/t, classname:T_Full\n"},
                  {9, "number of properties is 3\n"},
                  {9, "CommonProvider: for each property 2\n"},
                  {9, "CommonProvider: ProviderDefProperty found Name\n"}}},
         LogCase{"Method",
-                invokeFull,
+                [](ProviderTest& test) { test.invoke("root/t:T_Full", "Run"); },
                 {{8, "CommonProvider:invokeMethod T_Full Entry\n"},
                  {8, "CommonProvider:ProviderDefClass found\n"},
                  {9, "getClass - ns:root/t, classname:T_Full\n"}}},
         LogCase{
             "Names",
-            namesOfItem,
+            [](ProviderTest& test) {
+              test.associatorNames("//h/root/t:T_Item.Name=\"a\"", "T_Link");
+            },
             {{7, "associatorNames : object: T_Item.Name=\"a\", association : T_Link, result : "},
              {8, "ProviderDefAssociation found\n"},
              {8, "Result class is : T_Volume"},
@@ -145,27 +112,24 @@ INSTANTIATE_TEST_SUITE_P(
              {7, "EnumerateInstances in associatorNames : object: T_Volume"},
              {8, "Target instances enumerated\n"},
              {8, "Number of associated instance is : 2\n"}}}),
-    kByName);
+    [](const auto& given) { return given.param.name; });
 
-using MapLog = Log;
+using MapLog = ProviderTest;
 
 TEST_F(MapLog, ValueMapNotesEachStep) {
-  LogLevel level(9);
   CIMProperty map = declared("Map", CIMTYPE_UINT8, Key::kUnqualified);
-  Array<String> texts;
-  texts.append(String("1"));
-  map.addQualifier(CIMQualifier(CIMName("ValueMap"), CIMValue(texts)));
-  map.addQualifier(CIMQualifier(CIMName("Values"), CIMValue(texts)));
+  for (const char* qualifier : {"ValueMap", "Values"}) {
+    map.addQualifier(CIMQualifier(CIMName(qualifier), CIMValue(Array<String>(1, String("1")))));
+  }
   CIMClass mapped = makeClass("T_Mapped", {map});
+  const std::string found = "Found valuemap property \nQualifier: ValueMap\nQualifier: Values\n";
+  const std::string map1 = "Found ValueMap Quarifier\n", values = "Found Values Quarifier\n";
+  LogLevel level(9);
   EXPECT_TRUE(Vaneth::valueMapText(mapped, "Map", 1).has_value());
-  EXPECT_EQ(tree.log(),
-            "Found valuemap property \nQualifier: ValueMap\nQualifier: Values\n"
-            "Found ValueMap Quarifier\nFound Value\nFound Values Quarifier\n");
+  EXPECT_EQ(tree.log(), found + map1 + "Found Value\n" + values);
   std::filesystem::remove(tree.logs() / "CommonProvider.log");
   EXPECT_TRUE(Vaneth::valueMapNumber(mapped, "Map", String("1")).has_value());
-  EXPECT_EQ(tree.log(),
-            "Found valuemap property \nQualifier: ValueMap\nQualifier: Values\n"
-            "Found Values Quarifier\nFound Value\nFound ValueMap Quarifier\n");
+  EXPECT_EQ(tree.log(), found + values + "Found Value\n" + map1);
 }
 
 }  // namespace

@@ -19,9 +19,6 @@
 using testing::ElementsAre;
 using testing::HasSubstr;
 
-/// Names the cases of a table by their `name`.
-inline constexpr auto kByName = [](const auto& given) { return given.param.name; };
-
 // Pieces of definition files.
 
 inline std::string call(const std::string& function, const std::string& type,
@@ -62,7 +59,7 @@ inline Pegasus::CIMObjectPath pathOf(const char* text) {
 
 /// A provider over the plug-in, a definition file and a host, made as a server makes it.
 class ProviderTest : public testing::Test {
- protected:
+ public:
   ProviderTest() {
     tree.addPlugin("test", PROVIDER_TEST_PLUGIN);
     Pegasus::setEmbeddedHost(&host);
@@ -72,9 +69,9 @@ class ProviderTest : public testing::Test {
   }
 
   ~ProviderTest() override {
-    if (provider != nullptr) provider->terminate();
+    if (provider != nullptr) stop();
     Pegasus::setEmbeddedHost(nullptr);
-    dlclose(plugin);
+    if (plugin != nullptr) dlclose(plugin);
   }
 
   void start(const std::string& body) {
@@ -82,6 +79,11 @@ class ProviderTest : public testing::Test {
     provider = dynamic_cast<Vaneth::CommonProvider*>(
         PegasusCreateProvider(Pegasus::String("CommonProvider")));
     provider->initialize(*handle);
+  }
+
+  void stop() {
+    provider->terminate();
+    provider = nullptr;
   }
 
   /// Puts another host behind the provider's handle.
@@ -95,6 +97,8 @@ class ProviderTest : public testing::Test {
     for (const char* text : texts) table.texts[table.count++] = text;
   }
 
+  // What each operation gives its handler.
+
   RecordingHandler enumerate(const char* path) {
     RecordingHandler handler;
     provider->enumerateInstances(context, pathOf(path), false, false, Pegasus::CIMPropertyList(),
@@ -102,10 +106,58 @@ class ProviderTest : public testing::Test {
     return handler;
   }
 
+  RecordingHandler instanceNames(const char* path) {
+    RecordingHandler handler;
+    provider->enumerateInstanceNames(context, pathOf(path), handler);
+    return handler;
+  }
+
   RecordingHandler get(const Pegasus::CIMObjectPath& path) {
     RecordingHandler handler;
     provider->getInstance(context, path, false, false, Pegasus::CIMPropertyList(), handler);
     return handler;
+  }
+
+  using Properties = std::initializer_list<std::pair<const char*, Pegasus::CIMValue>>;
+  std::vector<std::string> modify(const char* path, Properties properties) {
+    Pegasus::CIMInstance sent(pathOf(path).getClassName());
+    for (const auto& [name, value] : properties) {
+      sent.addProperty(Pegasus::CIMProperty(Pegasus::CIMName(name), value));
+    }
+    RecordingHandler handler;
+    provider->modifyInstance(context, pathOf(path), sent, true, Pegasus::CIMPropertyList(),
+                             handler);
+    return handler.events;
+  }
+
+  std::vector<std::string> invoke(const char* path, const char* method, Properties inputs = {}) {
+    Pegasus::Array<Pegasus::CIMParamValue> sent;
+    for (const auto& [name, value] : inputs) {
+      sent.append(Pegasus::CIMParamValue(Pegasus::String(name), value));
+    }
+    RecordingHandler handler;
+    provider->invokeMethod(context, pathOf(path), Pegasus::CIMName(method), sent, handler);
+    return handler.events;
+  }
+
+  /// Empty names stand for null ones.
+  std::vector<std::string> associatorNames(const char* object, const char* associationClass = "",
+                                           const char* resultClass = "") {
+    RecordingHandler handler;
+    provider->associatorNames(context, pathOf(object), nameOrNull(associationClass),
+                              nameOrNull(resultClass), Pegasus::String("role"),
+                              Pegasus::String("other"), handler);
+    return handler.events;
+  }
+
+  std::vector<std::string> associators(const char* object, const char* associationClass = "",
+                                       const char* resultClass = "") {
+    const Pegasus::CIMPropertyList nothing{Pegasus::Array<Pegasus::CIMName>()};
+    RecordingHandler handler;
+    provider->associators(context, pathOf(object), nameOrNull(associationClass),
+                          nameOrNull(resultClass), Pegasus::String(), Pegasus::String(), true, true,
+                          nothing, handler);
+    return handler.events;
   }
 
   TemporaryTree tree;
@@ -116,4 +168,9 @@ class ProviderTest : public testing::Test {
   TestPluginState* state = nullptr;
   Vaneth::CommonProvider* provider = nullptr;
   Pegasus::OperationContext context;
+
+ private:
+  static Pegasus::CIMName nameOrNull(const char* text) {
+    return *text == '\0' ? Pegasus::CIMName() : Pegasus::CIMName(text);
+  }
 };

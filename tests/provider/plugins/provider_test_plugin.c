@@ -2,6 +2,7 @@
 #include "provider_test_plugin.h"
 
 #include <commonprovider/plugin.h>
+#include <stdarg.h>
 #include <stdio.h>
 #include <string.h>
 
@@ -65,14 +66,13 @@ int texts(void* out, int index) {
   return cp_return_strings(out, state.left.texts, (size_t)state.left.count);
 }
 
-static void note(const char* text) {
-  strncat(state.record, text, sizeof state.record - strlen(state.record) - 1);
-}
-
-static void noteNumber(int value) {
-  char text[16];
-  snprintf(text, sizeof text, "%d", value);
-  note(text);
+/* Appends to the record, as printf does. */
+__attribute__((format(printf, 1, 2))) static void note(const char* format, ...) {
+  const size_t used = strlen(state.record);
+  va_list values;
+  va_start(values, format);
+  vsnprintf(state.record + used, sizeof state.record - used, format, values);
+  va_end(values);
 }
 
 static void noteItem(const cp_item* item);
@@ -81,7 +81,7 @@ static void noteItem(const cp_item* item);
 static void noteItems(cp_reader reader, const char* before) {
   cp_item item;
   while (cp_next(&reader, &item) == CP_OK) {
-    note(before);
+    note("%s", before);
     noteItem(&item);
     before = " ";
   }
@@ -89,11 +89,9 @@ static void noteItems(cp_reader reader, const char* before) {
 
 static void noteItem(const cp_item* item) {
   if (item->kind == CP_INT) {
-    noteNumber(item->number);
+    note("%d", item->number);
   } else if (item->kind == CP_STRING) {
-    note("'");
-    note(item->text);
-    note("'");
+    note("'%s'", item->text);
   } else {
     note("[");
     noteItems(item->elements, "");
@@ -101,49 +99,38 @@ static void noteItem(const cp_item* item) {
   }
 }
 
-/* The one item of a set function's buffer, behind which there is no end mark. */
-static void noteFirst(const void* in) {
-  cp_reader reader = cp_read(in);
-  cp_item item;
-  if (cp_next(&reader, &item) == CP_OK) noteItem(&item);
-}
-
-static int endLine(int index) {
-  note("@");
-  noteNumber(index);
-  note("\n");
+int setNumber(int value, int index) {
+  note("number %d@%d\n", value, index);
   return 0;
 }
 
-int setNumber(int value, int index) {
-  note("number ");
-  noteNumber(value);
-  return endLine(index);
+int setText(const char* value, int index) {
+  note("text '%s'@%d\n", value, index);
+  return 0;
 }
 
-int setText(const char* value, int index) {
-  note("text '");
-  note(value);
-  note("'");
-  return endLine(index);
+/* The one item of the buffer, behind which there is no end mark. */
+static int setItem(const char* name, const void* in, int index) {
+  cp_reader reader = cp_read(in);
+  cp_item item;
+  note("%s ", name);
+  if (cp_next(&reader, &item) == CP_OK) noteItem(&item);
+  note("@%d\n", index);
+  return 0;
 }
 
 int setNumbers(void* in, int index) {
-  note("numbers ");
-  noteFirst(in);
-  return endLine(index);
+  return setItem("numbers", in, index);
 }
 
 int setTexts(void* in, int index) {
-  note("texts ");
-  noteFirst(in);
-  return endLine(index);
+  return setItem("texts", in, index);
 }
 
 int run(void* in, void* out, int index) {
   note("run");
   noteItems(cp_read(in), " ");
+  note("@%d\n", index);
   memcpy(out, state.output, TEST_BUFFER);
-  endLine(index);
   return state.result;
 }

@@ -1,6 +1,4 @@
 /* A plug-in that keeps a number for each of three instances and tolerates any number of threads. */
-#include <stdio.h>
-
 #include "commonprovider/plugin.h"
 
 enum { kInstances = 3 };
@@ -17,16 +15,6 @@ int threads_init(void) {
 CP_FUNCTION(getI, threads_inits);
 int threads_inits(void) {
   return __atomic_load_n(&inits, __ATOMIC_SEQ_CST);
-}
-
-CP_FUNCTION(getI, threads_count);
-int threads_count(void) {
-  return kInstances;
-}
-
-CP_FUNCTION(getSi, threads_name);
-int threads_name(void* out, int index) {
-  return snprintf(out, 1024, "item %d", index);
 }
 
 CP_FUNCTION(getIi, threads_get);
