@@ -2,8 +2,6 @@
 
 #include "LinkTest.h"
 
-using namespace Pegasus;
-
 namespace {
 
 class AssociationInstances : public LinkTest {

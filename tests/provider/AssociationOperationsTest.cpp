@@ -2,8 +2,6 @@
 
 #include "LinkTest.h"
 
-using namespace Pegasus;
-
 namespace {
 
 class AssociationOperations : public LinkTest {
@@ -50,21 +48,14 @@ TEST_F(AssociationOperations, NamesOfTheLinked) {
 }
 
 TEST_F(AssociationOperations, UnmatchedClassesAreNotSupported) {
-  const char* kRequests[][3] = {{"root/t:T_Nothing", "", ""},
-                                {kItemA, "T_Nothing", ""},
-                                {kItemA, "T_Link", "T_Volume"},
-                                {kItemA, "T_Link", "T_Item"}};
-  for (const auto& request : kRequests) {
-    for (const bool objects : {false, true}) {
-      try {
-        objects ? associators(request[0], request[1], request[2])
-                : associatorNames(request[0], request[1], request[2]);
-        ADD_FAILURE() << request[0];
-      } catch (const CIMException& error) {
-        EXPECT_EQ(error.getCode(), CIM_ERR_NOT_SUPPORTED);
-        EXPECT_EQ(textOf(error.getMessage()), "CommonProvider::associatorNames");
-      }
-    }
+  const std::array<const char*, 3> kRequests[] = {{"root/t:T_Nothing", "", ""},
+                                                  {kItemA, "T_Nothing", ""},
+                                                  {kItemA, "T_Link", "T_Volume"},
+                                                  {kItemA, "T_Link", "T_Item"}};
+  const std::string text = "CommonProvider::associatorNames";
+  for (const auto& [object, association, result] : kRequests) {
+    EXPECT_EQ(refusal([&] { associatorNames(object, association, result); }), text) << object;
+    EXPECT_EQ(refusal([&] { associators(object, association, result); }), text) << object;
   }
 }
 

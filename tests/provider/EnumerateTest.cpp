@@ -5,8 +5,6 @@
 #include "ProviderTest.h"
 #include "engine/ProviderDefError.h"
 
-using namespace Pegasus;
-
 namespace {
 
 using Enumerate = ProviderTest;

@@ -2,8 +2,6 @@
 
 #include "ProviderTest.h"
 
-using namespace Pegasus;
-
 namespace {
 
 class GetInstance : public ProviderTest {

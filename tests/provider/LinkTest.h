@@ -33,15 +33,13 @@ class LinkTest : public ProviderTest {
   static std::string itemsAndVolumes() { return pairOf("T_Item", "Name", "T_Volume", "Owner"); }
 
   void addVolume(const char* id, const char* owner) {
-    Pegasus::CIMInstance volume(Pegasus::CIMName("T_Volume"));
-    volume.addProperty(
-        Pegasus::CIMProperty(Pegasus::CIMName("Owner"), Pegasus::CIMValue(Pegasus::String(owner))));
+    CIMInstance volume(CIMName("T_Volume"));
+    volume.addProperty(CIMProperty(CIMName("Owner"), String(owner)));
     volume.setPath(pathOf((std::string("T_Volume.Id=") + id).c_str()));
     host.add(volume);
   }
 
   void SetUp() override {
-    using namespace Pegasus;
     host.add(makeClass("T_Item", {declared("Name", CIMTYPE_STRING, Key::kYes)}));
     host.add(makeClass(
         "T_Part", {declared("Id", CIMTYPE_STRING, Key::kYes), declared("Owner", CIMTYPE_STRING)}));

@@ -3,8 +3,6 @@
 #include "LinkTest.h"
 #include "provider/ValueMap.h"
 
-using namespace Pegasus;
-
 namespace {
 
 struct Line {

@@ -5,8 +5,6 @@
 
 #include "ProviderTest.h"
 
-using namespace Pegasus;
-
 namespace {
 
 class Method : public ProviderTest {

@@ -3,8 +3,6 @@
 
 #include "ProviderTest.h"
 
-using namespace Pegasus;
-
 namespace {
 
 class Modify : public ProviderTest {

@@ -53,8 +53,19 @@ inline std::string definitionFile(const std::string& body) {
   return "<plugin><module name=\"test\" path=\"short\"/>" + body + "</plugin>";
 }
 
-inline Pegasus::CIMObjectPath pathOf(const char* text) {
-  return Pegasus::CIMObjectPath(Pegasus::String(text));
+inline CIMObjectPath pathOf(const char* text) {
+  return CIMObjectPath(String(text));
+}
+
+/// The message of the CIM_ERR_NOT_SUPPORTED that the operation throws.
+template <class Operation>
+std::string refusal(Operation operation) {
+  try {
+    operation();
+  } catch (const CIMException& error) {
+    if (error.getCode() == CIM_ERR_NOT_SUPPORTED) return textOf(error.getMessage());
+  }
+  return "none";
 }
 
 /// A provider over the plug-in, a definition file and a host, made as a server makes it.
@@ -62,7 +73,7 @@ class ProviderTest : public testing::Test {
  public:
   ProviderTest() {
     tree.addPlugin("test", PROVIDER_TEST_PLUGIN);
-    Pegasus::setEmbeddedHost(&host);
+    setEmbeddedHost(&host);
     handle.emplace();
     state = static_cast<TestPluginState*>(dlsym(plugin, "test_plugin_state"));
     *state = TestPluginState();
@@ -70,14 +81,14 @@ class ProviderTest : public testing::Test {
 
   ~ProviderTest() override {
     if (provider != nullptr) stop();
-    Pegasus::setEmbeddedHost(nullptr);
+    setEmbeddedHost(nullptr);
     if (plugin != nullptr) dlclose(plugin);
   }
 
   void start(const std::string& body) {
     TemporaryTree::write(tree.run() / "defs.xml", definitionFile(body));
-    provider = dynamic_cast<Vaneth::CommonProvider*>(
-        PegasusCreateProvider(Pegasus::String("CommonProvider")));
+    provider =
+        dynamic_cast<Vaneth::CommonProvider*>(PegasusCreateProvider(String("CommonProvider")));
     provider->initialize(*handle);
   }
 
@@ -88,8 +99,8 @@ class ProviderTest : public testing::Test {
 
   /// Puts another host behind the provider's handle.
   void use(TestHost& other) {
-    Pegasus::setEmbeddedHost(&other);
-    *handle = Pegasus::CIMOMHandle();
+    setEmbeddedHost(&other);
+    *handle = CIMOMHandle();
   }
 
   void setTable(TestTable& table, std::initializer_list<const char*> texts) {
@@ -101,8 +112,7 @@ class ProviderTest : public testing::Test {
 
   RecordingHandler enumerate(const char* path) {
     RecordingHandler handler;
-    provider->enumerateInstances(context, pathOf(path), false, false, Pegasus::CIMPropertyList(),
-                                 handler);
+    provider->enumerateInstances(context, pathOf(path), false, false, CIMPropertyList(), handler);
     return handler;
   }
 
@@ -112,31 +122,30 @@ class ProviderTest : public testing::Test {
     return handler;
   }
 
-  RecordingHandler get(const Pegasus::CIMObjectPath& path) {
+  RecordingHandler get(const CIMObjectPath& path) {
     RecordingHandler handler;
-    provider->getInstance(context, path, false, false, Pegasus::CIMPropertyList(), handler);
+    provider->getInstance(context, path, false, false, CIMPropertyList(), handler);
     return handler;
   }
 
-  using Properties = std::initializer_list<std::pair<const char*, Pegasus::CIMValue>>;
+  using Properties = std::initializer_list<std::pair<const char*, CIMValue>>;
   std::vector<std::string> modify(const char* path, Properties properties) {
-    Pegasus::CIMInstance sent(pathOf(path).getClassName());
+    CIMInstance sent(pathOf(path).getClassName());
     for (const auto& [name, value] : properties) {
-      sent.addProperty(Pegasus::CIMProperty(Pegasus::CIMName(name), value));
+      sent.addProperty(CIMProperty(CIMName(name), value));
     }
     RecordingHandler handler;
-    provider->modifyInstance(context, pathOf(path), sent, true, Pegasus::CIMPropertyList(),
-                             handler);
+    provider->modifyInstance(context, pathOf(path), sent, true, CIMPropertyList(), handler);
     return handler.events;
   }
 
   std::vector<std::string> invoke(const char* path, const char* method, Properties inputs = {}) {
-    Pegasus::Array<Pegasus::CIMParamValue> sent;
+    Array<Pegasus::CIMParamValue> sent;
     for (const auto& [name, value] : inputs) {
-      sent.append(Pegasus::CIMParamValue(Pegasus::String(name), value));
+      sent.append(CIMParamValue(String(name), value));
     }
     RecordingHandler handler;
-    provider->invokeMethod(context, pathOf(path), Pegasus::CIMName(method), sent, handler);
+    provider->invokeMethod(context, pathOf(path), CIMName(method), sent, handler);
     return handler.events;
   }
 
@@ -145,18 +154,17 @@ class ProviderTest : public testing::Test {
                                            const char* resultClass = "") {
     RecordingHandler handler;
     provider->associatorNames(context, pathOf(object), nameOrNull(associationClass),
-                              nameOrNull(resultClass), Pegasus::String("role"),
-                              Pegasus::String("other"), handler);
+                              nameOrNull(resultClass), String("role"), String("other"), handler);
     return handler.events;
   }
 
   std::vector<std::string> associators(const char* object, const char* associationClass = "",
                                        const char* resultClass = "") {
-    const Pegasus::CIMPropertyList nothing{Pegasus::Array<Pegasus::CIMName>()};
+    const CIMPropertyList nothing{Array<Pegasus::CIMName>()};
     RecordingHandler handler;
     provider->associators(context, pathOf(object), nameOrNull(associationClass),
-                          nameOrNull(resultClass), Pegasus::String(), Pegasus::String(), true, true,
-                          nothing, handler);
+                          nameOrNull(resultClass), String(), String(), true, true, nothing,
+                          handler);
     return handler.events;
   }
 
@@ -167,10 +175,8 @@ class ProviderTest : public testing::Test {
   void* plugin = dlopen(PROVIDER_TEST_PLUGIN, RTLD_NOW);
   TestPluginState* state = nullptr;
   Vaneth::CommonProvider* provider = nullptr;
-  Pegasus::OperationContext context;
+  OperationContext context;
 
  private:
-  static Pegasus::CIMName nameOrNull(const char* text) {
-    return *text == '\0' ? Pegasus::CIMName() : Pegasus::CIMName(text);
-  }
+  static CIMName nameOrNull(const char* text) { return *text == '\0' ? CIMName() : CIMName(text); }
 };

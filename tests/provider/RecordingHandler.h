@@ -8,33 +8,31 @@
 #include "conversion/CimText.h"
 
 /// Notes every call that an operation makes on its handler, in order.
-class RecordingHandler : public Pegasus::InstanceResponseHandler,
-                         public Pegasus::ObjectPathResponseHandler,
-                         public Pegasus::ObjectResponseHandler,
-                         public Pegasus::MethodResultResponseHandler {
+class RecordingHandler : public InstanceResponseHandler,
+                         public ObjectPathResponseHandler,
+                         public ObjectResponseHandler,
+                         public MethodResultResponseHandler {
  public:
   void processing() override { events.push_back("processing"); }
   void complete() override { events.push_back("complete"); }
 
-  void deliver(const Pegasus::CIMInstance& instance) override {
+  void deliver(const CIMInstance& instance) override {
     instances.append(instance);
     events.push_back(textOf(instance));
   }
-  void deliver(const Pegasus::CIMObjectPath& path) override { events.push_back(textOf(path)); }
-  void deliver(const Pegasus::CIMObject& object) override {
-    events.push_back("object " + textOf(Pegasus::CIMInstance(object)));
+  void deliver(const CIMObjectPath& path) override { events.push_back(textOf(path)); }
+  void deliver(const CIMObject& object) override {
+    events.push_back("object " + textOf(CIMInstance(object)));
   }
-  void deliver(const Pegasus::CIMValue& value) override {
-    events.push_back("returns " + textOf(value));
-  }
-  void deliver(const Pegasus::Array<Pegasus::CIMInstance>&) override { unexpected(); }
-  void deliver(const Pegasus::Array<Pegasus::CIMObjectPath>&) override { unexpected(); }
-  void deliver(const Pegasus::Array<Pegasus::CIMObject>&) override { unexpected(); }
+  void deliver(const CIMValue& value) override { events.push_back("returns " + textOf(value)); }
+  void deliver(const Array<Pegasus::CIMInstance>&) override { unexpected(); }
+  void deliver(const Array<Pegasus::CIMObjectPath>&) override { unexpected(); }
+  void deliver(const Array<Pegasus::CIMObject>&) override { unexpected(); }
 
-  void deliverParamValue(const Pegasus::CIMParamValue&) override { unexpected(); }
-  void deliverParamValue(const Pegasus::Array<Pegasus::CIMParamValue>& values) override {
+  void deliverParamValue(const CIMParamValue&) override { unexpected(); }
+  void deliverParamValue(const Array<Pegasus::CIMParamValue>& values) override {
     std::string text = "out";
-    for (Pegasus::Uint32 i = 0; i < values.size(); ++i) {
+    for (Uint32 i = 0; i < values.size(); ++i) {
       text += " " + textOf(values[i].getParameterName()) + "=(" + textOf(values[i].getValue()) +
               ")" + (values[i].isTyped() ? "" : " untyped");
     }
@@ -42,7 +40,7 @@ class RecordingHandler : public Pegasus::InstanceResponseHandler,
   }
 
   std::vector<std::string> events;
-  Pegasus::Array<Pegasus::CIMInstance> instances;
+  Array<Pegasus::CIMInstance> instances;
 
  private:
   void unexpected() { events.push_back("unexpected delivery"); }

@@ -14,10 +14,10 @@
 #include "conversion/MakeClass.h"
 
 /// A CIM host of hand-built classes and foreign instances, which notes the calls that reach it.
-class TestHost : public Pegasus::CIMOMHandleRep {
+class TestHost : public CIMOMHandleRep {
  public:
-  void add(const Pegasus::CIMClass& cimClass) { classes_.push_back(cimClass); }
-  void add(const Pegasus::CIMInstance& foreign) { foreign_.push_back(foreign); }
+  void add(const CIMClass& cimClass) { classes_.push_back(cimClass); }
+  void add(const CIMInstance& foreign) { foreign_.push_back(foreign); }
 
   /// "getClass root/t T_Item 0 1 1 null": the flags in the order of the arguments, then the list.
   std::vector<std::string> calls;
@@ -25,44 +25,40 @@ class TestHost : public Pegasus::CIMOMHandleRep {
   /// After this many calls no class is found any more.
   size_t callLimit = SIZE_MAX;
 
-  Pegasus::CIMClass getClass(const Pegasus::OperationContext&,
-                             const Pegasus::CIMNamespaceName& nameSpace,
-                             const Pegasus::CIMName& className, Pegasus::Boolean localOnly,
-                             Pegasus::Boolean includeQualifiers,
-                             Pegasus::Boolean includeClassOrigin,
-                             const Pegasus::CIMPropertyList& propertyList) override {
+  CIMClass getClass(const OperationContext&, const CIMNamespaceName& nameSpace,
+                    const CIMName& className, Boolean localOnly, Boolean includeQualifiers,
+                    Boolean includeClassOrigin, const CIMPropertyList& propertyList) override {
     const size_t made = note("getClass", nameSpace, textOf(className.getString()),
                              {localOnly, includeQualifiers, includeClassOrigin}, propertyList);
-    for (const Pegasus::CIMClass& cimClass : classes_) {
+    for (const CIMClass& cimClass : classes_) {
       if (made > callLimit) break;
       if (cimClass.getClassName() == className) return cimClass.clone();
     }
-    throw Pegasus::CIMException(Pegasus::CIM_ERR_NOT_FOUND, className.getString());
+    throw CIMException(CIM_ERR_NOT_FOUND, className.getString());
   }
 
-  Pegasus::CIMInstance getInstance(const Pegasus::OperationContext&,
-                                   const Pegasus::CIMNamespaceName& nameSpace,
-                                   const Pegasus::CIMObjectPath& path, Pegasus::Boolean localOnly,
-                                   Pegasus::Boolean includeQualifiers,
-                                   Pegasus::Boolean includeClassOrigin,
-                                   const Pegasus::CIMPropertyList& propertyList) override {
+  CIMInstance getInstance(const OperationContext&, const CIMNamespaceName& nameSpace,
+                          const CIMObjectPath& path, Boolean localOnly, Boolean includeQualifiers,
+                          Boolean includeClassOrigin,
+                          const CIMPropertyList& propertyList) override {
     note("getInstance", nameSpace, textOf(path), {localOnly, includeQualifiers, includeClassOrigin},
          propertyList);
-    for (const Pegasus::CIMInstance& instance : foreign_) {
+    for (const CIMInstance& instance : foreign_) {
       if (instance.getPath() == path) return instance.clone();
     }
-    throw Pegasus::CIMException(Pegasus::CIM_ERR_NOT_FOUND, path.toString());
+    throw CIMException(CIM_ERR_NOT_FOUND, path.toString());
   }
 
-  Pegasus::Array<Pegasus::CIMInstance> enumerateInstances(
-      const Pegasus::OperationContext&, const Pegasus::CIMNamespaceName& nameSpace,
-      const Pegasus::CIMName& className, Pegasus::Boolean deepInheritance,
-      Pegasus::Boolean localOnly, Pegasus::Boolean includeQualifiers,
-      Pegasus::Boolean includeClassOrigin, const Pegasus::CIMPropertyList& propertyList) override {
+  Array<Pegasus::CIMInstance> enumerateInstances(const OperationContext&,
+                                                 const CIMNamespaceName& nameSpace,
+                                                 const CIMName& className, Boolean deepInheritance,
+                                                 Boolean localOnly, Boolean includeQualifiers,
+                                                 Boolean includeClassOrigin,
+                                                 const CIMPropertyList& propertyList) override {
     note("enumerateInstances", nameSpace, textOf(className.getString()),
          {deepInheritance, localOnly, includeQualifiers, includeClassOrigin}, propertyList);
-    Pegasus::Array<Pegasus::CIMInstance> found;
-    for (const Pegasus::CIMInstance& instance : foreign_) {
+    Array<Pegasus::CIMInstance> found;
+    for (const CIMInstance& instance : foreign_) {
       if (instance.getClassName() == className) found.append(instance.clone());
     }
     return found;
@@ -70,11 +66,10 @@ class TestHost : public Pegasus::CIMOMHandleRep {
 
  private:
   /// Gives how many calls there are now.
-  size_t note(const char* operation, const Pegasus::CIMNamespaceName& nameSpace,
-              const std::string& object, std::initializer_list<Pegasus::Boolean> flags,
-              const Pegasus::CIMPropertyList& propertyList) {
+  size_t note(const char* operation, const CIMNamespaceName& nameSpace, const std::string& object,
+              std::initializer_list<Pegasus::Boolean> flags, const CIMPropertyList& propertyList) {
     std::string call = std::string(operation) + " " + textOf(nameSpace.getString()) + " " + object;
-    for (const Pegasus::Boolean flag : flags) call += flag ? " 1" : " 0";
+    for (const Boolean flag : flags) call += flag ? " 1" : " 0";
     const std::lock_guard<std::mutex> lock(mutex_);
     calls.push_back(call + (propertyList.isNull() ? " null" : " list"));
     return calls.size();

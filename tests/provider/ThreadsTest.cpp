@@ -5,8 +5,6 @@
 
 #include "LinkTest.h"
 
-using namespace Pegasus;
-
 namespace {
 
 /// Three items with a number that clients set and a method, over a plug-in that nobody has opened.

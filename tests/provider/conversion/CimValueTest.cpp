@@ -7,8 +7,6 @@
 #include "CimText.h"
 #include "provider/CimConversion.h"
 
-using namespace Pegasus;
-
 namespace {
 
 using Numbers = std::vector<int>;

@@ -11,8 +11,6 @@
 #include "tests/engine/ValueText.h"
 #include "tests/support/LogLevel.h"
 
-using namespace Pegasus;
-
 namespace {
 
 template <class T>
@@ -26,14 +24,9 @@ TEST(PropertyValue, IsReadByItsType) {
   const String date("20260101120000.000000-000");
   const std::pair<CIMValue, const char*> cases[] = {
       {CIMValue(Boolean(true)), "0 1"},
-      {CIMValue(Uint8(255)), "0 255"},
       {CIMValue(Sint8(-128)), "0 -128"},
-      {CIMValue(Uint16(65535)), "0 65535"},
-      {CIMValue(Sint16(-32768)), "0 -32768"},
       {CIMValue(Uint32(4294967295u)), "0 -1"},
-      {CIMValue(Sint32(-5)), "0 -5"},
       {CIMValue(Uint64(0x100000005ull)), "0 5"},
-      {CIMValue(Uint64(0x100000000ull)), "0 0"},
       {CIMValue(Uint64(0x80000000ull)), "0 -2147483648"},
       {CIMValue(Sint64(-1)), "0 -1"},
       {CIMValue(Real32(2.9f)), "0 2"},
@@ -46,19 +39,14 @@ TEST(PropertyValue, IsReadByItsType) {
       {CIMValue(CIMDateTime(date)), "1 20260101120000.000000+000"},
       {CIMValue(CIMObjectPath(String("root/t:B.z=1,a=\"x\""))), "1 root/t:B.a=\"x\",z=1"},
       {arrayValue<Boolean>({true, false}), "2 {1, 0}"},
-      {arrayValue<Uint8>({0, 255}), "2 {0, 255}"},
       {arrayValue<Uint32>({4294967295u, 1}), "2 {-1, 1}"},
       {arrayValue<Sint32>({}), "2 {}"},
-      {arrayValue<Uint64>({0x100000005ull}), "2 {5}"},
       {arrayValue<Real32>({2.9f, -2.9f}), "2 {2, -2}"},
-      {arrayValue<Real64>({1e300}), "2 {2147483647}"},
-      {arrayValue<Char16>({Char16(65)}), "2 {65}"},
       {arrayValue<String>({String("a b"), String(), String("c")}), "3 {a b, , c}"},
       {arrayValue<CIMDateTime>({CIMDateTime(date)}), "3 {20260101120000.000000+000}"},
       {arrayValue<CIMObjectPath>({CIMObjectPath(String("A.k=1")), CIMObjectPath(String("x:B"))}),
        "3 {A.k=1, x:B}"},
       // Null is zero or empty.
-      {CIMValue(CIMTYPE_BOOLEAN, false), "0 0"},
       {CIMValue(CIMTYPE_REAL64, false), "0 0"},
       {CIMValue(CIMTYPE_STRING, false), "1 "},
       {CIMValue(CIMTYPE_DATETIME, false), "1 00000000000000.000000:000"},

@@ -7,8 +7,6 @@
 #include "CimText.h"
 #include "MakeClass.h"
 
-using namespace Pegasus;
-
 namespace {
 
 using Texts = std::vector<const char*>;
