@@ -117,22 +117,6 @@ static FILE* open_place(const void* arg, const char* mode) {
   return fopen(file, mode);
 }
 
-int storedNumber(void* arg) {
-  FILE* file = open_place(arg, "r");
-  int value = -1;
-  if (file == NULL) return value;
-  if (fscanf(file, "%d", &value) != 1) value = -2;
-  fclose(file);
-  return value;
-}
-
-int storeNumber(int value, void* arg) {
-  FILE* file = open_place(arg, "w");
-  if (file == NULL) return 1;
-  fprintf(file, "%d\n", value);
-  return fclose(file);
-}
-
 /* Up to `capacity` lines, in `text` one after the other. */
 static size_t read_lines(void* arg, char* text, size_t size, const char** lines, size_t capacity) {
   FILE* file = open_place(arg, "r");
@@ -149,18 +133,18 @@ static size_t read_lines(void* arg, char* text, size_t size, const char** lines,
   return count;
 }
 
+int storedNumber(void* arg) {
+  char text[CP_BUFFER_SIZE];
+  const char* line = "-1";
+  read_lines(arg, text, sizeof text, &line, 1);
+  return atoi(line);
+}
+
 int storedText(void* out, void* arg) {
   char text[CP_BUFFER_SIZE];
   const char* line = "20260131120000.123456+060";
   read_lines(arg, text, sizeof text, &line, 1);
   return cp_return_string(out, line);
-}
-
-int storeText(const char* value, void* arg) {
-  FILE* file = open_place(arg, "w");
-  if (file == NULL) return 1;
-  fprintf(file, "%s\n", value);
-  return fclose(file);
 }
 
 int storedNumbers(void* out, void* arg) {
@@ -173,18 +157,6 @@ int storedNumbers(void* out, void* arg) {
   return cp_return_ints(out, numbers, count);
 }
 
-int storeNumbers(void* in, void* arg) {
-  FILE* file = open_place(arg, "w");
-  cp_reader reader = cp_read(in);
-  int numbers[kMax];
-  size_t count = 0;
-  size_t i;
-  if (file == NULL) return 1;
-  if (cp_next_ints(&reader, numbers, kMax, &count) != CP_OK) count = 0;
-  for (i = 0; i < count; ++i) fprintf(file, "%d\n", numbers[i]);
-  return fclose(file);
-}
-
 int storedTexts(void* out, void* arg) {
   char text[CP_BUFFER_SIZE];
   const char* lines[kMax];
@@ -192,16 +164,42 @@ int storedTexts(void* out, void* arg) {
   return cp_return_strings(out, lines, count);
 }
 
-int storeTexts(void* in, void* arg) {
+int storeNumber(int value, void* arg) {
+  char text[16];
+  snprintf(text, sizeof text, "%d", value);
+  return storeText(text, arg);
+}
+
+int storeText(const char* value, void* arg) {
+  FILE* file = open_place(arg, "w");
+  if (file == NULL) return 1;
+  fprintf(file, "%s\n", value);
+  return fclose(file);
+}
+
+static int store_elements(void* in, void* arg) {
   FILE* file = open_place(arg, "w");
   cp_reader reader = cp_read(in);
-  cp_item item;
-  cp_item text;
+  cp_item array;
+  cp_item element;
   if (file == NULL) return 1;
-  if (cp_next(&reader, &item) == CP_OK) {
-    while (cp_next(&item.elements, &text) == CP_OK) fprintf(file, "%s\n", text.text);
+  if (cp_next(&reader, &array) != CP_OK) return fclose(file);
+  while (cp_next(&array.elements, &element) == CP_OK) {
+    if (element.kind == CP_INT) {
+      fprintf(file, "%d\n", element.number);
+    } else {
+      fprintf(file, "%s\n", element.text);
+    }
   }
   return fclose(file);
+}
+
+int storeNumbers(void* in, void* arg) {
+  return store_elements(in, arg);
+}
+
+int storeTexts(void* in, void* arg) {
+  return store_elements(in, arg);
 }
 
 static int copy_item(cp_writer* to, cp_item* item) {

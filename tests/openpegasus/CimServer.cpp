@@ -1,11 +1,5 @@
 #include "CimServer.h"
 
-#include <signal.h>
-#include <sys/prctl.h>
-
-#include <chrono>
-#include <thread>
-
 #include "tests/cimhost/http/HttpClient.h"
 #include "tests/support/TemporaryTree.h"
 
@@ -31,16 +25,6 @@ bool answers(int port) {
   return HttpClient(static_cast<std::uint16_t>(port)).isConnected();
 }
 
-// Asks every tenth of a second, up to `tenths` times.
-template <class Condition>
-bool waitUntil(int tenths, Condition condition) {
-  for (int i = 0; i < tenths; ++i) {
-    if (condition()) return true;
-    std::this_thread::sleep_for(std::chrono::milliseconds(100));
-  }
-  return false;
-}
-
 }  // namespace
 
 std::string CimServer::whyUnavailable() {
@@ -59,7 +43,7 @@ CimServer::CimServer(const fs::path& root, Providers providers)
 }
 
 CimServer::~CimServer() {
-  if (process_ > 0) stop();
+  if (server_->isRunning()) stop();
 }
 
 void CimServer::layOut() const {
@@ -90,37 +74,19 @@ void CimServer::start() {
                {"daemon=false", "enableHttpConnection=true", "enableHttpsConnection=false",
                 "enableAuthentication=false", "httpPort=" + std::to_string(port_),
                 std::string("forceProviderProcesses=") + agents});
-  std::vector<char*> argv;
-  for (std::string& word : words) argv.push_back(word.data());
-  argv.push_back(nullptr);
-  const std::string run = (root_ / "run").string();
   const std::string log = (root_ / "server.log").string();
-  process_ = fork();
-  if (process_ == 0) {
-    prctl(PR_SET_PDEATHSIG, SIGTERM);
-    const int output = open(log.c_str(), O_WRONLY | O_CREAT | O_APPEND, 0600);
-    if (chdir(run.c_str()) == 0 && dup2(output, 1) == 1 && dup2(output, 2) == 2) {
-      execv(argv[0], argv.data());
-    }
-    _exit(127);
-  }
-  const bool ready =
-      waitUntil(300, [this] { return answers(port_) || waitpid(process_, nullptr, WNOHANG) != 0; });
-  if (!ready || !answers(port_)) {
+  const int output = open(log.c_str(), O_WRONLY | O_CREAT | O_APPEND | O_CLOEXEC, 0600);
+  server_ = std::make_unique<ServerProcess>(words, (root_ / "run").string(), output, output);
+  close(output);
+  ServerProcess::waitUntil([this] { return answers(port_) || !server_->isRunning(); });
+  if (!answers(port_)) {
     throw std::runtime_error("the server did not start: " + TemporaryTree::read(log));
   }
 }
 
 bool CimServer::stop() {
   run("cimserver", {"-s"});
-  int status = -1;
-  bool ended = waitUntil(300, [&] { return waitpid(process_, &status, WNOHANG) == process_; });
-  if (!ended) {
-    kill(process_, SIGKILL);
-    waitpid(process_, &status, 0);
-  }
-  process_ = -1;
-  return ended && WIFEXITED(status) && WEXITSTATUS(status) == 0;
+  return server_->wait() == 0;
 }
 
 ProgramResult CimServer::run(const std::string& program,
@@ -128,8 +94,7 @@ ProgramResult CimServer::run(const std::string& program,
   std::vector<std::string> words = environment();
   words.insert(words.end(),
                {"timeout", "-k", "5", "60", (root_ / "pegasus/bin" / program).string()});
-  words.insert(words.end(), arguments.begin(), arguments.end());
-  return runProgram(words);
+  return runProgram(words, arguments);
 }
 
 void CimServer::mustRun(const std::string& program,

@@ -1,12 +1,12 @@
 #pragma once
 
-#include <sys/types.h>
-
 #include <filesystem>
+#include <memory>
 #include <string>
 #include <vector>
 
 #include "tests/support/RunProgram.h"
+#include "tests/support/ServerProcess.h"
 
 /// An installed OpenPegasus server with a repository, configuration and provider of its own, in a
 /// directory of its own, on a free port of the loopback interface.
@@ -32,7 +32,7 @@ class CimServer {
   void start();
   /// As an administrator stops it. True when the process ended by itself with code 0.
   bool stop();
-  pid_t process() const { return process_; }
+  pid_t process() const { return server_->id(); }
   int port() const { return port_; }
   std::filesystem::path home() const { return root_; }
 
@@ -48,5 +48,5 @@ class CimServer {
   std::filesystem::path root_;
   Providers providers_;
   int port_ = 0;
-  pid_t process_ = -1;
+  std::unique_ptr<ServerProcess> server_;
 };

@@ -57,9 +57,8 @@ void Deployment::declareAndRegister() {
   server_->mustRun("cimmof", {"-n", "root/PG_InterOp", registration});
 }
 
-ProgramResult Deployment::cimhost(std::vector<std::string> arguments) const {
-  arguments.insert(arguments.begin(), {CIMHOST, "--home", cimhostHome().string()});
-  return runProgram(arguments);
+ProgramResult Deployment::cimhost(const std::vector<std::string>& arguments) const {
+  return runProgram({CIMHOST, "--home", cimhostHome().string()}, arguments);
 }
 
 ProgramResult Deployment::cimcli(std::vector<std::string> arguments) const {

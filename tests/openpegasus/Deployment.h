@@ -19,7 +19,7 @@ class Deployment {
   CimServer& server() { return *server_; }
 
   /// A one-shot command of cimhost.
-  ProgramResult cimhost(std::vector<std::string> arguments) const;
+  ProgramResult cimhost(const std::vector<std::string>& arguments) const;
   /// A command of the server's client, in the namespace of the classes.
   ProgramResult cimcli(std::vector<std::string> arguments) const;
 

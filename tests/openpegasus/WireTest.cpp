@@ -41,11 +41,10 @@ class Wire : public WithServer<testing::TestWithParam<RequestCase>> {
 
   static ProgramResult ask(int port) {
     const auto& [name, command, path, values] = GetParam();
-    std::vector<std::string> words = {"/usr/bin/timeout", "60", "/usr/bin/wbemcli", command,
-                                      "http://localhost:" + std::to_string(port) + "/root/compare" +
-                                          (path.empty() ? "" : ":" + path)};
-    words.insert(words.end(), values.begin(), values.end());
-    return runProgram(words);
+    const std::string address = "http://localhost:" + std::to_string(port) + "/root/compare";
+    return runProgram({"/usr/bin/timeout", "60", "/usr/bin/wbemcli", command,
+                       address + (path.empty() ? "" : ":" + path)},
+                      values);
   }
 
   static std::unique_ptr<CimhostServer> host_;
