@@ -125,12 +125,8 @@ class HostTest : public testing::Test {
 
 TEST_F(HostTest, AnUnusableHomeIsNamed) {
   fs::remove(home_ / "run");
-  try {
-    const Host host(home_.string());
-    FAIL();
-  } catch (const HostError& error) {
-    EXPECT_THAT(error.what(), HasSubstr("/run: No such file or directory"));
-  }
+  shell("check 2>&1 | grep -q '/run: No such file or directory'");
+  EXPECT_EQ(status_, 0);
   EXPECT_THROW(Host("/no/such/home"), HostError);
 }
 
@@ -156,30 +152,33 @@ TEST_F(HostTest, EveryProblemIsReportedAndTheRestServes) {
   EXPECT_THAT(error_.str(), HasSubstr("bad.mof:2:9"));
 }
 
-TEST_F(HostTest, DefinitionsAndDeclarationsThatDoNotFitAreToldApart) {
-  write("mof/root/test/classes.mof",
-        "class A { [Key] string Name; [Key(false)] string Good; string Bad; "
-        "[Key(false)] A ref Link; };");
+TEST_F(HostTest, DefinitionsThatDoNotFitAreToldApart) {
+  write(
+      "mof/root/test/classes.mof",
+      "class A { [Key] string Name; [Key(false)] string Good; string Bad; [Key(false)] A ref Link; "
+      "};");
   std::string text;
   for (const char* name : {"Name", "good", "Bad", "Undeclared", "1x", "Link"}) {
     text += std::string("<property name=\"") + name +
             "\"><get><constant type=\"string\">v</constant></get></property>";
   }
-  write("run/a.xml", plugin(definitionOf("A", text)));
-  const auto warning = [](const char* property, const char* problem) {
-    return std::string("run/a.xml: warning: property ") + property + " of class A is " + problem;
-  };
-  EXPECT_THAT(
-      diagnostics(),
-      ElementsAre(warning("good", "declared as Good: letter case differs; it is left out"),
-                  warning("Bad",
-                          "declared without [Key] or [Key(false)]; the provider delivers no "
-                          "instance of the class"),
-                  warning("Undeclared", "defined, but not declared; it is left out"),
-                  warning("1x", "defined, but not declared; it is left out"),
-                  warning("Link",
-                          "a reference in a class that is no association; OpenPegasus "
-                          "refuses the declaration")));
+  const std::string association =
+      "<association name=\"A\" namespace2=\"root/test\" propertyname1=\"x\" propertyname2=\"y\">"
+      "<classname name=\"A\"/><classname name=\"A\"/><condition><true/></condition></association>";
+  write("run/a.xml", plugin(definitionOf("A", text) + definitionOf("a") + association));
+  std::vector<std::string> warnings = {
+      "property good of class A is declared as Good: letter case differs; it is left out",
+      "property Bad of class A is declared without [Key] or [Key(false)]; the provider delivers no "
+      "instance of the class",
+      "property Undeclared of class A is defined, but not declared; it is left out",
+      "property 1x of class A is defined, but not declared; it is left out",
+      "property Link of class A is a reference in a class that is no association; OpenPegasus "
+      "refuses the declaration",
+      "class a is already defined in run/a.xml, which serves it in every namespace",
+      "class A is defined as a class and as an association; clients see only the instances of the "
+      "association"};
+  for (std::string& each : warnings) each.insert(0, "run/a.xml: warning: ");
+  EXPECT_EQ(diagnostics(), warnings);
 }
 
 TEST_F(HostTest, PluginsThatCannotBeCalledAreToldWithoutLoadingThem) {
@@ -225,28 +224,15 @@ TEST_F(HostTest, PluginsThatCannotBeCalledAreToldWithoutLoadingThem) {
   EXPECT_THAT(diagnostics(), testing::UnorderedElementsAreArray(warnings));
 }
 
-TEST_F(HostTest, DefinitionsOfOneNameAreTold) {
-  write("mof/root/test/classes.mof", "class A { [Key] string Name; };");
-  const std::string association =
-      "<association name=\"A\" namespace2=\"root/test\" propertyname1=\"x\" propertyname2=\"y\">"
-      "<classname name=\"A\"/><classname name=\"A\"/><condition><true/></condition></association>";
-  write("run/a.xml", plugin(definitionOf("A") + definitionOf("a") + association));
-  EXPECT_THAT(diagnostics(),
-              ElementsAre("run/a.xml: warning: class a is already defined in run/a.xml, which "
-                          "serves it in every namespace",
-                          "run/a.xml: warning: class A is defined as a class and as an "
-                          "association; clients see only the instances of the association"));
-}
-
 TEST_F(HostTest, OddFilesDoNotHangTheCheck) {
-  writeGoodFiles();
   fs::create_directory(home_ / "run/folder.xml");
   ASSERT_EQ(mkfifo((home_ / "logs/CommonProvider.ini").c_str(), 0600), 0);
   ASSERT_EQ(mkfifo((home_ / "run/pipe.xml").c_str(), 0600), 0);
   EXPECT_EQ(run("check"), ExitCode::kProblems);
-  EXPECT_THAT(out_.str(), HasSubstr("logs/CommonProvider.ini: error: not a regular file"));
-  EXPECT_THAT(out_.str(), HasSubstr("run/folder.xml: error: "));
-  EXPECT_THAT(out_.str(), HasSubstr("run/pipe.xml: error: "));
+  for (const char* problem : {"logs/CommonProvider.ini: error: not a regular file",
+                              "run/folder.xml: error: ", "run/pipe.xml: error: "}) {
+    EXPECT_THAT(out_.str(), HasSubstr(problem));
+  }
 }
 
 TEST_F(HostTest, CommandsPrintWhatAClientGets) {
@@ -267,16 +253,6 @@ TEST_F(HostTest, CommandsPrintWhatAClientGets) {
   const std::string name = user != nullptr ? user->pw_name : std::to_string(geteuid());
   EXPECT_EQ(run("enumerate root/test:Test_User --property Name"), 0) << error_.str();
   EXPECT_THAT(out_.str(), testing::EndsWith("\n" + name + "\n"));
-}
-
-TEST_F(HostTest, DeclarationsPrintedAsMofCanBeReadAgain) {
-  writeGoodFiles();
-  ASSERT_EQ(run("classes root/test --format mof"), ExitCode::kOk);
-  const std::string printed = out_.str();
-  write("mof/root/test/classes.mof", printed);
-  EXPECT_THAT(diagnostics(), testing::IsEmpty());
-  ASSERT_EQ(run("classes root/test --format mof"), ExitCode::kOk);
-  EXPECT_EQ(out_.str(), printed);
 }
 
 TEST_F(HostTest, FailedOperationsGiveTheirStatusCode) {
@@ -329,14 +305,6 @@ TEST_F(HostTest, AssociationsAreFollowed) {
   EXPECT_THAT(out_.str(), HasSubstr("Test_Disk|Link_Port|||"));
 }
 
-constexpr const char* kServerClasses =
-    "class PG_ProviderModule { [Key] string Name; string Vendor; string Version; "
-    "string InterfaceType; string InterfaceVersion; string Location; };\n"
-    "class PG_Provider { [Key] string ProviderModuleName; [Key] string Name; };\n"
-    "class PG_ProviderCapabilities { [Key] string ProviderModuleName; [Key] string ProviderName; "
-    "[Key] string CapabilityID; string ClassName; string Namespaces[]; uint16 ProviderType[]; "
-    "string SupportedProperties[]; string SupportedMethods[]; };\n";
-
 constexpr const char* kRegistration = R"(// Registers libDisk.so with OpenPegasus.
 // While the server runs, after the class declarations:
 //   cimmof -n root/PG_InterOp FILE
@@ -373,26 +341,14 @@ instance of PG_ProviderCapabilities {
 
 TEST_F(HostTest, RegistrationIsMofForTheServer) {
   writeLinkedFiles();
-  write("mof/root/other/disk.mof", "class Test_Disk { [Key] string Name; };\n");
-  std::string everywhere = definitionOf("Test_Disk");
-  everywhere.erase(everywhere.find(" namespace"), std::strlen(" namespace=\"root/test\""));
-  write("run/test.xml", plugin(everywhere));
-  const std::string print =
-      "registration --module-name Disk-1 --vendor A\"B\"\\C\x1bé --module-version 2.0 --location "
-      "Disk";
-  ASSERT_EQ(run(print), ExitCode::kOk) << error_.str();
+  ASSERT_EQ(run("registration --module-name Disk-1 --vendor A\"B\"\\C\x1bé --module-version 2.0 "
+                "--location Disk"),
+            ExitCode::kOk)
+      << error_.str();
   EXPECT_EQ(error_.str(), "");
-  const std::string printed = out_.str();
-  EXPECT_THAT(printed, testing::StartsWith(kRegistration));
-  EXPECT_THAT(printed,
-              HasSubstr("Namespaces = {\"root/other\", \"root/test\"};\n  ProviderType = {2};"));
-  EXPECT_THAT(printed, HasSubstr("ClassName = \"Test_Port\";\n  Namespaces = {\"root/test\"};\n"
-                                 "  ProviderType = {2, 5};"));
-  // It parses as MOF, and printing again gives the same.
-  write("mof/root/PG_InterOp/registration.mof", kServerClasses + printed);
-  EXPECT_EQ(run(print), ExitCode::kOk);
-  EXPECT_EQ(error_.str(), "");
-  EXPECT_EQ(out_.str(), printed);
+  EXPECT_THAT(out_.str(), testing::StartsWith(kRegistration));
+  EXPECT_THAT(out_.str(), HasSubstr("ClassName = \"Test_Port\";\n  Namespaces = {\"root/test\"};\n"
+                                    "  ProviderType = {2, 5};"));
 }
 
 TEST_F(HostTest, RegistrationWarnsAndRefuses) {
@@ -405,26 +361,21 @@ TEST_F(HostTest, RegistrationWarnsAndRefuses) {
   write("run/b.xml", plugin("<class name=\"Y\">\n</class>"));
   EXPECT_EQ(run("registration"), ExitCode::kProblems);
   EXPECT_EQ(out_.str(), "");
-  const std::string problems = error_.str();
-  run("check");
-  EXPECT_THAT(out_.str(), testing::StartsWith(problems));
-  EXPECT_EQ(shell("registration 2>/dev/null"), "");
-  EXPECT_EQ(status_, ExitCode::kProblems);
+  EXPECT_THAT(error_.str(), HasSubstr("run/b.xml:"));
 }
 
 TEST_F(HostTest, DumpsShowWhatNamedFilesHold) {
   writeLinkedFiles();
   write("bad.xml", "<plugin><module name=\"x\"/><class/>");
-  const std::string named = shell("dump " + (home_ / "run/linked.xml").string());
+  const std::string dump = shell("dump " + (home_ / "run/linked.xml").string());
   EXPECT_EQ(status_, ExitCode::kOk);
-  EXPECT_THAT(named,
+  EXPECT_THAT(dump,
               testing::StartsWith("*** Start of ProviderDefModule Dump ***\nModule Name: m\n"));
-  EXPECT_THAT(named, HasSubstr("Class Name: Link_Port\n"));
-  EXPECT_THAT(named, testing::Not(HasSubstr("Test_Prints")));
-  EXPECT_THAT(named, testing::EndsWith("*** End   of ProviderDefAssociation Dump ***\n"));
-  const std::string bad = shell("dump " + (home_ / "bad.xml").string() + " 2>&1 >/dev/null");
+  EXPECT_THAT(dump, HasSubstr("Class Name: Link_Port\n"));
+  EXPECT_THAT(dump, testing::EndsWith("*** End   of ProviderDefAssociation Dump ***\n"));
+  EXPECT_THAT(shell("dump " + (home_ / "bad.xml").string() + " 2>&1 >/dev/null"),
+              HasSubstr("bad.xml:1:"));
   EXPECT_EQ(status_, ExitCode::kProblems);
-  EXPECT_THAT(bad, HasSubstr("bad.xml:1:"));
   shell("dump >/dev/full 2>&1");
   EXPECT_EQ(status_, ExitCode::kOutput);
 }

@@ -133,10 +133,9 @@ TEST(Output, Lists) {
   EXPECT_EQ(printed(OutputFormat::mof, ResultForm::list, {disk("/"), disk("%s")}),
             "instance of Demo_Disk {\n  Name = \"/\";\n};\n\n"
             "instance of Demo_Disk {\n  Name = \"%s\";\n};\n");
-  EXPECT_EQ(
-      Json::parse(printed(OutputFormat::json, ResultForm::list, {disk("a"), disk("b")}))[1],
-      Json::parse(
-          R"({"path": "root/demo:Demo_Disk.Name=\"b\"", "class": "Demo_Disk", "properties": {"Name": "b"}})"));
+  EXPECT_EQ(Json::parse(printed(OutputFormat::json, ResultForm::list, {disk("a"), disk("b")}))[1],
+            Json::parse(R"({"path": "root/demo:Demo_Disk.Name=\"b\"", "class": "Demo_Disk",
+                            "properties": {"Name": "b"}})"));
   EXPECT_EQ(printed(OutputFormat::json, ResultForm::list, {}), "[]\n");
 }
 

@@ -5,7 +5,6 @@
 #include <gmock/gmock.h>
 
 #include <string>
-#include <utility>
 #include <vector>
 
 namespace {
@@ -15,21 +14,19 @@ using namespace cimhost;
 enum Kind : unsigned { kPlain = 0, kAssociation = 1, kMethods = 2 };
 
 struct Definition {
-  const char* nameSpace;
-  const char* className;
+  const char *nameSpace, *className;
   unsigned kind;
 };
 
 ServedClass served(const Definition& definition) {
-  ServedClass result;
-  if (*definition.nameSpace != '\0') {
-    result.nameSpace = Pegasus::CIMNamespaceName(definition.nameSpace);
-  }
-  result.className = Pegasus::CIMName(definition.className);
-  result.association = (definition.kind & kAssociation) != 0;
-  result.hasMethods = (definition.kind & kMethods) != 0;
-  result.file = "run/a.xml";
-  return result;
+  const bool everywhere = *definition.nameSpace == '\0';
+  return {
+      everywhere ? Pegasus::CIMNamespaceName() : Pegasus::CIMNamespaceName(definition.nameSpace),
+      definition.className,
+      (definition.kind & kAssociation) != 0,
+      (definition.kind & kMethods) != 0,
+      "run/a.xml",
+      {}};
 }
 
 // "id: class in namespace namespace; association; methods"
@@ -46,8 +43,8 @@ std::string text(const ProviderCapability& capability) {
 TEST(Registration, OneCapabilityForEachClassAndSetOfProviderTypes) {
   ClassRepository repository;
   for (const char* space : {"root/y", "root/x"}) {
-    repository.addNamespace(Pegasus::CIMNamespaceName(space));
-    repository.addClass(Pegasus::CIMNamespaceName(space), Pegasus::CIMClass(Pegasus::CIMName("A")));
+    repository.addNamespace(space);
+    repository.addClass(space, Pegasus::CIMClass("A"));
   }
   const struct {
     const char* name;
