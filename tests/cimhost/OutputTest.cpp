@@ -1,6 +1,6 @@
-#include "cimhost/mof/MofReader.h"
 #include "cimhost/output/MofText.h"
 #include "cimhost/output/ResultWriter.h"
+#include "tests/cimhost/TestModel.h"
 
 #include <gmock/gmock.h>
 #include <nlohmann/json.hpp>
@@ -17,17 +17,16 @@ using testing::HasSubstr;
 using Json = nlohmann::json;
 
 CIMProperty property(const char* name, const CIMValue& value) {
-  return CIMProperty(CIMName(name), value);
+  return CIMProperty(name, value);
 }
 
-CIMInstance disk(const String& name, const std::vector<CIMProperty>& more = {}) {
-  CIMInstance instance(CIMName("Demo_Disk"));
-  instance.addProperty(property("Name", CIMValue(name)));
+CIMInstance disk(const char* name, const std::vector<CIMProperty>& more = {}) {
+  CIMInstance instance("Demo_Disk");
+  instance.addProperty(property("Name", CIMValue(String(name))));
   for (const CIMProperty& each : more) instance.addProperty(each);
   Array<CIMKeyBinding> keys;
-  keys.append(CIMKeyBinding(CIMName("Name"), CIMValue(name)));
-  instance.setPath(
-      CIMObjectPath(String(), CIMNamespaceName("root/demo"), CIMName("Demo_Disk"), keys));
+  keys.append(CIMKeyBinding("Name", CIMValue(String(name))));
+  instance.setPath(CIMObjectPath(String(), "root/demo", "Demo_Disk", keys));
   return instance;
 }
 
@@ -155,12 +154,8 @@ class Demo_Disk : Demo_Base {
 )";
 
 TEST(Output, ClassDeclarations) {
-  const CIMNamespaceName space("root/demo");
-  ClassRepository repository;
-  MofReader reader(repository);
-  ASSERT_TRUE(reader.readText("class Demo_Base { uint16 Status; };", "base.mof", space));
-  ASSERT_TRUE(reader.readText(kDemoClass, "demo.mof", space));
-  const CIMClass demo = repository.getClass(space, "Demo_Disk", false, true, true, {});
+  const std::string base = "class Demo_Base { uint16 Status; };\n";
+  const CIMClass demo = test::readClass(base + kDemoClass, "Demo_Disk");
   const auto printedAs = [&](OutputFormat format) {
     return print(format, ResultForm::single,
                  [&](ResultWriter& writer) { writer.deliverClass(demo); });

@@ -43,6 +43,13 @@ bool RecordingSink::deliverMethodResult(const CIMValue& returned,
   return true;
 }
 
+CIMClass readClass(const std::string& mof, const char* name) {
+  ClassRepository repository;
+  MofReader reader(repository);
+  if (!reader.readText(mof, "test.mof", kNamespace)) throw std::runtime_error("malformed MOF");
+  return repository.getClass(kNamespace, name, false, true, true, {});
+}
+
 CIMObjectPath pathOf(const std::string& className) {
   return CIMObjectPath(String((className + ".Name=\"a\"").c_str()));
 }

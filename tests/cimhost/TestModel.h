@@ -53,6 +53,9 @@ class TestHost {
 
 inline const Pegasus::CIMNamespaceName kNamespace("root/test");
 
+/// The class `name` as `mof` declares it.
+Pegasus::CIMClass readClass(const std::string& mof, const char* name);
+
 /// The object with the key Name="a" of a class.
 Pegasus::CIMObjectPath pathOf(const std::string& className);
 

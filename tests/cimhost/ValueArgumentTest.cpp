@@ -3,9 +3,7 @@
 #include "cimhost/RequestArguments.h"
 #include "cimhost/Text.h"
 #include "cimhost/output/MofText.h"
-
-#include <Pegasus/Common/CIMMethod.h>
-#include <Pegasus/Common/CIMParameter.h>
+#include "tests/cimhost/TestModel.h"
 
 #include <gtest/gtest.h>
 
@@ -93,27 +91,18 @@ TEST(ValueArgument, TextsBecomeWhatIsDeclared) {
   for (const auto& row : cases) EXPECT_EQ(resultOf(row.type, row.texts), row.expected);
 }
 
-CIMClass makeDeclaration() {
-  CIMClass declaration(CIMName("Test_Disk"));
-  declaration.addProperty(CIMProperty(CIMName("Size"), CIMValue(CIMTYPE_UINT8, false)));
-  declaration.addProperty(CIMProperty(CIMName("Flags"), CIMValue(CIMTYPE_UINT8, true, 2), 2));
-  declaration.addProperty(
-      CIMProperty(CIMName("Peer"), CIMValue(CIMTYPE_REFERENCE, false), 0, CIMName("Test_Disk")));
-  CIMMethod method(CIMName("Format"), CIMTYPE_UINT32);
-  method.addParameter(CIMParameter(CIMName("Label"), CIMTYPE_STRING));
-  CIMParameter out(CIMName("Result"), CIMTYPE_UINT8);
-  out.addQualifier(CIMQualifier(CIMName("In"), CIMValue(false)));
-  method.addParameter(out);
-  method.addParameter(
-      CIMParameter(CIMName("Disks"), CIMTYPE_REFERENCE, true, 0, CIMName("Test_Disk")));
-  declaration.addMethod(method);
-  return declaration;
+const CIMClass& declaration() {
+  static const CIMClass read = test::readClass(
+      "class Test_Disk { uint8 Size; uint8 Flags[2]; Test_Disk REF Peer;\n"
+      "uint32 Format(string Label, [In(false)] uint8 Result, Test_Disk REF Disks[]); };",
+      "Test_Disk");
+  return read;
 }
 
 std::string modified(const std::vector<std::string>& arguments) {
   try {
     const ModifyInstanceRequest request = makeModifyRequest(
-        makeDeclaration(), CIMObjectPath("root/test:Test_Disk.Name=\"a\""), arguments);
+        declaration(), CIMObjectPath("root/test:Test_Disk.Name=\"a\""), arguments);
     return toUtf8(request.instance.getPath().toString()) + " " +
            toUtf8(request.propertyList.toString()) + "\n" + mofInstance(request.instance);
   } catch (const ValueArgumentError& error) {
@@ -123,8 +112,8 @@ std::string modified(const std::vector<std::string>& arguments) {
 
 std::string invoked(const std::string& method, const std::vector<std::string>& arguments) {
   try {
-    const InvokeMethodRequest request = makeInvokeRequest(
-        makeDeclaration(), CIMObjectPath("root/test:Test_Disk"), method, arguments);
+    const InvokeMethodRequest request =
+        makeInvokeRequest(declaration(), CIMObjectPath("root/test:Test_Disk"), method, arguments);
     std::string text = toUtf8(request.methodName.getString());
     for (Uint32 i = 0; i < request.parameters.size(); ++i) {
       text += " " + toUtf8(request.parameters[i].getParameterName()) + "=" +

@@ -45,19 +45,36 @@ std::string utf8(const String& text) {
   return static_cast<const char*>(text.getCString());
 }
 
+// What `name` says.
+void throwAs(const std::string& name) {
+  const auto says = [&name](const char* word) { return name.find(word) != std::string::npos; };
+  if (says("ThrowsCim")) throw CIMException(CIM_ERR_ACCESS_DENIED, "not for you");
+  if (says("ThrowsNotSupported")) throw CIMException(CIM_ERR_NOT_SUPPORTED, "no");
+  if (says("ThrowsSuccess")) throw CIMException(CIM_ERR_SUCCESS, "odd");
+  if (says("ThrowsOddCode")) throw CIMException(CIMStatusCode(246), "odd");
+  if (says("ThrowsPegasus")) throw InvalidNameException("1x");
+  if (says("ThrowsStd")) throw std::runtime_error("std \xff");
+  if (says("ThrowsInt")) throw 42;
+  if (says("ManyThrows")) throw CIMException(CIM_ERR_FAILED, "in the middle");
+}
+
 struct Request {
   const OperationContext& context;
   const CIMObjectPath& path;
   InstanceResponseHandler& handler;
   CIMOMHandle& server;
 
-  void deliver(const std::string& name) const {
-    handler.deliver(makeDisk(path.getClassName(), path.getNameSpace(), String(name.c_str())));
+  CIMInstance make(const std::string& name) const {
+    return makeDisk(path.getClassName(), path.getNameSpace(), String(name.c_str()));
   }
+  Array<CIMInstance> enumerate(const CIMName& className) const {
+    return server.enumerateInstances(context, path.getNameSpace(), className, true, false, true,
+                                     true, CIMPropertyList());
+  }
+  void deliver(const std::string& name) const { handler.deliver(make(name)); }
   void deliverNumbered(int count) const {
     for (int i = 0; i < count; ++i) deliver(std::to_string(i));
   }
-  void complete() const { handler.complete(); }
 };
 
 using Behaviour = std::function<void(const Request&)>;
@@ -70,17 +87,13 @@ void deliverSwallowing(const Request& request) {
       record("swallowed");
     }
   }
-  request.complete();
 }
 
 void deliverWhatTheServerHas(const Request& request) {
-  const Array<CIMInstance> disks = request.server.enumerateInstances(
-      request.context, request.path.getNameSpace(), CIMName("Test_Disk"), true, false, true, true,
-      CIMPropertyList());
+  const Array<CIMInstance> disks = request.enumerate("Test_Disk");
   for (Uint32 i = 0; i < disks.size(); ++i) {
     request.deliver("seen " + utf8(disks[i].getPath().toString()));
   }
-  request.complete();
 }
 
 void waitForGo(const Request& request) {
@@ -88,42 +101,17 @@ void waitForGo(const Request& request) {
   const char* file = std::getenv("TEST_PROVIDER_GO");
   while (file != nullptr && !std::ifstream(file)) usleep(10000);
   request.deliver("waited");
-  request.complete();
-}
-
-void askForItself(const Request& request) {
-  record("nested");
-  request.server.enumerateInstances(request.context, request.path.getNameSpace(),
-                                    request.path.getClassName(), true, false, true, true,
-                                    CIMPropertyList());
-  request.complete();
-}
-
-void deliverWithoutNamespace(const Request& request) {
-  CIMInstance instance = makeDisk(request.path.getClassName(), CIMNamespaceName(), "plain");
-  request.handler.deliver(instance);
-  request.complete();
 }
 
 void deliverUser(const Request& request) {
   const IdentityContainer identity(request.context.get(IdentityContainer::NAME));
   request.deliver(utf8(identity.getUserName()));
-  request.complete();
-}
-
-void deliverPrinting(const Request& request) {
-  std::puts("noise");
-  request.deliver("quiet");
-  request.complete();
 }
 
 void deliverArray(const Request& request) {
   Array<CIMInstance> instances;
-  for (const char* name : {"x", "y"}) {
-    instances.append(makeDisk(request.path.getClassName(), request.path.getNameSpace(), name));
-  }
+  for (const char* name : {"x", "y"}) instances.append(request.make(name));
   request.handler.deliver(instances);
-  request.complete();
 }
 
 // What Test_Memory was last modified to.
@@ -132,60 +120,35 @@ CIMInstance& remembered() {
   return instance;
 }
 
+// Before the provider completes; classes that are not here deliver something and throw as their
+// names say.
 const std::map<std::string, Behaviour> kBehaviours = {
-    {"Test_Memory", [](const Request& r) { r.handler.deliver(remembered()), r.complete(); }},
-    {"Test_Disk", [](const Request& r) { r.deliver("a"), r.deliver("b"), r.complete(); }},
-    {"Test_BigDisk", [](const Request& r) { r.deliver("big"), r.complete(); }},
+    {"Test_Memory", [](const Request& r) { r.handler.deliver(remembered()); }},
+    {"Test_Disk", [](const Request& r) { r.deliver("a"), r.deliver("b"); }},
+    {"Test_BigDisk", [](const Request& r) { r.deliver("big"); }},
     {"Test_Array", deliverArray},
-    {"Test_Prints", deliverPrinting},
+    {"Test_Prints", [](const Request& r) { std::puts("noise"), r.deliver("quiet"); }},
     {"Test_Waits", waitForGo},
     {"Test_User", deliverUser},
     {"Test_Nothing", [](const Request&) {}},
-    {"Test_OnlyCompletes", [](const Request& r) { r.complete(); }},
-    {"Test_NoComplete", [](const Request& r) { r.deliver("lost"); }},
-    {"Test_LateDelivery",
-     [](const Request& r) { r.deliver("a"), r.complete(), r.deliver("lost"); }},
+    {"Test_OnlyCompletes", [](const Request&) {}},
+    {"Test_LateDelivery", [](const Request& r) { r.deliver("a"); }},
     {"Test_TwoBatches",
-     [](const Request& r) { r.deliver("lost"), r.complete(), r.deliver("b"), r.complete(); }},
-    {"Test_ThrowsCim",
-     [](const Request& r) {
-       r.deliver("lost");
-       throw CIMException(CIM_ERR_ACCESS_DENIED, "not for you");
-     }},
-    {"Test_ThrowsSuccess", [](const Request&) { throw CIMException(CIM_ERR_SUCCESS, "odd"); }},
-    {"Test_ThrowsOddCode", [](const Request&) { throw CIMException(CIMStatusCode(246), "odd"); }},
-    {"Test_ThrowsNotSupported",
-     [](const Request& r) {
-       r.deliver("lost"), r.complete();
-       throw CIMException(CIM_ERR_NOT_SUPPORTED, "no");
-     }},
-    {"Test_ThrowsPegasus", [](const Request&) { throw InvalidNameException("1x"); }},
-    {"Test_ThrowsStd", [](const Request&) { throw std::runtime_error("std \xff"); }},
-    {"Test_ThrowsInt", [](const Request&) { throw 42; }},
+     [](const Request& r) { r.deliver("lost"), r.handler.complete(), r.deliver("b"); }},
+    {"Test_ThrowsNotSupported", [](const Request& r) { r.deliver("lost"), r.handler.complete(); }},
     {"Test_Uninitialized", [](const Request& r) { r.handler.deliver(CIMInstance()); }},
-    {"Test_Many", [](const Request& r) { r.deliverNumbered(2500), r.complete(); }},
+    {"Test_Many", [](const Request& r) { r.deliverNumbered(2500); }},
     {"Test_ManyNoComplete", [](const Request& r) { r.deliverNumbered(1500); }},
-    {"Test_ManyThrows",
-     [](const Request& r) {
-       r.deliverNumbered(1500);
-       throw CIMException(CIM_ERR_FAILED, "in the middle");
-     }},
+    {"Test_ManyThrows", [](const Request& r) { r.deliverNumbered(1500); }},
     {"Test_Swallows", deliverSwallowing},
     {"Test_ServerDisks", deliverWhatTheServerHas},
-    {"Test_Nested", askForItself},
-    {"Test_NoNamespace", deliverWithoutNamespace},
-    {"Test_EchoPath", [](const Request& r) { r.deliver(utf8(r.path.toString())), r.complete(); }},
+    {"Test_Nested", [](const Request& r) { record("nested"), r.enumerate(r.path.getClassName()); }},
+    {"Test_NoNamespace",
+     [](const Request& r) {
+       r.handler.deliver(makeDisk(r.path.getClassName(), CIMNamespaceName(), "plain"));
+     }},
+    {"Test_EchoPath", [](const Request& r) { r.deliver(utf8(r.path.toString())); }},
 };
-
-// What `name` says in its end.
-void throwAs(const std::string& name) {
-  const auto endsWith = [&name](const std::string& end) {
-    return name.size() >= end.size() &&
-           name.compare(name.size() - end.size(), end.size(), end) == 0;
-  };
-  if (endsWith("ThrowsCim")) throw CIMException(CIM_ERR_ACCESS_DENIED, "not for you");
-  if (endsWith("ThrowsNotSupported")) throw CIMException(CIM_ERR_NOT_SUPPORTED, "no");
-}
 
 CIMObject makeObject(const CIMName& className, const String& name) {
   return CIMObject(makeDisk(className, CIMNamespaceName(), name));
@@ -333,7 +296,15 @@ class TestProvider final : public CIMInstanceProvider,
 
   void run(const OperationContext& context, const CIMObjectPath& path,
            InstanceResponseHandler& handler) {
-    kBehaviours.at(utf8(path.getClassName().getString()))({context, path, handler, *server_});
+    const std::string name = utf8(path.getClassName().getString());
+    const Request request{context, path, handler, *server_};
+    const auto found = kBehaviours.find(name);
+    found == kBehaviours.end() ? request.deliver("lost") : found->second(request);
+    throwAs(name);
+    if (name == "Test_Nothing" || name == "Test_NoComplete" || name == "Test_ManyNoComplete")
+      return;
+    handler.complete();
+    if (name == "Test_LateDelivery") request.deliver("lost");
   }
 
   std::string name_;
