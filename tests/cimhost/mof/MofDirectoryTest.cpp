@@ -7,44 +7,44 @@ namespace {
 
 // Each file stops at what it lacks and goes on later, also when two need each other in turn.
 TEST(MofDirectory, OrderOfFilesDoesNotMatterAndFoldersNameTheNamespaces) {
-  const MofTree tree;
-  tree.write("root/host/a.mof", "class A {};");
-  tree.write("root/host/notes.txt", "not MOF");
-  tree.write("a.mof", "class A1 {}; class A2 : b1 {}; class A3 : B2 {};");
-  tree.write("b.mof", "class B1 : A1 {}; class B2 : A2 {};");
-  tree.write("c.mof", "class C { [Mine] uint8 P; };");
-  tree.write("d.mof", "class D : E {};");
-  tree.write("e.mof", "#pragma include(\"q.mof\")\nclass E : C { [mine] uint8 Q; };");
-  tree.write("q.mof", "Qualifier MINE : boolean, scope(property);");
+  const TemporaryTree tree;
+  write("root/host/a.mof", "class A {};");
+  write("root/host/notes.txt", "not MOF");
+  write("a.mof", "class A1 {}; class A2 : b1 {}; class A3 : B2 {};");
+  write("b.mof", "class B1 : A1 {}; class B2 : A2 {};");
+  write("c.mof", "class C { [Mine] uint8 P; };");
+  write("d.mof", "class D : E {};");
+  write("e.mof", "#pragma include(\"q.mof\")\nclass E : C { [mine] uint8 Q; };");
+  write("q.mof", "Qualifier MINE : boolean, scope(property);");
   Mof mof;
-  ASSERT_TRUE(mof.reader.readDirectory(tree.path(), kNamespace)) << mof.diagnostics();
+  ASSERT_TRUE(mof.reader.readDirectory(".", kNamespace)) << mof.diagnostics();
   EXPECT_TRUE(mof.repository.hasClass("root/host", "A"));
   EXPECT_TRUE(mof.repository.isSubclass(kNamespace, "A3", "A1"));
   EXPECT_EQ(mof.classAsText("D"), "D : E\n[Mine^=TRUE] uint8 P (C^)\n[mine^=TRUE] uint8 Q (E^)\n");
 }
 
 TEST(MofDirectory, LongChainsInReverseOrder) {
-  const MofTree tree;
+  const TemporaryTree tree;
   for (int i = 0; i < 500; ++i) {
     const std::string name = std::to_string(1000 + i);
-    tree.write(name + ".mof", "class C" + name + " : C" + std::to_string(1001 + i) + " {};");
+    write(name + ".mof", "class C" + name + " : C" + std::to_string(1001 + i) + " {};");
   }
-  tree.write("z.mof", "class C1500 { [Key] uint8 K; };");
+  write("z.mof", "class C1500 { [Key] uint8 K; };");
   Mof mof;
-  ASSERT_TRUE(mof.reader.readDirectory(tree.path(), kNamespace)) << mof.diagnostics();
+  ASSERT_TRUE(mof.reader.readDirectory(".", kNamespace)) << mof.diagnostics();
   EXPECT_EQ(mof.classAsText("C1000"), "C1000 : C1001\n[Key^=TRUE] uint8 K (C1500^)\n");
 }
 
 TEST(MofDirectory, EachFileHasItsOwnDiagnosticInOrder) {
-  const MofTree tree;
-  tree.write("a.mof", "class A : Never {};\nclass B {};");
-  tree.write("b.mof", "class C { uint9 x; };");
-  tree.write("bad-name/c.mof", "class D {};");
-  tree.write("d.mof", "class E : E {};");
-  tree.write("e.mof", "class F {};");
-  ASSERT_EQ(symlink("nowhere", tree.path("f.mof").c_str()), 0);
+  const TemporaryTree tree;
+  write("a.mof", "class A : Never {};\nclass B {};");
+  write("b.mof", "class C { uint9 x; };");
+  write("bad-name/c.mof", "class D {};");
+  write("d.mof", "class E : E {};");
+  write("e.mof", "class F {};");
+  ASSERT_EQ(symlink("nowhere", "f.mof"), 0);
   Mof mof;
-  EXPECT_FALSE(mof.reader.readDirectory(tree.path(), kNamespace));
+  EXPECT_FALSE(mof.reader.readDirectory(".", kNamespace));
   std::string places;
   for (const auto& diagnostic : mof.reader.diagnostics()) {
     places += std::filesystem::path(diagnostic.file).filename().string() + ':' +
@@ -59,11 +59,11 @@ TEST(MofDirectory, EachFileHasItsOwnDiagnosticInOrder) {
             "f.mof:0:0: No such file or directory\n");
   EXPECT_TRUE(mof.repository.hasClass(kNamespace, "F"));
   Mof none;
-  EXPECT_FALSE(none.reader.readDirectory(tree.path("none"), kNamespace));
-  EXPECT_FALSE(none.reader.readDirectory(tree.path("a.mof"), kNamespace));
+  EXPECT_FALSE(none.reader.readDirectory("none", kNamespace));
+  EXPECT_FALSE(none.reader.readDirectory("a.mof", kNamespace));
   EXPECT_EQ(none.diagnostics(),
-            tree.path("none") + ": error: cannot read the folder: No such file or directory\n" +
-                tree.path("a.mof") + ": error: cannot read the folder: Not a directory\n");
+            "none: error: cannot read the folder: No such file or directory\n"
+            "a.mof: error: cannot read the folder: Not a directory\n");
 }
 
 }  // namespace

@@ -45,20 +45,9 @@ struct Mof {
   }
 };
 
-/// A directory for MOF files.
-class MofTree {
- public:
-  MofTree() { std::filesystem::create_directory(path()); }
-
-  std::string path(const std::string& relative = "") const {
-    return (tree_.root() / "mof" / relative).lexically_normal().string();
-  }
-  void write(const std::string& relative, const std::string& content) const {
-    TemporaryTree::write(path(relative), content);
-  }
-
- private:
-  TemporaryTree tree_;
-};
+/// A file below the folder that a TemporaryTree makes the current one.
+inline void write(const std::string& file, const std::string& text) {
+  TemporaryTree::write(file, text);
+}
 
 }  // namespace cimhost_test
