@@ -47,9 +47,66 @@ class FunctionCall : public RecorderTest {
   static ProviderDefFunctionCall call(const std::string& type, const std::string& arguments) {
     return fromText<ProviderDefFunctionCall>(callText("alltypes", type, type, arguments));
   }
+};
 
-  template <class Run, size_t size>
-  void expectEach(const Case (&cases)[size], Run run) {
+const Case kGetCases[] = {
+    {"getI", "", "0 11", true},
+    {"getIi", "", "0 0", false},
+    {"getIi", kIndex, "0 11", true, 4},
+    {"getLi", kNumber, "6 12", true, 9},
+    {"getIw", kText, "0 11", true, 0, "seven"},
+    {"getIi", kQuery, "0 11", true, 0},
+    {"getI", kInput, "1 Not Supported", false},
+    {"getI", kOutput, "0 0", false},
+    {"getIv", kIndex + kText, "0 11", true, 0, "", kFour + kSeven},
+    {"getIv", kText + kOutput + kIndex + kNumber, "0 11", true, 0, "", kSeven + kFour + kNine},
+    {"getIv", kInput + kIndex, "0 11", true, 0, "", kNotSupported + kFour},
+    {"getIv", kOutput + kOutput, "0 11", true},
+    {"getIi", kIndex + kText, "0 0", false},
+    {"setI", "", "0 0", false},
+};
+
+const Case kSetCases[] = {
+    {"setI", "", "0 11", true},
+    {"setIi", "", "0 0", false},
+    {"setIi", kIndex, "0 11", true, 4},
+    {"setSi", kNumber, "0 11", true, 9},
+    {"setIw", kText, "0 11", true, 0, "seven"},
+    {"setIi", kInput, "0 0", false},
+    {"setIi", kOutput, "0 0", false},
+    {"setIv", kIndex + kText, "0 11", true, 0, "", kFour + kSeven},
+    {"setIv", kInput + kNumber + kOutput, "0 11", true, 0, "", kNotSupported + kNine},
+    {"setIi", kIndex + kText, "0 0", false},
+    {"getI", "", "0 0", false},
+};
+
+const Case kExecCases[] = {
+    {"execA", "", "0 11", true},
+    {"execB", "", "0 99", false},
+    {"execAi", kIndex, "0 11", true, 4},
+    {"execAw", kText, "0 11", true, 0, "seven"},
+    {"execB", kInput, "0 11", true},
+    {"execC", kOutput, "0 11", true},
+    {"execC", kInput + kOutput, "0 11", true},
+    {"execC", kOutput + kInput, "0 11", true},
+    {"execB", kInput + kInput, "0 0", false},
+    {"execC", kOutput + kOutput, "0 0", false},
+    {"execBi", kInput + kIndex, "0 11", true, 4},
+    {"execBw", kText + kInput, "0 11", true, 0, "seven"},
+    {"execB", kInput + kIndex, "0 11", true},
+    {"execBi", kInput + kText, "0 99", false},
+    {"execCi", kInput + kOutput + kIndex, "0 11", true, 4},
+    {"execCi", kOutput + kIndex, "0 11", true, 4},
+    {"execBi", kInput + kOutput + kIndex, "0 99", false},
+    {"execB", kIndex + kIndex, "0 0", false},
+    {"execC", kInput + kIndex + kOutput + kText, "0 0", false},
+};
+
+}  // namespace
+
+TEST_F(FunctionCall, TheArgumentsChooseTheOperation) {
+  Values outputs;
+  const auto expectEach = [this](const auto& cases, auto run) {
     for (const Case& c : cases) {
       SCOPED_TRACE(c.type + (" " + c.arguments));
       recorder_->calls = recorder_->number = 0;
@@ -63,29 +120,12 @@ class FunctionCall : public RecorderTest {
       EXPECT_STREQ(recorder_->word, c.word);
       EXPECT_EQ(trimmed(recorder_->extra), trimmed(c.extra));
     }
-  }
-};
-
-}  // namespace
-
-TEST_F(FunctionCall, GetValue) {
-  const Case cases[] = {
-      {"getI", "", "0 11", true},
-      {"getIi", "", "0 0", false},
-      {"getIi", kIndex, "0 11", true, 4},
-      {"getLi", kNumber, "6 12", true, 9},
-      {"getIw", kText, "0 11", true, 0, "seven"},
-      {"getIi", kQuery, "0 11", true, 0},
-      {"getI", kInput, "1 Not Supported", false},
-      {"getI", kOutput, "0 0", false},
-      {"getIv", kIndex + kText, "0 11", true, 0, "", kFour + kSeven},
-      {"getIv", kText + kOutput + kIndex + kNumber, "0 11", true, 0, "", kSeven + kFour + kNine},
-      {"getIv", kInput + kIndex, "0 11", true, 0, "", kNotSupported + kFour},
-      {"getIv", kOutput + kOutput, "0 11", true},
-      {"getIi", kIndex + kText, "0 0", false},
-      {"setI", "", "0 0", false},
   };
-  expectEach(cases, [](const ProviderDefFunctionCall& call) { return call.getValue(4); });
+  expectEach(kGetCases, [](const auto& made) { return made.getValue(4); });
+  expectEach(kSetCases, [](const auto& made) { return made.setValue(-8, 4); });
+  EXPECT_EQ(recorder_->value, -8);
+  expectEach(kExecCases, [&](const auto& made) { return made.exec(Values{7}, outputs, 4); });
+  EXPECT_TRUE(outputs.empty());
 }
 
 TEST_F(FunctionCall, GetValueWithoutIndexIgnoresTheArguments) {
@@ -93,55 +133,6 @@ TEST_F(FunctionCall, GetValueWithoutIndexIgnoresTheArguments) {
   EXPECT_EQ(call("getI", kIndex).getValue(), 11);
   EXPECT_EQ(call("getL", "").getValue(), 0) << "the integer field of a long";
   EXPECT_EQ(call("getIi", kIndex).getValue(), 0);
-}
-
-TEST_F(FunctionCall, SetValue) {
-  const Case cases[] = {
-      {"setI", "", "0 11", true},
-      {"setIi", "", "0 0", false},
-      {"setIi", kIndex, "0 11", true, 4},
-      {"setSi", kNumber, "0 11", true, 9},
-      {"setIw", kText, "0 11", true, 0, "seven"},
-      {"setIi", kInput, "0 0", false},
-      {"setIi", kOutput, "0 0", false},
-      {"setIv", kIndex + kText, "0 11", true, 0, "", kFour + kSeven},
-      {"setIv", kInput + kNumber + kOutput, "0 11", true, 0, "", kNotSupported + kNine},
-      {"setIi", kIndex + kText, "0 0", false},
-      {"getI", "", "0 0", false},
-  };
-  expectEach(cases, [](const ProviderDefFunctionCall& call) { return call.setValue(-8, 4); });
-  EXPECT_EQ(recorder_->value, -8);
-}
-
-TEST_F(FunctionCall, Exec) {
-  const std::string in = kInput, out = kOutput, index = kIndex;
-  const Case cases[] = {
-      {"execA", "", "0 11", true},
-      {"execB", "", "0 99", false},
-      {"execAi", index, "0 11", true, 4},
-      {"execAw", kText, "0 11", true, 0, "seven"},
-      {"execB", in, "0 11", true},
-      {"execC", out, "0 11", true},
-      {"execC", in + out, "0 11", true},
-      {"execC", out + in, "0 11", true},
-      {"execB", in + in, "0 0", false},
-      {"execC", out + out, "0 0", false},
-      {"execBi", in + index, "0 11", true, 4},
-      {"execBw", kText + in, "0 11", true, 0, "seven"},
-      {"execB", in + index, "0 11", true},
-      {"execBi", in + kText, "0 99", false},
-      {"execCi", in + out + index, "0 11", true, 4},
-      {"execCi", out + index, "0 11", true, 4},
-      {"execBi", in + out + index, "0 99", false},
-      {"execB", index + index, "0 0", false},
-      {"execC", in + index + out + kText, "0 0", false},
-  };
-  const Values inputs{7};
-  Values outputs;
-  expectEach(cases, [&](const ProviderDefFunctionCall& call) {
-    return ProviderDefValue(call.exec(inputs, outputs, 4));
-  });
-  EXPECT_TRUE(outputs.empty());
 }
 
 TEST_F(FunctionCall, ExecHandsInputsInAndOutputsOut) {

@@ -123,18 +123,16 @@ TEST_F(ModuleLoading, LogsItsSteps) {
   std::filesystem::remove(tree_.logs() / "CommonProvider.log");
   module("lifecycle").getFunction("twice");
   errorOf([] { module("none").getFunction("f"); });
-  EXPECT_THAT(tree_.log(),
-              testing::MatchesRegex(
-                  "ProviderDefModule::getFunction\\(std::string twice\\)\n"
-                  "Loading lifecycle\n"
-                  "lifecycle loaded: [0-9a-f]+\n"
-                  "Calling init: [0-9a-f]+\n"
-                  "ProviderDefFunctionCall::init\\(void\\)\n"
-                  "ProviderDefFunctionCall::getValue\\(int index\\) : no argument\n"
-                  "ProviderDefFunction::get\\(void\\) Type:100\n"
-                  "ProviderDefModule::getFunction\\(std::string start\\)\n"
-                  "Loading start : [0-9a-f]+\nstart loaded\n"
-                  "Loading twice : [0-9a-f]+\ntwice loaded\n"
-                  "ProviderDefModule::getFunction\\(std::string f\\)\n"
-                  "Loading none\nLoading none: [^\n]*libnone\\.so: cannot open [^\n]*\n"));
+  EXPECT_THAT(
+      tree_.log(),
+      testing::MatchesRegex(
+          "ProviderDefModule::getFunction\\(std::string twice\\)\nLoading lifecycle\n"
+          "lifecycle loaded: [0-9a-f]+\nCalling init: [0-9a-f]+\n"
+          "ProviderDefFunctionCall::init\\(void\\)\n"
+          "ProviderDefFunctionCall::getValue\\(int index\\) : no argument\n"
+          "ProviderDefFunction::get\\(void\\) Type:100\n"
+          "ProviderDefModule::getFunction\\(std::string start\\)\n"
+          "Loading start : [0-9a-f]+\nstart loaded\nLoading twice : [0-9a-f]+\ntwice loaded\n"
+          "ProviderDefModule::getFunction\\(std::string f\\)\nLoading none\n"
+          "Loading none: [^\n]*libnone\\.so: cannot open [^\n]*\n"));
 }

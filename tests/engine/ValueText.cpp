@@ -1,7 +1,8 @@
 #include "tests/engine/ValueText.h"
 
+#include <gtest/gtest.h>
+
 #include <ostream>
-#include <sstream>
 
 const Values& oneOfEachType() {
   static const Values values = [] {
@@ -12,21 +13,6 @@ const Values& oneOfEachType() {
   return values;
 }
 
-namespace {
-
-template <class T>
-std::string listText(const std::vector<T>& items) {
-  std::ostringstream text;
-  const char* separator = "{";
-  for (const T& item : items) {
-    text << separator << item;
-    separator = ", ";
-  }
-  return items.empty() ? "{}" : text.str() + "}";
-}
-
-}  // namespace
-
 std::string valueText(const ProviderDefValue& value) {
   const std::string type = std::to_string(value.getType()) + " ";
   switch (value.getType()) {
@@ -34,9 +20,9 @@ std::string valueText(const ProviderDefValue& value) {
     case ProviderDefValue::kIndexString:
       return type + value.getStringValue();
     case ProviderDefValue::kIntArray:
-      return type + listText(value.getIntArray());
+      return type + testing::PrintToString(value.getIntArray());
     case ProviderDefValue::kStringArray:
-      return type + listText(value.getStringArray());
+      return type + testing::PrintToString(value.getStringArray());
     case ProviderDefValue::kBoolean:
       return type + (value.getBoolValue() ? "true" : "false");
     default:

@@ -64,32 +64,17 @@ class Walk {
   }
 
   void step() {
-    switch (below(8)) {
-      case 0:
-        if (classes_.size() < 6) classes_.push_back(anyOf(classes_).clone());
-        break;
-      case 1:
-        if (classes_.size() > 2) dropAny(classes_);
-        break;
-      case 2:
-      case 3:
-        takeHandle();
-        break;
-      case 4:
-        if (!held_.empty()) dropAny(held_);
-        break;
-      case 5:
-        addQualifier();
-        break;
-      case 6:
-        removeQualifier();
-        break;
-      default:
-        if (!held_.empty()) {
-          Qualifier& changed = anyOf(held_);
-          *changed.model = ++last_;
-          changed.object.setValue(last_);
-        }
+    const std::size_t kind = below(8);
+    if (kind == 0 && classes_.size() < 6) classes_.push_back(anyOf(classes_).clone());
+    if (kind == 1 && classes_.size() > 2) dropAny(classes_);
+    if (kind == 2 || kind == 3) takeHandle();
+    if (kind == 4 && !held_.empty()) dropAny(held_);
+    if (kind == 5) addQualifier();
+    if (kind == 6) removeQualifier();
+    if (kind == 7 && !held_.empty()) {
+      Qualifier& changed = anyOf(held_);
+      *changed.model = ++last_;
+      changed.object.setValue(last_);
     }
   }
 
