@@ -1,5 +1,4 @@
 #include <Pegasus/Common/OperationContext.h>
-#include <Pegasus/Common/ResponseHandler.h>
 
 #include "PegasusText.h"
 
@@ -59,31 +58,6 @@ TEST(OperationContext, CopiesCloneEverything) {
     copy.insert(CountedContainer());
   }
   EXPECT_EQ(CountedContainer::alive, 0);
-}
-
-/// A handler as a server writes one: it keeps what is delivered.
-class KeepingHandler : public InstanceResponseHandler {
- public:
-  using InstanceResponseHandler::getContext;
-
-  void processing() override {}
-  void complete() override {}
-  void deliver(const CIMInstance& instance) override { instances.append(instance); }
-  void deliver(const Array<CIMInstance>& delivered) override { instances.appendArray(delivered); }
-
-  Array<CIMInstance> instances;
-};
-
-TEST(ResponseHandlers, CopiesKeepContextAndWhatWasDelivered) {
-  KeepingHandler handler;
-  OperationContext context;
-  context.insert(IdentityContainer(String("root")));
-  handler.setContext(context);
-  handler.deliver(CIMInstance(CIMName("A")));
-  const KeepingHandler copy(handler);
-  handler.deliver(CIMInstance(CIMName("A")));
-  EXPECT_EQ(copy.instances.size(), 1u);
-  EXPECT_EQ(userIn(copy.getContext()), "root");
 }
 
 }  // namespace

@@ -6,8 +6,6 @@ CP_FUNCTION(execC, echo);
 CP_FUNCTION(execC, echoWhole);
 CP_FUNCTION(execBw, nextOf);
 CP_FUNCTION(getAIv, kindsOf);
-CP_FUNCTION(setAI, keepInts);
-CP_FUNCTION(getAI, keptInts);
 CP_FUNCTION(getSi, textOf);
 CP_FUNCTION(getAIi, intsOf);
 CP_FUNCTION(getASi, stringsOf);
@@ -110,18 +108,6 @@ int kindsOf(void* out, void* arg) {
   int i;
   for (i = 0; i < 4 && cp_next(&reader, &item) == CP_OK; ++i) cp_add_int(&writer, item.kind);
   return 0;
-}
-
-static int kept[CP_MAX_INTS];
-static size_t keptCount;
-
-int keepInts(void* in) {
-  cp_reader reader = cp_read(in);
-  return cp_next_ints(&reader, kept, CP_MAX_INTS, &keptCount);
-}
-
-int keptInts(void* out) {
-  return cp_return_ints(out, kept, keptCount);
 }
 
 /* `length` bytes */
