@@ -22,35 +22,31 @@ class MisbehavingPlugin : public PluginTest {
   }
 };
 
+// Up to 1024 bytes are none of the engine's business where it does not read them.
 TEST_F(MisbehavingPlugin, WritingPastABufferIsAnError) {
   Values outputs;
-  for (const int size : {1025, 2024}) {
+  for (const int size : {1024, 1025, 2024}) {
+    const auto expectOverrun = [size](const std::string& name, const std::function<void()>& call) {
+      EXPECT_EQ(errorOf(call), size > 1024 ? overrun(name) : "") << size;
+    };
+    expectOverrun("fill", [&] { function("fill", "setAIi").set(Ints{1}, size); });
+    expectOverrun("fill", [&] { function("fill", "setASi").set(Texts{"a"}, size); });
+    expectOverrun("fill", [&] { function("fill", "execBi").exec(size, Values()); });
+    expectOverrun("fillInputs",
+                  [&] { function("fillInputs", "execCi").exec(size, Values(), outputs); });
+    EXPECT_EQ(errorOf([&] { function("poke", "getSi").get(size); }), overrun("poke")) << size;
+    if (size == 1024) continue;
+    expectOverrun("fillOutputs",
+                  [&] { function("fillOutputs", "execCi").exec(size, Values(), outputs); });
     for (const char* type : {"getSi", "getAIi", "getASi"}) {
-      EXPECT_EQ(errorOf([&] { function("fill", type).get(size); }), overrun("fill")) << type;
-    }
-    EXPECT_EQ(errorOf([&] { function("fill", "setAIi").set(Ints{1}, size); }), overrun("fill"));
-    EXPECT_EQ(errorOf([&] { function("fill", "setASi").set(Texts{"a"}, size); }), overrun("fill"));
-    EXPECT_EQ(errorOf([&] { function("fill", "execBi").exec(size, Values()); }), overrun("fill"));
-    for (const char* name : {"fillInputs", "fillOutputs"}) {
-      EXPECT_EQ(errorOf([&] { function(name, "execCi").exec(size, Values(), outputs); }),
-                overrun(name));
+      expectOverrun("fill", [&] { function("fill", type).get(size); });
     }
   }
-  EXPECT_TRUE(outputs.empty());
-  for (const int offset : {1024, 1025, 2000, 2047}) {
-    EXPECT_EQ(errorOf([&] { function("poke", "getSi").get(offset); }), overrun("poke")) << offset;
-  }
+  EXPECT_TRUE(outputs.empty()) << "a plug-in that writes no outputs has none";
+  EXPECT_EQ(errorOf([] { function("poke", "getSi").get(2047); }), overrun("poke"));
   EXPECT_EQ(errorOf([] { function("fillExtra", "getIv").get(Ints{1}); }), overrun("fillExtra"));
   EXPECT_EQ(errorOf([] { function("fillExtra", "getIv").get(Values{1}); }), overrun("fillExtra"));
   EXPECT_EQ(errorOf([] { function("fillExtra", "execAv").exec(Ints{1}); }), overrun("fillExtra"));
-}
-
-TEST_F(MisbehavingPlugin, FillingAnInputBufferToItsEndIsNone) {
-  Values outputs;
-  EXPECT_EQ(function("fill", "setAIi").set(Ints{1}, 1024), 0);
-  EXPECT_EQ(function("fill", "execBi").exec(1024, Values()), 0);
-  EXPECT_EQ(function("fillInputs", "execCi").exec(1024, Values(), outputs), 0);
-  EXPECT_EQ(valueText(outputs), "") << "a plug-in that writes no outputs has none";
 }
 
 TEST_F(MisbehavingPlugin, GetResultsStayWithinTheBuffer) {
