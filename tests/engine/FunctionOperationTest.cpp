@@ -60,8 +60,8 @@ const std::string kPackedInputs = words({0, 7, 1, 2}) + "ab\0"s + words({99});
 // plug-in's number.
 const std::tuple<int, std::string, const char*> kAnswers[] = {
     {110, "caf\xe9\0?"s, "1 caf\xe9"},
-    {120, words({77, 2, 77, 1, 77, -1}), "2 { 1, -1 }"},
-    {130, words({77, 2, 77, 77}) + "a\0"s + std::string(32, '?') + "bc\0"s, R"(3 { "a", "bc" })"},
+    {120, words({77, 2, 77, 1, 77, -1}), "2 {1, -1}"},
+    {130, words({77, 2, 77, 77}) + "a\0"s + std::string(32, '?') + "bc\0"s, "3 {a, bc}"},
     {230, words({99}), "0 -6"},
 };
 

@@ -63,7 +63,7 @@ TEST_F(MisbehavingPlugin, GetResultsStayWithinTheBuffer) {
       {"countIntegers", "getAIi", 128, noFit("countIntegers")},
       {"countIntegers", "getAIi", INT_MAX, noFit("countIntegers")},
       // Empty strings stand 33 bytes apart: 31 in 1016 bytes.
-      {"countStrings", "getASi", 3, R"(3 { "", "", "" })"},
+      {"countStrings", "getASi", 3, "3 {, , }"},
       {"countStrings", "getASi", 32, noFit("countStrings")},
       {"countStrings", "getASi", INT_MAX, noFit("countStrings")},
       // Header, the first string and its stride leave 9 bytes for an empty second one, or less.

@@ -1,8 +1,7 @@
 #include "tests/engine/ValueText.h"
 
-#include <gtest/gtest.h>
-
 #include <ostream>
+#include <sstream>
 
 const Values& oneOfEachType() {
   static const Values values = [] {
@@ -13,6 +12,13 @@ const Values& oneOfEachType() {
   return values;
 }
 
+template <class T>
+static std::string listText(const std::vector<T>& items) {
+  std::ostringstream text;
+  for (const T& item : items) text << (&item == items.data() ? "" : ", ") << item;
+  return "{" + text.str() + "}";
+}
+
 std::string valueText(const ProviderDefValue& value) {
   const std::string type = std::to_string(value.getType()) + " ";
   switch (value.getType()) {
@@ -20,9 +26,9 @@ std::string valueText(const ProviderDefValue& value) {
     case ProviderDefValue::kIndexString:
       return type + value.getStringValue();
     case ProviderDefValue::kIntArray:
-      return type + testing::PrintToString(value.getIntArray());
+      return type + listText(value.getIntArray());
     case ProviderDefValue::kStringArray:
-      return type + testing::PrintToString(value.getStringArray());
+      return type + listText(value.getStringArray());
     case ProviderDefValue::kBoolean:
       return type + (value.getBoolValue() ? "true" : "false");
     default:
