@@ -12,11 +12,6 @@ using cimhost::HostError;
 using cimhost::ProviderLibrary;
 using testing::HasSubstr;
 
-std::string events() {
-  const char* text = getenv("TEST_PROVIDER_EVENTS");
-  return text != nullptr ? text : "";
-}
-
 bool isMapped(const char* file) {
   void* library = dlopen(file, RTLD_NOW | RTLD_NOLOAD);
   if (library != nullptr) dlclose(library);
@@ -25,19 +20,6 @@ bool isMapped(const char* file) {
 
 class ProviderLibraryTest : public testing::Test {
  protected:
-  void SetUp() override { unsetenv("TEST_PROVIDER_EVENTS"); }
-
-  std::string loadError(const std::string& file, const std::string& provider) {
-    try {
-      library_.load(file, provider, handle_);
-      return "loaded";
-    } catch (const HostError& error) {
-      EXPECT_FALSE(library_.isLoaded());
-      EXPECT_FALSE(isMapped(file.c_str()));
-      return error.what();
-    }
-  }
-
   Pegasus::CIMOMHandle handle_;
   ProviderLibrary library_;
 };
@@ -50,9 +32,7 @@ TEST_F(ProviderLibraryTest, LoadsAndUnloadsAgainAndAgain) {
       EXPECT_THROW(library_.unload(), HostError);
     }
     library_.unload();
-    EXPECT_EQ(library_.instances(), nullptr);
-    EXPECT_EQ(library_.associations(), nullptr);
-    EXPECT_EQ(library_.methods(), nullptr);
+    EXPECT_FALSE(library_.instances() || library_.associations() || library_.methods());
     EXPECT_FALSE(isMapped(TEST_PROVIDER_FILE));
   }
 }
@@ -60,10 +40,7 @@ TEST_F(ProviderLibraryTest, LoadsAndUnloadsAgainAndAgain) {
 // What was initialized in vain is terminated.
 TEST_F(ProviderLibraryTest, FailuresNameTheFileAndTheReason) {
   const struct {
-    const char* file;
-    const char* provider;
-    const char* reason;
-    const char* events;
+    const char *file, *provider, *reason, *events;
   } cases[] = {
       {"/no/such/library.so", "CommonProvider",
        "cannot load the provider library: /no/such/library.so", ""},
@@ -76,9 +53,16 @@ TEST_F(ProviderLibraryTest, FailuresNameTheFileAndTheReason) {
        "create;initialize;terminate;"},
   };
   for (const auto& row : cases) {
-    unsetenv("TEST_PROVIDER_EVENTS");
-    EXPECT_THAT(loadError(row.file, row.provider), HasSubstr(row.reason));
-    EXPECT_EQ(events(), row.events) << row.provider;
+    setenv("TEST_PROVIDER_EVENTS", "", 1);
+    try {
+      library_.load(row.file, row.provider, handle_);
+      ADD_FAILURE() << row.provider;
+    } catch (const HostError& error) {
+      EXPECT_THAT(error.what(), HasSubstr(row.reason));
+    }
+    EXPECT_FALSE(library_.isLoaded());
+    EXPECT_FALSE(isMapped(row.file));
+    EXPECT_STREQ(getenv("TEST_PROVIDER_EVENTS"), row.events) << row.provider;
   }
 }
 

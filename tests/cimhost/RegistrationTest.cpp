@@ -11,22 +11,21 @@ namespace {
 
 using namespace cimhost;
 
-enum Kind : unsigned { kPlain = 0, kAssociation = 1, kMethods = 2 };
+enum Kind { kPlain, kAssociation, kMethods };
 
 struct Definition {
   const char *nameSpace, *className;
-  unsigned kind;
+  Kind kind;
 };
 
 ServedClass served(const Definition& definition) {
-  const bool everywhere = *definition.nameSpace == '\0';
-  return {
-      everywhere ? Pegasus::CIMNamespaceName() : Pegasus::CIMNamespaceName(definition.nameSpace),
-      definition.className,
-      (definition.kind & kAssociation) != 0,
-      (definition.kind & kMethods) != 0,
-      "run/a.xml",
-      {}};
+  ServedClass result;
+  if (*definition.nameSpace != '\0')
+    result.nameSpace = Pegasus::CIMNamespaceName(definition.nameSpace);
+  result.className = Pegasus::CIMName(definition.className);
+  result.association = definition.kind == kAssociation;
+  result.hasMethods = definition.kind == kMethods;
+  return result;
 }
 
 // "id: class in namespace namespace; association; methods"

@@ -5,6 +5,9 @@
 
 #include <gtest/gtest.h>
 
+#include <functional>
+#include <sstream>
+
 namespace cimhost_test {
 namespace {
 
@@ -14,17 +17,6 @@ std::string names(const std::vector<CIMName>& list) {
   std::string result;
   for (const CIMName& name : list) result += text(name.getString()) + ' ';
   return result;
-}
-
-/// "code:text" of the exception that `action` throws.
-template <class Action>
-std::string errorOf(Action action) {
-  try {
-    action();
-  } catch (const CIMException& exception) {
-    return std::to_string(exception.getCode()) + ':' + text(exception.getMessage());
-  }
-  return "none";
 }
 
 // What a class looks like at the end of a chain of declarations.
@@ -79,35 +71,33 @@ const char* const kModel =
     "[Description(\"a\")] class A { [Key] uint8 K; uint8 P; uint8 M([In] uint8 p); };\n"
     "class B : A { [Write] uint8 Q; uint8 p; [Static] uint8 N(); };\n";
 
-CIMPropertyList listOf(std::initializer_list<const char*> names) {
-  Array<CIMName> list;
-  for (const char* name : names) list.append(CIMName(name));
-  return CIMPropertyList(list);
-}
-
 TEST(ClassRepository, Filters) {
   const struct {
     bool localOnly, qualifiers, origins;
-    CIMPropertyList list;
+    const char* list;  // Null: all; else the properties, apart.
     const char* expected;
   } cases[] = {
-      {false, true, true, CIMPropertyList(),
+      {false, true, true, nullptr,
        "[Description^=a] B : A\n[Key^=TRUE] uint8 K (A^)\n[Write=TRUE] uint8 Q (B)\n"
        "uint8 p (A)\nuint8 M([In^=TRUE] uint8 p) (A^)\n[Static=TRUE] uint8 N() (B)\n"},
-      {true, true, true, CIMPropertyList(),
+      {true, true, true, nullptr,
        "[Description^=a] B : A\n[Write=TRUE] uint8 Q (B)\nuint8 p (A)\n"
        "[Static=TRUE] uint8 N() (B)\n"},
-      {true, false, false, CIMPropertyList(), "B : A\nuint8 Q ()\nuint8 p ()\nuint8 N() ()\n"},
-      {false, false, true, listOf({"P", "k", "Other"}),
+      {true, false, false, nullptr, "B : A\nuint8 Q ()\nuint8 p ()\nuint8 N() ()\n"},
+      {false, false, true, "P k Other",
        "B : A\nuint8 K (A^)\nuint8 p (A)\nuint8 M(uint8 p) (A^)\nuint8 N() (B)\n"},
-      {true, false, true, listOf({"P", "k"}), "B : A\nuint8 p (A)\nuint8 N() (B)\n"},
-      {true, false, true, listOf({}), "B : A\nuint8 N() (B)\n"},
+      {true, false, true, "P k", "B : A\nuint8 p (A)\nuint8 N() (B)\n"},
+      {true, false, true, "", "B : A\nuint8 N() (B)\n"},
   };
   Mof mof;
   ASSERT_TRUE(mof.read(kModel));
   for (const auto& row : cases) {
-    EXPECT_EQ(classText(mof.repository.getClass("Root/Test", "b", row.localOnly, row.qualifiers,
-                                                row.origins, row.list)),
+    std::istringstream stream(row.list != nullptr ? row.list : "");
+    Array<CIMName> list;
+    for (std::string name; stream >> name;) list.append(CIMName(name.c_str()));
+    EXPECT_EQ(classText(mof.repository.getClass(
+                  "Root/Test", "b", row.localOnly, row.qualifiers, row.origins,
+                  row.list == nullptr ? CIMPropertyList() : CIMPropertyList(list))),
               row.expected);
   }
 }
@@ -163,19 +153,29 @@ TEST(ClassRepository, ErrorsHaveTheCodesOfTheServer) {
   Mof mof;
   ASSERT_TRUE(mof.read("class A { uint8 P; };"));
   cimhost::ClassRepository& repository = mof.repository;
-  const auto fetch = [&](const CIMNamespaceName& ns, const CIMName& name) {
-    return errorOf([&] { repository.getClass(ns, name, false, true, true, CIMPropertyList()); });
+  const struct {
+    std::function<void()> action;
+    const char* error;
+  } cases[] = {
+      {[&] { mof.get("Nope"); }, "6:Nope"},
+      {[&] { mof.get("A", "root/None"); }, "3:root/None"},
+      {[&] { mof.get("A", CIMNamespaceName()); }, "3:"},
+      {[&] { repository.subclassNames(kNamespace, "Nope", true); }, "6:Nope"},
+      {[&] { repository.subclassNames("none", CIMName(), true); }, "3:none"},
+      {[&] { repository.addClass("none", CIMClass("B")); }, "3:none"},
+      {[&] { repository.addClass(kNamespace, CIMClass("a")); }, "11:a"},
+      {[&] { repository.addClass(kNamespace, CIMClass("B", "C")); }, "10:C"},
+      {[&] { repository.addNamespace(CIMNamespaceName()); }, "3:"},
   };
-  EXPECT_EQ(fetch(kNamespace, "Nope"), "6:Nope");
-  EXPECT_EQ(fetch(kNamespace, CIMName()), "6:");
-  EXPECT_EQ(fetch("root/None", "A"), "3:root/None");
-  EXPECT_EQ(fetch(CIMNamespaceName(), "A"), "3:");
-  EXPECT_EQ(errorOf([&] { repository.subclassNames(kNamespace, "Nope", true); }), "6:Nope");
-  EXPECT_EQ(errorOf([&] { repository.subclassNames("none", CIMName(), true); }), "3:none");
-  EXPECT_EQ(errorOf([&] { repository.addClass("none", CIMClass("B")); }), "3:none");
-  EXPECT_EQ(errorOf([&] { repository.addClass(kNamespace, CIMClass("a")); }), "11:a");
-  EXPECT_EQ(errorOf([&] { repository.addClass(kNamespace, CIMClass("B", "C")); }), "10:C");
-  EXPECT_EQ(errorOf([&] { repository.addNamespace(CIMNamespaceName()); }), "3:");
+  for (const auto& row : cases) {
+    try {
+      row.action();
+      ADD_FAILURE() << row.error;
+    } catch (const CIMException& exception) {
+      EXPECT_EQ(std::to_string(exception.getCode()) + ':' + text(exception.getMessage()),
+                row.error);
+    }
+  }
 }
 
 TEST(ClassRepository, ARefusedClassLeavesNoTraceAndTellsThePart) {

@@ -101,16 +101,15 @@ TEST_F(CimXmlTest, Classes) {
                      "<VALUE>TRUE</VALUE></QUALIFIER></PROPERTY><PROPERTY NAME='Text' "
                      "TYPE='string' CLASSORIGIN='Test_Disk'></PROPERTY><METHOD NAME='Format' "
                      "TYPE='uint32' CLASSORIGIN='Test_Base' PROPAGATED='true'></METHOD></CLASS>"));
-  EXPECT_EQ(ask("GetClass", className("ClassName", "Test_Typed")),
-            returned("<CLASS NAME='Test_Typed'><PROPERTY NAME='Name' TYPE='string'><QUALIFIER "
-                     "NAME='Key' TYPE='boolean' OVERRIDABLE='false'><VALUE>TRUE</VALUE>"
-                     "</QUALIFIER></PROPERTY><PROPERTY NAME='Size' TYPE='uint8'><VALUE>5</VALUE>"
-                     "</PROPERTY><METHOD NAME='Take' TYPE='uint32'><PARAMETER NAME='Count' "
-                     "TYPE='uint8'></PARAMETER><PARAMETER.ARRAY NAME='Names' TYPE='string' "
-                     "ARRAYSIZE='2'></PARAMETER.ARRAY><PARAMETER.REFERENCE NAME='Ref' "
-                     "REFERENCECLASS='Test_Disk'></PARAMETER.REFERENCE><PARAMETER.REFARRAY "
-                     "NAME='Refs' REFERENCECLASS='Test_Disk'></PARAMETER.REFARRAY></METHOD>"
-                     "</CLASS>"));
+  EXPECT_THAT(
+      ask("GetClass", className("ClassName", "Test_Typed")),
+      HasSubstr("<PROPERTY NAME='Size' TYPE='uint8'><VALUE>5</VALUE></PROPERTY>"
+                "<METHOD NAME='Take' TYPE='uint32'>"
+                "<PARAMETER NAME='Count' TYPE='uint8'></PARAMETER>"
+                "<PARAMETER.ARRAY NAME='Names' TYPE='string' ARRAYSIZE='2'></PARAMETER.ARRAY>"
+                "<PARAMETER.REFERENCE NAME='Ref' REFERENCECLASS='Test_Disk'></PARAMETER.REFERENCE>"
+                "<PARAMETER.REFARRAY NAME='Refs' REFERENCECLASS='Test_Disk'></PARAMETER.REFARRAY>"
+                "</METHOD></CLASS>"));
   EXPECT_THAT(ask("EnumerateClasses", className("ClassName", "Link_Port")),
               StartsWith("<IRETURNVALUE><CLASS NAME='Link_FastPort' SUPERCLASS='Link_Port'>"));
 }
@@ -173,12 +172,6 @@ TEST_F(CimXmlTest, Namespaces) {
   EXPECT_EQ(with("root/nope", "GetClass"), error(3, "root/nope"));  // before the missing class
 }
 
-TEST_F(CimXmlTest, UserReachesTheProvider) {
-  Request request = intrinsic("EnumerateInstances", className("ClassName", "Test_User"));
-  request.who = "j\xC3\xBCrg";
-  EXPECT_THAT(answer(request).body, HasSubstr("<VALUE>j\xC3\xBCrg</VALUE>"));
-}
-
 TEST_F(CimXmlTest, LargeRepliesComeInPieces) {
   const Request many = intrinsic("EnumerateInstances", className("ClassName", "Test_Many"));
   const Reply reply = answer(many);
@@ -188,15 +181,12 @@ TEST_F(CimXmlTest, LargeRepliesComeInPieces) {
   const Reply left = answer(many, 1);
   EXPECT_EQ(left.pieces, 1u) << "nothing is written for a client that has gone";
   EXPECT_FALSE(left.aborted);
-}
-
-TEST_F(CimXmlTest, FailureAfterTheFirstPieceCutsTheReplyOff) {
-  const Reply reply =
+  const Reply failed =
       answer(intrinsic("EnumerateInstances", className("ClassName", "Test_ManyThrows")));
-  EXPECT_EQ(reply.status, 200);
-  EXPECT_TRUE(reply.aborted);
-  EXPECT_EQ(reply.summary.cimStatus, 1);
-  EXPECT_THAT(reply.body, testing::Not(HasSubstr("</IMETHODRESPONSE>")));
+  EXPECT_EQ(failed.status, 200);
+  EXPECT_TRUE(failed.aborted);
+  EXPECT_EQ(failed.summary.cimStatus, 1);
+  EXPECT_THAT(failed.body, testing::Not(HasSubstr("</IMETHODRESPONSE>")));
 }
 
 }  // namespace

@@ -142,10 +142,13 @@ TEST_F(CimXmlTest, HeadersMayBeWrittenInOtherWays) {
   }
 }
 
-TEST_F(CimXmlTest, OtherEncodings) {
+TEST_F(CimXmlTest, OtherEncodingsAndTheUserReachTheOperations) {
   Request latin = intrinsic("EnumerateInstances", className("ClassName", "M\xFCll"));
   replace(latin.text, "utf-8", "ISO-8859-1");
   EXPECT_EQ(answer(latin).result(), "<ERROR CODE='5' DESCRIPTION='M\xC3\xBCll'/>");
+  Request request = intrinsic("EnumerateInstances", className("ClassName", "Test_User"));
+  request.who = "j\xC3\xBCrg";
+  EXPECT_NE(answer(request).body.find("<VALUE>j\xC3\xBCrg</VALUE>"), std::string::npos);
 }
 
 }  // namespace

@@ -126,14 +126,13 @@ TEST_F(KeptProperty, References) {
 
 // Instances within instances, `depth` of them.
 std::string nestedInstances(int depth) {
-  std::string text = "<INSTANCE CLASSNAME='A'></INSTANCE>";
+  std::string text;
   for (int i = 0; i < depth; ++i) {
-    std::replace(text.begin(), text.end(), '\'', '"');
+    text = "<INSTANCE CLASSNAME=\"A\">" + text + "</INSTANCE>";
     XmlBuffer escaped;
     escaped.appendText(text);
-    text = "<PROPERTY NAME='P' TYPE='string' EmbeddedObject='instance'><VALUE>" +
+    text = "<PROPERTY NAME=\"P\" TYPE=\"string\" EmbeddedObject=\"instance\"><VALUE>" +
            std::string(escaped.view()) + "</VALUE></PROPERTY>";
-    if (i + 1 < depth) text = "<INSTANCE CLASSNAME='A'>" + text + "</INSTANCE>";
   }
   return text;
 }
@@ -183,9 +182,7 @@ class Parameters : public CimXmlTest {
     const std::string result = answer(extrinsic("Take", parameters, "Test_Typed")).result();
     const std::string before = "<RETURNVALUE PARAMTYPE='sint32'><VALUE>7</VALUE></RETURNVALUE>";
     if (result.compare(0, before.size(), before) != 0) return result;
-    const std::size_t target = result.find(
-        "<PARAMVALUE NAME='Target' PARAMTYPE='reference'><VALUE.REFERENCE><INSTANCEPATH>");
-    return result.substr(before.size(), target - before.size());
+    return result.substr(before.size(), result.find("<PARAMVALUE NAME='Target'") - before.size());
   }
 };
 
