@@ -61,7 +61,7 @@ TEST(Registration, OneCapabilityForEachClassAndSetOfProviderTypes) {
        {{"root/a", "A", kPlain}, {"root/b", "A", kMethods}, {"root/c", "A", kPlain}},
        {"A: A in root/a root/c", "root/b:A: A in root/b; methods"}},
       {"class and association at once",
-       {{"root/a", "L", kMethods}, {"root/a", "L", kAssociation}},
+       {{"root/a", "L", kAssociation}, {"root/a", "L", kMethods}, {"root/a", "L", kPlain}},
        {"L: L in root/a; association; methods"}},
       {"without a namespace: where it is declared",
        {{"", "A", kMethods}},
