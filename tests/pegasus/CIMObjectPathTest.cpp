@@ -169,7 +169,7 @@ TEST(CIMObjectPath, RefusesBadHosts) {
 TEST(CIMObjectPath, Compares) {
   const std::tuple<const char*, const char*, bool> cases[] = {
       {"A.a=1,b=2", "A.b=2,a=1", true},
-      {"//h/root:A", "//H/ROOT:a", true},
+      {"//h/root:AZ", "//H/ROOT:az", true},
       {"C.r=\"A.k=1\"", "C.r=\"a.K=0x1\"", true},
       {"root:A.a=1", "A.a=1", false},
       {"//h:5988/root:A", "//h/root:A", false},

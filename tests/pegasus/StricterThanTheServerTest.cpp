@@ -130,9 +130,11 @@ TEST(ObjectText, IsEscaped) {
   CIMMethod method(CIMName("Run"), CIMTYPE_UINT32);
   method.addParameter(CIMParameter(CIMName("In"), CIMTYPE_UINT8, true));
   method.addQualifier(CIMQualifier(CIMName("q"), Boolean(true)));
+  cls.addQualifier(CIMQualifier(CIMName("r"), CIMValue(CIMTYPE_STRING, false)));
   cls.addMethod(method);
   EXPECT_EQ(text(CIMObject(cls).toString()),
-            "<CLASS NAME=\"A\"><METHOD NAME=\"Run\" TYPE=\"uint32\">"
+            "<CLASS NAME=\"A\"><QUALIFIER NAME=\"r\" TYPE=\"string\"></QUALIFIER><METHOD "
+            "NAME=\"Run\" TYPE=\"uint32\">"
             "<QUALIFIER NAME=\"q\" TYPE=\"boolean\"><VALUE>TRUE</VALUE></QUALIFIER>"
             "<PARAMETER NAME=\"In\" TYPE=\"uint8\" ARRAY=\"true\"></PARAMETER></METHOD></CLASS>");
 }

@@ -56,6 +56,7 @@ TEST(StringUtf8, RefusesMalformedText) {
       {"a\xE9z", "1 is not valid UTF-8 encoding: a 0xE9 0x7A"},
       {"ab\xFF", "2 is not valid UTF-8 encoding: ab 0xFF"},
       {"\xC0\x80", "0 is not valid UTF-8 encoding:  0xC0 0x80"},
+      {"\x84\x80\x80\x80", "0 is not valid UTF-8 encoding:  0x84 0x80 0x80 0x80"},
       {"\xF0\x8F\xBF\xBF", "0 is not valid UTF-8 encoding:  0xF0 0x8F 0xBF 0xBF"},
       {"\xF4\x90\x80\x80", "0 is not valid UTF-8 encoding:  0xF4 0x90 0x80 0x80"},
       {"\xF8\x88\x80\x80\x80", "0 is not valid UTF-8 encoding:  0xF8 0x88 0x80 0x80 0x80"},
