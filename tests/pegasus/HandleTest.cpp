@@ -2,8 +2,11 @@
 #include <Pegasus/Common/CIMClass.h>
 #include <Pegasus/Common/CIMParamValue.h>
 
+#include <atomic>
+#include <thread>
 #include <type_traits>
 #include <utility>
+#include <vector>
 
 #include "PegasusText.h"
 
@@ -93,6 +96,39 @@ TEST(Clones, AHandleFromAfterTheCloneChangesItsSideOnly) {
     EXPECT_EQ(number(changed.getMethod(0).getParameter(0).getQualifier(0)), 2u);
     EXPECT_TRUE(other.identical(makeClass()));
     EXPECT_FALSE(changed.identical(other));
+  }
+}
+
+/// Changes every kind of element of a clone; true when the result is as expected.
+bool changesAlone(CIMClass cls, Uint32 to) {
+  cls.getProperty(0).setValue(to);
+  cls.getProperty(0).getQualifier(0).setValue(to);
+  CIMQualifier q = cls.getMethod(0).getParameter(0).getQualifier(0);
+  q.setValue(to);
+  const CIMConstClass next = cls.clone();
+  q.setValue(Uint32(0));
+  return number(next.getProperty(0)) == to && number(next.getProperty(0).getQualifier(0)) == to &&
+         number(next.getMethod(0).getParameter(0).getQualifier(0)) == to;
+}
+
+// For the thread sanitizer, too.
+TEST(Clones, AreIndependentFromTheFirstInSeveralThreads) {
+  for (int round = 0; round < 40; ++round) {
+    // Fresh, so that the threads race for the very first clone.
+    const CIMClass shared = makeClass();
+    std::atomic<int> good{0};
+    std::vector<std::thread> threads;
+    for (Uint32 t = 0; t < 3; ++t) {
+      threads.emplace_back([&, t] {
+        for (Uint32 i = 0; i < 10; ++i) {
+          good += changesAlone(shared.clone(), t * 100 + i);
+          good += number(shared.getProperty(0).getQualifier(1)) == 1;
+        }
+      });
+    }
+    for (std::thread& thread : threads) thread.join();
+    EXPECT_EQ(good, 60);
+    EXPECT_TRUE(shared.identical(makeClass()));
   }
 }
 

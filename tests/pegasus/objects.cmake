@@ -6,7 +6,6 @@ commonprovider_test(pegasus_objects_test
     "$<$<STREQUAL:${CIM_API},embedded>:${embedded_only}>"
     CIMValueTest.cpp
     CloneModelTest.cpp
-    CloneThreadsTest.cpp
     HandleTest.cpp
     ObjectRulesTest.cpp
     OperationContextTest.cpp

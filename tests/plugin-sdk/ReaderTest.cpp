@@ -76,6 +76,39 @@ TEST(Reader, TellsTheLengthOfATextWithANul) {
   EXPECT_EQ(number, 5);
 }
 
+TEST(Reader, AnItemOfAnotherKindStays) {
+  const std::string items[] = {words({CP_INT, 5}), words({CP_STRING, 4}) + "five\0"s,
+                               words({CP_INT_ARRAY, 3, 0, 5, 0, 6, 0, 7}),
+                               words({CP_STRING_ARRAY, 1, 1, 4}) + "five\0"s, words({99})};
+  const auto ask = [](int asked, cp_reader* reader) {
+    cp_item item;
+    const char* text = nullptr;
+    int number = 0;
+    return asked == CP_INT      ? cp_next_int(reader, &number)
+           : asked == CP_STRING ? cp_next_string(reader, &text)
+                                : cp_next_of(reader, static_cast<cp_kind>(asked), &item);
+  };
+  for (int asked = 0; asked < 4; ++asked) {
+    for (int given = 0; given < 5; ++given) {
+      Buffer buffer(items[given]);
+      EXPECT_EQ(ask(asked, &buffer.reader), given == 4       ? CP_END
+                                            : asked == given ? CP_OK
+                                                             : CP_WRONG_KIND)
+          << asked << given;
+      EXPECT_EQ(buffer.reader.at == buffer.bytes.get(), asked != given);
+    }
+  }
+  for (const size_t capacity : {2u, 3u}) {
+    Buffer buffer(items[CP_INT_ARRAY]);
+    int numbers[3];
+    size_t count = 0;
+    EXPECT_EQ(cp_next_ints(&buffer.reader, numbers, capacity, &count),
+              capacity == 3 ? CP_OK : CP_NO_SPACE);
+    EXPECT_EQ(count, capacity == 3 ? 3u : 0u);
+    EXPECT_EQ(buffer.reader.at == buffer.bytes.get(), capacity == 2);
+  }
+}
+
 // Items of random tags, lengths and counts: whatever comes, reading ends and stays inside.
 TEST(Reader, StaysInTheBufferWhateverItHolds) {
   std::mt19937 random(20260131);

@@ -11,8 +11,6 @@
 
 namespace {
 
-using Value = const ProviderDefValue&;
-
 // The parameter is the language in which the plug-in was compiled.
 class RoundTrip : public testing::TestWithParam<const char*> {
  protected:
@@ -60,17 +58,6 @@ TEST_P(RoundTrip, WhatDoesNotFitAListEndsIt) {
   EXPECT_EQ(exec("echo", over), "0 7; 3 {}; 0 8; -> 0") << "only the element is left out";
 }
 
-TEST_P(RoundTrip, ResultsFillTheBufferAndNoMore) {
-  const auto expectLast = [this](const char* name, const char* type, int most, Value full,
-                                 Value none) {
-    EXPECT_EQ(valueText(function(name, type).get(most)), valueText(full));
-    EXPECT_EQ(valueText(function(name, type).get(most + 1)), valueText(none));
-  };
-  expectLast("textOf", "getSi", 1023, std::string(1023, 'x'), "");
-  expectLast("intsOf", "getAIi", 127, Ints(127), Ints());
-  expectLast("stringsOf", "getASi", 974, Texts{std::string(974, 'x'), ""}, Texts());
-}
-
 TEST_P(RoundTrip, AddedTextsComeBack) {
   const auto echo = [this](const Texts& texts) {
     return function("echoStrings", "getASv").get(ProviderDefValue(texts)).getStringArray();
@@ -79,26 +66,6 @@ TEST_P(RoundTrip, AddedTextsComeBack) {
   EXPECT_EQ(echo({}), Texts());
   EXPECT_EQ(echo({"", "a", ""}), (Texts{"", "a", ""}));
   EXPECT_EQ(echo({half, half, "y"}), (Texts{half, "y"})) << "what does not fit is left out";
-}
-
-TEST_P(RoundTrip, AListWithoutAnEndMarkIsRead) {
-  const Values list{7, "ab", Ints{1, 2}, Texts{"c", ""}};
-  EXPECT_EQ(function("kindsOf", "getAIv").get(list).getIntArray(), (Ints{0, 1, 2, 3}));
-}
-
-TEST_P(RoundTrip, AnItemOfAnotherKindStays) {
-  const std::pair<const char*, ProviderDefValue> kinds[] = {
-      {"i", 5}, {"s", "five"}, {"I", Ints{5, 6, 7}}, {"S", Texts{"five"}}};
-  for (const auto& [asked, unused] : kinds) {
-    for (const auto& [given, value] : kinds) {
-      EXPECT_EQ(function("nextOf", "execBw").exec(asked, Values{value}),
-                asked == given ? CP_OK : CP_WRONG_KIND)
-          << asked << given;
-    }
-    EXPECT_EQ(function("nextOf", "execBw").exec(asked, Values()), CP_END);
-  }
-  EXPECT_EQ(function("nextOf", "execBw").exec("t", Values{Ints{5, 6, 7}}), CP_NO_SPACE);
-  EXPECT_EQ(function("nextOf", "execBw").exec("t", Values{Ints{5, 6}}), CP_OK);
 }
 
 }  // namespace

@@ -50,6 +50,25 @@ TEST(Writer, LaysResultsAsTheProviderReadsThem) {
   EXPECT_EQ(ints.written(), words({2, 2, 0, 7, 0, -1}));
   EXPECT_EQ(cp_return_strings(&texts.bytes[0], kTexts, 2), CP_OK);
   EXPECT_EQ(texts.written(), kPackedTexts);
+
+  // They fill a buffer to its end, or are empty.
+  EXPECT_EQ(cp_return_string(&text.bytes[0], std::string(1023, 'x').c_str()), CP_OK);
+  EXPECT_EQ(text.written(), std::string(1023, 'x') + "\0"s);
+  EXPECT_EQ(cp_return_string(&text.bytes[0], std::string(1024, 'x').c_str()), CP_NO_SPACE);
+  EXPECT_EQ(text.bytes[0], '\0');
+  for (const int count : {127, 128}) {
+    const std::vector<int> numbers(128, 5);
+    const bool fits = count == 127;
+    EXPECT_EQ(cp_return_ints(&ints.bytes[0], numbers.data(), static_cast<size_t>(count)),
+              fits ? CP_OK : CP_NO_SPACE);
+    EXPECT_EQ(ints.written().substr(0, 8), words({2, fits ? 127 : 0}));
+  }
+  for (const size_t length : {974u, 975u}) {
+    const std::string first(length, 'x');
+    const char* const two[] = {first.c_str(), ""};
+    EXPECT_EQ(cp_return_strings(&texts.bytes[0], two, 2), length == 974 ? CP_OK : CP_NO_SPACE);
+    EXPECT_EQ(texts.written().substr(0, 8), words({3, length == 974 ? 2 : 0}));
+  }
 }
 
 TEST(Writer, RefusesWhatDoesNotBelongThere) {

@@ -4,11 +4,6 @@
 
 CP_FUNCTION(execC, echo);
 CP_FUNCTION(execC, echoWhole);
-CP_FUNCTION(execBw, nextOf);
-CP_FUNCTION(getAIv, kindsOf);
-CP_FUNCTION(getSi, textOf);
-CP_FUNCTION(getAIi, intsOf);
-CP_FUNCTION(getASi, stringsOf);
 CP_FUNCTION(getASv, echoStrings);
 
 static void echoElements(cp_reader elements, cp_writer* writer) {
@@ -72,67 +67,6 @@ int echoWhole(void* in, void* out) {
       cp_put_ints(&writer, numbers, count);
     }
   }
-}
-
-/* What cp_next_... of the first item says: `kind` is a letter, i, s, I or S; "t" asks for ints into
-   an array of two. A refused item must still be there: 100 is added where it is not. */
-int nextOf(void* in, const char* kind) {
-  cp_reader reader = cp_read(in);
-  cp_item item;
-  const char* text = "";
-  int numbers[2];
-  size_t count = 0;
-  int status;
-  switch (kind[0]) {
-    case 'i':
-      status = cp_next_int(&reader, numbers);
-      break;
-    case 's':
-      status = cp_next_string(&reader, &text);
-      break;
-    case 't':
-      status = cp_next_ints(&reader, numbers, 2, &count);
-      break;
-    default:
-      status = cp_next_of(&reader, kind[0] == 'I' ? CP_INT_ARRAY : CP_STRING_ARRAY, &item);
-      break;
-  }
-  return status + (status != CP_OK && reader.at != (const char*)in ? 100 : 0);
-}
-
-/* The kinds of the first four items of a list without an end mark. */
-int kindsOf(void* out, void* arg) {
-  cp_reader reader = cp_read(arg);
-  cp_writer writer = cp_write_ints(out);
-  cp_item item;
-  int i;
-  for (i = 0; i < 4 && cp_next(&reader, &item) == CP_OK; ++i) cp_add_int(&writer, item.kind);
-  return 0;
-}
-
-/* `length` bytes */
-int textOf(void* out, int length) {
-  char text[2 * CP_BUFFER_SIZE];
-  memset(text, 'x', (size_t)length);
-  text[length] = '\0';
-  return cp_return_string(out, text);
-}
-
-/* `count` zeros */
-int intsOf(void* out, int count) {
-  static int zeros[2 * CP_BUFFER_SIZE];
-  return cp_return_ints(out, zeros, (size_t)count);
-}
-
-/* Two strings, of `length` bytes and of none. */
-int stringsOf(void* out, int length) {
-  char text[2 * CP_BUFFER_SIZE];
-  const char* texts[2];
-  memset(text, 'x', (size_t)length);
-  text[length] = '\0';
-  texts[0] = text;
-  texts[1] = text + length;
-  return cp_return_strings(out, texts, 2);
 }
 
 /* Leaves out what does not fit. */
