@@ -13,9 +13,8 @@ struct TestTable {
 struct TestPluginState {
   struct TestTable left;
   struct TestTable right;
-  int numbers[TEST_ITEMS]; /* of number() by index; also the elements of numbers() */
-  int numbersCount;
-  int calls;                    /* of getters, instance counts apart */
+  int numbers[TEST_ITEMS];      /* of number() by index; numbers() has two of them, and more */
+  int calls;                    /* of leftText() and rightText() */
   char record[4 * TEST_BUFFER]; /* one line for each setter and method call */
   char output[TEST_BUFFER];     /* the output list of run() */
   int result;                   /* of run() */
