@@ -16,11 +16,7 @@ struct LogCase {
   std::vector<Line> lines;  ///< In the order of the log.
 };
 
-std::ostream& operator<<(std::ostream& out, const LogCase& given) {
-  return out << given.name;
-}
-
-class Log : public LinkTest, public testing::WithParamInterface<LogCase> {
+class Log : public LinkTest {
  protected:
   void SetUp() override {
     LinkTest::SetUp();
@@ -39,78 +35,74 @@ class Log : public LinkTest, public testing::WithParamInterface<LogCase> {
   }
 };
 
-TEST_P(Log, HasTheLinesOfItsLevelInOrder) {
-  for (int level = 6; level <= 9; ++level) {
-    std::filesystem::remove(tree.logs() / "CommonProvider.log");
-    const LogLevel set(level);
-    GetParam().operation(*this);
-    const std::string log = tree.log();
-    size_t from = 0;
-    for (const auto& [atLevel, text] : GetParam().lines) {
-      const size_t found = log.find(text, from);
-      EXPECT_EQ(found != std::string::npos, level >= atLevel) << level << " " << text << log;
-      if (found != std::string::npos) from = found + std::char_traits<char>::length(text);
+TEST_F(Log, HasTheLinesOfEachLevelInOrder) {
+  const LogCase cases[] = {
+      {"Enumerate",
+       [](ProviderTest& test) { test.enumerate("root/t:T_Full"); },
+       {{8, "CommonProvider:enumerateInstances T_Full Entry\n"},
+        {8, "CommonProvider:ProviderDefClass found\n"},
+        {9, "CommonProvider: for each instance 0\n"},
+        {9, "getClass - ns:root/t, classname:T_Full\n"},
+        {9, "number of properties is 3\n"},
+        {9, "CommonProvider: for each property 0\n"},
+        {9, "CommonProvider: end of a property process Other\n"},
+        {9, "CommonProvider: ProviderDefProperty found When\n"},
+        {9, "DATE TIME: 20260101120000.000000+060\n"},
+        {9, "CommonProvider: for each property 2\n"},
+        {9, "Adding String property value:n 0\n"},
+        {9, "CommonProvider: end of a property process Name\n"},
+        {9, "delever instances: root/t:T_Full.Name=\"n 0\"\n"},
+        {9, "CommonProvider:End of ProviderDefClass process\n"}}},
+      {"Association",
+       [](ProviderTest& test) { test.enumerate("root/t:T_Link"); },
+       {{9, "CommonProvider:End of ProviderDefClass process\n"},
+        {9, "CommonProvider:ProviderDefAssociation found\n"},
+        {9, "Source Instances T_Item: 1\n"},
+        {7, "enumerateInstances in CommonProvider:enumerateInstances T_Volume Entry\n"},
+        {9, "Source Instances T_Volume: 2\n"},
+        {8, "getPropertyValues: Property - Owner\n"},
+        {8, "getPropertyValue : Class Owner, Value a\n"},
+        {8, "getPropertyValues: Property - Name\n"},
+        {8, "getPropertyValue : Class Name, Value a\n"},
+        {9, "delever instances: root/t:T_Link.Item="},
+        {9, "CommonProvider:End of ProviderDefAssociation process\n"}}},
+      {"Modify",
+       [](ProviderTest& test) { test.modify("root/t:T_Full.Name=\"n 0\"", {}); },
+       {{8, "CommonProvider:modifyInstances T_Full Entry\n"},
+        {9, "getClass - ns:root/t, classname:T_Full\n"},
+        {9, "number of properties is 3\n"},
+        {9, "CommonProvider: for each property 2\n"},
+        {9, "CommonProvider: ProviderDefProperty found Name\n"}}},
+      {"Method",
+       [](ProviderTest& test) { test.invoke("root/t:T_Full", "Run"); },
+       {{8, "CommonProvider:invokeMethod T_Full Entry\n"},
+        {8, "CommonProvider:ProviderDefClass found\n"},
+        {9, "getClass - ns:root/t, classname:T_Full\n"}}},
+      {"Names",
+       [](ProviderTest& test) { test.associatorNames("//h/root/t:T_Item.Name=\"a\"", "T_Link"); },
+       {{7, "associatorNames : object: T_Item.Name=\"a\", association : T_Link, result : "},
+        {8, "ProviderDefAssociation found\n"},
+        {8, "Result class is : T_Volume"},
+        {8, "Source instances enumerated\n"},
+        {7, "EnumerateInstances in associatorNames : object: T_Volume"},
+        {8, "Target instances enumerated\n"},
+        {8, "Number of associated instance is : 2\n"}}}};
+  for (const LogCase& each : cases) {
+    for (int level = 6; level <= 9; ++level) {
+      SCOPED_TRACE(each.name + (" at level " + std::to_string(level)));
+      std::filesystem::remove(tree.logs() / "CommonProvider.log");
+      const LogLevel set(level);
+      each.operation(*this);
+      const std::string log = tree.log();
+      size_t from = 0;
+      for (const auto& [atLevel, text] : each.lines) {
+        const size_t found = log.find(text, from);
+        EXPECT_EQ(found != std::string::npos, level >= atLevel) << text << log;
+        if (found != std::string::npos) from = found + std::char_traits<char>::length(text);
+      }
     }
   }
 }
-
-INSTANTIATE_TEST_SUITE_P(
-    Operations, Log,
-    testing::Values(
-        LogCase{"Enumerate",
-                [](ProviderTest& test) { test.enumerate("root/t:T_Full"); },
-                {{8, "CommonProvider:enumerateInstances T_Full Entry\n"},
-                 {8, "CommonProvider:ProviderDefClass found\n"},
-                 {9, "CommonProvider: for each instance 0\n"},
-                 {9, "getClass - ns:root/t, classname:T_Full\n"},
-                 {9, "number of properties is 3\n"},
-                 {9, "CommonProvider: for each property 0\n"},
-                 {9, "CommonProvider: end of a property process Other\n"},
-                 {9, "CommonProvider: ProviderDefProperty found When\n"},
-                 {9, "DATE TIME: 20260101120000.000000+060\n"},
-                 {9, "CommonProvider: for each property 2\n"},
-                 {9, "Adding String property value:n 0\n"},
-                 {9, "CommonProvider: end of a property process Name\n"},
-                 {9, "delever instances: root/t:T_Full.Name=\"n 0\"\n"},
-                 {9, "CommonProvider:End of ProviderDefClass process\n"}}},
-        LogCase{"Association",
-                [](ProviderTest& test) { test.enumerate("root/t:T_Link"); },
-                {{9, "CommonProvider:End of ProviderDefClass process\n"},
-                 {9, "CommonProvider:ProviderDefAssociation found\n"},
-                 {9, "Source Instances T_Item: 1\n"},
-                 {7, "enumerateInstances in CommonProvider:enumerateInstances T_Volume Entry\n"},
-                 {9, "Source Instances T_Volume: 2\n"},
-                 {8, "getPropertyValues: Property - Owner\n"},
-                 {8, "getPropertyValue : Class Owner, Value a\n"},
-                 {8, "getPropertyValues: Property - Name\n"},
-                 {8, "getPropertyValue : Class Name, Value a\n"},
-                 {9, "delever instances: root/t:T_Link.Item="},
-                 {9, "CommonProvider:End of ProviderDefAssociation process\n"}}},
-        LogCase{"Modify",
-                [](ProviderTest& test) { test.modify("root/t:T_Full.Name=\"n 0\"", {}); },
-                {{8, "CommonProvider:modifyInstances T_Full Entry\n"},
-                 {9, "getClass - ns:root/t, classname:T_Full\n"},
-                 {9, "number of properties is 3\n"},
-                 {9, "CommonProvider: for each property 2\n"},
-                 {9, "CommonProvider: ProviderDefProperty found Name\n"}}},
-        LogCase{"Method",
-                [](ProviderTest& test) { test.invoke("root/t:T_Full", "Run"); },
-                {{8, "CommonProvider:invokeMethod T_Full Entry\n"},
-                 {8, "CommonProvider:ProviderDefClass found\n"},
-                 {9, "getClass - ns:root/t, classname:T_Full\n"}}},
-        LogCase{
-            "Names",
-            [](ProviderTest& test) {
-              test.associatorNames("//h/root/t:T_Item.Name=\"a\"", "T_Link");
-            },
-            {{7, "associatorNames : object: T_Item.Name=\"a\", association : T_Link, result : "},
-             {8, "ProviderDefAssociation found\n"},
-             {8, "Result class is : T_Volume"},
-             {8, "Source instances enumerated\n"},
-             {7, "EnumerateInstances in associatorNames : object: T_Volume"},
-             {8, "Target instances enumerated\n"},
-             {8, "Number of associated instance is : 2\n"}}}),
-    [](const auto& given) { return given.param.name; });
 
 using MapLog = ProviderTest;
 
