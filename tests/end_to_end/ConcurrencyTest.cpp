@@ -19,13 +19,13 @@ constexpr int kClients = 8;
 constexpr int kReloads = 5;
 
 const std::string kNamespace =
-    "<LOCALNAMESPACEPATH><NAMESPACE NAME=\"root\"/><NAMESPACE NAME=\"compare\"/>"
+    "<LOCALNAMESPACEPATH><NAMESPACE NAME='root'/><NAMESPACE NAME='compare'/>"
     "</LOCALNAMESPACEPATH>";
 
 std::string message(const std::string& method, const std::string& object, const std::string& call) {
   const std::string body =
-      "<?xml version=\"1.0\" encoding=\"utf-8\"?>\n<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\">"
-      "<MESSAGE ID=\"1\" PROTOCOLVERSION=\"1.0\"><SIMPLEREQ>" +
+      "<?xml version='1.0' encoding='utf-8'?>\n<CIM CIMVERSION='2.0' DTDVERSION='2.0'>"
+      "<MESSAGE ID='1' PROTOCOLVERSION='1.0'><SIMPLEREQ>" +
       call + "</SIMPLEREQ></MESSAGE></CIM>";
   return "POST /cimom HTTP/1.1\r\nHost: localhost\r\nContent-Type: application/xml\r\n"
          "CIMOperation: MethodCall\r\nCIMMethod: " +
@@ -34,22 +34,21 @@ std::string message(const std::string& method, const std::string& object, const 
 }
 
 std::string operation(const std::string& name, const std::string& parameters) {
-  return message(
-      name, "root%2Fcompare",
-      "<IMETHODCALL NAME=\"" + name + "\">" + kNamespace + parameters + "</IMETHODCALL>");
+  return message(name, "root%2Fcompare",
+                 "<IMETHODCALL NAME='" + name + "'>" + kNamespace + parameters + "</IMETHODCALL>");
 }
 
 std::string parameter(const std::string& name, const std::string& content) {
-  return "<IPARAMVALUE NAME=\"" + name + "\">" + content + "</IPARAMVALUE>";
+  return "<IPARAMVALUE NAME='" + name + "'>" + content + "</IPARAMVALUE>";
 }
 
 std::string className(const std::string& name) {
-  return parameter("ClassName", "<CLASSNAME NAME=\"" + name + "\"/>");
+  return parameter("ClassName", "<CLASSNAME NAME='" + name + "'/>");
 }
 
 std::string path(const std::string& className, const std::string& key) {
-  return "<INSTANCENAME CLASSNAME=\"" + className + "\"><KEYBINDING NAME=\"Name\"><KEYVALUE>" +
-         key + "</KEYVALUE></KEYBINDING></INSTANCENAME>";
+  return "<INSTANCENAME CLASSNAME='" + className + "'><KEYBINDING NAME='Name'><KEYVALUE>" + key +
+         "</KEYVALUE></KEYBINDING></INSTANCENAME>";
 }
 
 struct Exchange {
@@ -75,10 +74,10 @@ Exchange exchange(std::size_t client, int number) {
               "<VALUE>" + part + "</VALUE>"};
     case 2:
       return {message("Echo", "root%2Fcompare%3ACmp_Element",
-                      "<METHODCALL NAME=\"Echo\"><LOCALCLASSPATH>" + kNamespace +
-                          "<CLASSNAME NAME=\"Cmp_Element\"/></LOCALCLASSPATH>"
-                          "<PARAMVALUE NAME=\"In0\"><VALUE>TRUE</VALUE></PARAMVALUE>"
-                          "<PARAMVALUE NAME=\"In1\"><VALUE>" +
+                      "<METHODCALL NAME='Echo'><LOCALCLASSPATH>" + kNamespace +
+                          "<CLASSNAME NAME='Cmp_Element'/></LOCALCLASSPATH>"
+                          "<PARAMVALUE NAME='In0'><VALUE>TRUE</VALUE></PARAMVALUE>"
+                          "<PARAMVALUE NAME='In1'><VALUE>" +
                           value + "</VALUE></PARAMVALUE></METHODCALL>"),
               "<VALUE>" + value + "</VALUE>"};
     case 3:
