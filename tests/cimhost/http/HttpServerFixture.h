@@ -8,7 +8,6 @@
 
 #include <algorithm>
 #include <atomic>
-#include <condition_variable>
 #include <deque>
 #include <functional>
 #include <mutex>
@@ -22,24 +21,11 @@ inline std::string post(const std::string& body, const std::string& headers = ""
          "Content-Length: " + std::to_string(body.size()) + "\r\n\r\n" + body;
 }
 
-/// Something that a test opens and others wait for.
-class Latch {
- public:
-  void open() {
-    const std::lock_guard<std::mutex> lock(mutex_);
-    open_ = true;
-    changed_.notify_all();
-  }
-  void wait() {
-    std::unique_lock<std::mutex> lock(mutex_);
-    changed_.wait(lock, [this] { return open_; });
-  }
-
- private:
-  std::mutex mutex_;
-  std::condition_variable changed_;
-  bool open_ = false;
-};
+/// Polls until `done`, within the time of patience.
+template <class Done>
+void await(Done done) {
+  for (int i = 0; i < HttpClient::kPatience && !done(); ++i) usleep(1000);
+}
 
 /// A server on a free port whose handler does what the request's body says: `size=N` a reply of N
 /// bytes, `abort` an aborted one behind 2,000,000 bytes, `wait` waits for `go`; else the
@@ -47,7 +33,7 @@ class Latch {
 class HttpServerTest : public testing::Test {
  protected:
   ~HttpServerTest() override {
-    go.open();
+    go = true;
     // It logs into the other members.
     server.reset();
   }
@@ -61,7 +47,6 @@ class HttpServerTest : public testing::Test {
         [this](const cimhost::RequestRecord& record) {
           const std::lock_guard<std::mutex> lock(mutex_);
           records_.push_back(record);
-          changed_.notify_all();
         });
     return *server;
   }
@@ -72,32 +57,30 @@ class HttpServerTest : public testing::Test {
 
   /// Waits until the log has `count` records.
   std::vector<cimhost::RequestRecord> records(std::size_t count) {
-    std::unique_lock<std::mutex> lock(mutex_);
-    changed_.wait_for(lock, std::chrono::seconds(20), [&] { return records_.size() >= count; });
-    return records_;
+    const auto logged = [this] {
+      const std::lock_guard<std::mutex> lock(mutex_);
+      return records_;
+    };
+    await([&] { return logged().size() >= count; });
+    return logged();
   }
   /// Waits until `count` requests have reached the handler.
-  void waitForCalls(int count) {
-    std::unique_lock<std::mutex> lock(mutex_);
-    changed_.wait_for(lock, std::chrono::seconds(20), [&] { return calls_ >= count; });
+  void waitForCalls(int count) const {
+    await([&] { return calls_ >= count; });
   }
   int calls() const { return calls_; }
   std::size_t written() const { return written_; }
 
   cimhost::HttpSettings settings;
-  Latch go;
+  std::atomic<bool> go{false};
   std::unique_ptr<cimhost::HttpServer> server;
 
  private:
   cimhost::RequestSummary handle(const cimhost::CimXmlRequest& request,
                                  cimhost::ReplyStream& reply) {
     const std::string body(request.body());
-    {
-      const std::lock_guard<std::mutex> lock(mutex_);
-      ++calls_;
-      changed_.notify_all();
-    }
-    if (body == "wait") go.wait();
+    ++calls_;
+    while (body == "wait" && !go) usleep(1000);
     reply.begin(200, {{"Content-Type", "application/xml"}, {"CIMOperation", "MethodResponse"}});
     if (body.rfind("size=", 0) == 0) {
       writeMany(reply, std::strtoul(body.c_str() + 5, nullptr, 10));
@@ -121,7 +104,6 @@ class HttpServerTest : public testing::Test {
   }
 
   std::mutex mutex_;
-  std::condition_variable changed_;
   std::vector<cimhost::RequestRecord> records_;
   std::atomic<int> calls_{0};
   std::atomic<std::size_t> written_{0};

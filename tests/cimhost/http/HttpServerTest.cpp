@@ -149,7 +149,7 @@ TEST_F(HttpServerTest, MoreRequestsThanMayWaitAreTurnedAway) {
   // One of the two waits, the other one does not fit.
   EXPECT_EQ(records(1).at(0).summary.httpStatus, 503);
   EXPECT_EQ(ask(kHealth).status, 200);
-  go.open();
+  go = true;
   EXPECT_EQ(running.receive().status, 200);
   const HttpReply replies[] = {first.receive(), second.receive()};
   EXPECT_EQ(replies[0].status + replies[1].status, 703);
@@ -170,7 +170,7 @@ TEST_F(HttpServerTest, RequestsThatHangHoldNoOthersUp) {
     EXPECT_EQ(others.emplace_back(port()).ask(post("x")).body, ":x");
     EXPECT_EQ(others.front().ask(post("size=1000000")).body.size(), 1000000U);
   }
-  go.open();
+  go = true;
   for (HttpClient& each : hanging) EXPECT_EQ(each.receive().body, ":wait");
 }
 
@@ -204,18 +204,18 @@ TEST(ReplyPipeTest, ReadersAreSlowOnlyWhileTheMakerWaits) {
 }
 
 TEST(WorkerPoolTest, IsFullWhileTasksWaitForOthers) {
-  Latch started;
-  Latch go;
+  std::atomic<bool> started{false};
+  std::atomic<bool> go{false};
   WorkerPool pool(1, 1);
-  EXPECT_TRUE(pool.tryPush([&] { started.open(), go.wait(); }));
+  EXPECT_TRUE(pool.tryPush([&] { started = true, await([&] { return go.load(); }); }));
   EXPECT_FALSE(pool.isFull());
   pool.start({});
-  started.wait();
+  await([&] { return started.load(); });
   EXPECT_FALSE(pool.isFull());
   EXPECT_TRUE(pool.tryPush([] {}));
   EXPECT_TRUE(pool.isFull());
   EXPECT_FALSE(pool.tryPush([] {}));
-  go.open();
+  go = true;
 }
 
 TEST_F(HttpServerTest, SilentConnectionsAreClosed) {
@@ -242,7 +242,7 @@ TEST_F(HttpServerTest, RequestsThatTakeTooLongAreCut) {
   drip.join();
   EXPECT_EQ(calls(), 0);
   EXPECT_EQ(ask(post("wait")).status, 503);
-  go.open();
+  go = true;
   EXPECT_EQ(records(2).at(1).summary.httpStatus, 503);
   EXPECT_EQ(records(2).at(1).note, "took too long");
 }
@@ -273,7 +273,7 @@ TEST_F(HttpServerTest, RunningRequestsEndBeforeTheServerDoes) {
   EXPECT_FALSE(HttpClient(port()).isConnected());
   EXPECT_EQ(idle.ask(kHealth).status, 503);
   EXPECT_FALSE(server->waitUntilIdle(std::chrono::milliseconds(10)));
-  go.open();
+  go = true;
   const HttpReply reply = client.receive();
   EXPECT_EQ(reply.body, ":wait");
   EXPECT_EQ(reply.header("Connection"), "close");
@@ -291,7 +291,7 @@ TEST_F(HttpServerTest, StoppingCutsWhatIsStuck) {
   server->cut();
   EXPECT_EQ(stuck.receive().status, 503);
   EXPECT_FALSE(reading.receive().complete);
-  go.open();
+  go = true;
   server->stop();
   EXPECT_EQ(records(2).size(), 2U);
 }
