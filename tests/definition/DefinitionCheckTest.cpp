@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <string>
+#include <tuple>
 
 #include "definition/DefinitionRegistry.h"
 #include "tests/definition/Reading.h"
@@ -14,7 +15,6 @@
 namespace {
 
 using definition::CheckResult;
-using definition::Problem;
 
 class DefinitionCheck : public Registered {
  protected:
@@ -25,40 +25,34 @@ class DefinitionCheck : public Registered {
 TEST_F(DefinitionCheck, PointsAtTheUnitThatWasFound) {
   const std::string rest =
       ": the rest of the file is not read (module, then classes, then associations)";
-  const struct {
-    std::string text;
-    int line, column;
-    std::string message, source;  // the message's first line
-  } cases[] = {
-      {"<plugin>\n <module name='m'>\n  <class/>\n", 3, 3,
-       "the end of module element missing before: class", "  <class/>"},
-      {"<plugin><module name='m'>\r\n\t text\r\n</module>", 2, 3,
-       "the end of module element missing before: text", "\t text"},
+  // Line, column and first line of the message; the source line.
+  const std::tuple<std::string, std::string, std::string> cases[] = {
+      {"<plugin>\n <module name='m'>\n  <class/>\n",
+       "3:3 the end of module element missing before: class", "  <class/>"},
+      {"<plugin><module name='m'>\r\n\t text\r\n</module>",
+       "2:3 the end of module element missing before: text", "\t text"},
       {"<plugin><module name='m'><functioncall><function name='f' type='getI'/>\n"
-       "<argument type='element'>\n<functioncall><function name='g'/><argument "
-       "type='x'/>",
-       3, 35, "invalid attribute: x", "<functioncall><function name='g'/><argument type='x'/>"},
-      {kClass + "\n<instances/>\n</class>", 3, 1,
-       "constant or functioncall elememt is missing in class element before: class", "</class>"},
-      {"<plugin><module name='m'>\n", 2, 1, "the end of module element missing before: ", ""},
-      {"\n <?xml version='1.0'?>\n" + kModule, 2, 2,
-       "not a definition file: it must begin with the plugin element", " <?xml version='1.0'?>"},
-      {kModule + "\n<association></association>\n<class name='C'/></plugin>", 3, 1,
-       "unexpected class" + rest, "<class name='C'/></plugin>"},
-      {kModule + std::string(300, ' ') + "x</plugin>", 1, 327, "unexpected x" + rest,
+       "<argument type='element'>\n<functioncall><function name='g'/><argument type='x'/>",
+       "3:35 invalid attribute: x", "<functioncall><function name='g'/><argument type='x'/>"},
+      {"<plugin><module name='m'>\n", "2:1 the end of module element missing before: ", ""},
+      {"\n <?xml version='1.0'?>\n" + kModule,
+       "2:2 not a definition file: it must begin with the plugin element",
+       " <?xml version='1.0'?>"},
+      {kModule + "\n<association></association>\n<class name='C'/></plugin>",
+       "3:1 unexpected class" + rest, "<class name='C'/></plugin>"},
+      {kModule + std::string(300, ' ') + "x</plugin>", "1:327 unexpected x" + rest,
        std::string(100, ' ') + "x</plugin>"},
   };
-  for (const auto& c : cases) {
-    SCOPED_TRACE(c.text);
-    TemporaryTree::write("a.xml", c.text);
+  for (const auto& [text, expected, source] : cases) {
+    TemporaryTree::write("a.xml", text);
     const CheckResult result = definition::checkDefinitionFiles({"a.xml"});
     ASSERT_EQ(result.problems.size(), 1u);
-    const Problem& problem = result.problems[0];
+    const auto& problem = result.problems[0];
     EXPECT_EQ(problem.file, "a.xml");
-    EXPECT_EQ(problem.line, c.line);
-    EXPECT_EQ(problem.column, c.column);
-    EXPECT_EQ(problem.message.substr(0, problem.message.find('\n')), c.message);
-    EXPECT_EQ(problem.source, c.source);
+    EXPECT_EQ(std::to_string(problem.line) + ":" + std::to_string(problem.column) + " " +
+                  problem.message.substr(0, problem.message.find('\n')),
+              expected);
+    EXPECT_EQ(problem.source, source);
     EXPECT_EQ(problem.caret, std::min(problem.column, 101));
   }
 }
