@@ -65,7 +65,7 @@ TEST(CompareBindings, BothWays) {
   } cases[] = {
       {"T", "T", true},
       {"T", "T.A=1", false},
-      {"T.A=\"x\"", "T.B=\"x\"", false},
+      {"T.A=\"C.k=1\"", "T.B=\"C.k=1\"", false},
       {"T.A=1,B=2", "T.A=1,B=3", false},
       // References to another place and class, to another key, within a reference.
       {"T.A=\"//h/root/a:C.k=1\"", "T.A=\"root/b:D.K=1\"", true},
