@@ -5,12 +5,9 @@
 namespace fs = std::filesystem;
 
 Deployment::Deployment(CimServer::Providers providers) {
-  std::string name = (fs::temp_directory_path() / "openpegasus-XXXXXX").string();
-  if (mkdtemp(name.data()) == nullptr) throw std::runtime_error("cannot make " + name);
-  root_ = name;
   writeComparedHome(cimhostHome());
-  writeComparedHome(root_ / "server");
-  server_ = std::make_unique<CimServer>(root_ / "server", providers);
+  writeComparedHome(tree_.root() / "server");
+  server_ = std::make_unique<CimServer>(tree_.root() / "server", providers);
   declareAndRegister();
 }
 
@@ -36,17 +33,11 @@ void Deployment::releaseShared() {
   sharedDeployment.reset();
 }
 
-Deployment::~Deployment() {
-  server_.reset();
-  std::error_code ignored;
-  fs::remove_all(root_, ignored);
-}
-
 void Deployment::declareAndRegister() {
   const auto print = [this](const std::string& name, const std::vector<std::string>& command) {
     const ProgramResult result = cimhost(command);
     if (result.code != 0) throw std::runtime_error(result.err);
-    const fs::path file = root_ / name;
+    const fs::path file = tree_.root() / name;
     TemporaryTree::write(file, result.out);
     return file.string();
   };

@@ -14,7 +14,6 @@ class Deployment {
   /// machine runs one server at a time: release it before another deployment is made.
   static Deployment& shared();
   static void releaseShared();
-  ~Deployment();
 
   CimServer& server() { return *server_; }
 
@@ -23,11 +22,11 @@ class Deployment {
   /// A command of the server's client, in the namespace of the classes.
   ProgramResult cimcli(std::vector<std::string> arguments) const;
 
-  std::filesystem::path cimhostHome() const { return root_ / "cimhost"; }
+  std::filesystem::path cimhostHome() const { return tree_.root() / "cimhost"; }
 
  private:
   void declareAndRegister();
 
-  std::filesystem::path root_;
+  TemporaryTree tree_;
   std::unique_ptr<CimServer> server_;
 };

@@ -30,8 +30,9 @@ static int answer(void* out) {
     body;                                        \
   }
 
-/* The forms i, w and v of a function: `first` is its parameters with a comma at the end. */
-#define FORMS(Result, name, first, body)                                                   \
+/* A function and its forms i, w and v: `first` is its parameters again, with a comma at the end. */
+#define FORMS(Result, name, parameters, first, body)                                       \
+  FUNCTION(Result, name, parameters, body)                                                 \
   FUNCTION(Result, name##i, (first int number), recorder.number = number; body)            \
   FUNCTION(Result, name##w, (first const char* word), keepText(recorder.word, word); body) \
   FUNCTION(Result, name##v, (first const void* extra), keepBuffer(recorder.extra, extra); body)
@@ -42,30 +43,20 @@ static int answer(void* out) {
 #define IN const void *in,
 #define OUT void *out,
 #define IN_OUT const void *in, void *out,
+#define RESULT return recorder.result
 
-FUNCTION(int, setI, (int value), recorder.value = value; return recorder.result)
-FORMS(int, setI, NUMBER, recorder.value = value; return recorder.result)
-FUNCTION(int, setS, (const char* text), keepText(recorder.text, text); return recorder.result)
-FORMS(int, setS, TEXT, keepText(recorder.text, text); return recorder.result)
-FUNCTION(int, setAI, (const void* in), keepBuffer(recorder.in, in); return recorder.result)
-FORMS(int, setAI, IN, keepBuffer(recorder.in, in); return recorder.result)
-FUNCTION(int, setAS, (const void* in), keepBuffer(recorder.in, in); return recorder.result)
-FORMS(int, setAS, IN, keepBuffer(recorder.in, in); return recorder.result)
+FORMS(int, setI, (int value), NUMBER, recorder.value = value; RESULT)
+FORMS(int, setS, (const char* text), TEXT, keepText(recorder.text, text); RESULT)
+FORMS(int, setAI, (const void* in), IN, keepBuffer(recorder.in, in); RESULT)
+FORMS(int, setAS, (const void* in), IN, keepBuffer(recorder.in, in); RESULT)
 
-FUNCTION(int, getI, (void), return recorder.result)
-FORMS(int, getI, NOTHING, return recorder.result)
-FUNCTION(int, getS, (void* out), return answer(out))
-FORMS(int, getS, OUT, return answer(out))
-FUNCTION(int, getAI, (void* out), return answer(out))
-FORMS(int, getAI, OUT, return answer(out))
-FUNCTION(int, getAS, (void* out), return answer(out))
-FORMS(int, getAS, OUT, return answer(out))
-FUNCTION(long, getL, (void), return recorder.longResult)
-FORMS(long, getL, NOTHING, return recorder.longResult)
+FORMS(int, getI, (void), NOTHING, RESULT)
+FORMS(int, getS, (void* out), OUT, return answer(out))
+FORMS(int, getAI, (void* out), OUT, return answer(out))
+FORMS(int, getAS, (void* out), OUT, return answer(out))
+FORMS(long, getL, (void), NOTHING, return recorder.longResult)
 
-FUNCTION(int, execA, (void), return recorder.result)
-FORMS(int, execA, NOTHING, return recorder.result)
-FUNCTION(int, execB, (const void* in), keepBuffer(recorder.in, in); return recorder.result)
-FORMS(int, execB, IN, keepBuffer(recorder.in, in); return recorder.result)
-FUNCTION(int, execC, (const void* in, void* out), keepBuffer(recorder.in, in); return answer(out))
-FORMS(int, execC, IN_OUT, keepBuffer(recorder.in, in); return answer(out))
+FORMS(int, execA, (void), NOTHING, RESULT)
+FORMS(int, execB, (const void* in), IN, keepBuffer(recorder.in, in); RESULT)
+FORMS(int, execC, (const void* in, void* out), IN_OUT, keepBuffer(recorder.in, in);
+      return answer(out))
