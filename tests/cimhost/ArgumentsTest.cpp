@@ -172,10 +172,11 @@ TEST(PathArgument, MalformedOnesAreReportedWithTheirColumn) {
        "object path, column 12: invalid key-value pair, missing quote in key value\n"
        "  root:A.a=1,b=\"x\n"
        "             ^"},
-      {parseInstancePath, "root:A.a=\"x,y\",b", 16, "equal sign"},
+      {parseInstancePath, "root:A.a=\"x\\\",y\",b", 18, "equal sign"},
       {parseInstancePath, "root:1A.a=1", 6, "class name 1A"},
       {parseInstancePath, "root:A", 7, "no keys"},
       {parseInstancePath, "A.k=\"x:y\"", 1, "no namespace"},  // the colon is the value's
+      {parseClassPath, "ro ot:A", 1, "namespace"},
       {parseClassPath, "A", 1, "no namespace"},
       {parseClassPath, "//h/root:A", 1, "host"},
       {parseClassPath, "root:A.a=1", 7, "no keys"},

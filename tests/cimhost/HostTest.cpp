@@ -282,6 +282,7 @@ TEST_F(HostTest, WhatAProviderPrintsStaysOutOfTheResults) {
   EXPECT_THAT(out_, testing::Not(HasSubstr("noise")));
   EXPECT_EQ(error_, "noise\n");
   EXPECT_EQ(run("enumerate root/test:Test_Disk >/dev/full"), ExitCode::kOutput);
+  EXPECT_EQ(run("check >/dev/full"), ExitCode::kOutput);
 }
 
 constexpr const char* kRegistration = R"(

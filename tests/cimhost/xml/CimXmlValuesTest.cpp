@@ -43,15 +43,12 @@ TEST_F(KeptProperty, Scalars) {
     const char* returned = sent;
   } cases[] = {
       {"boolean", "true", "TRUE"},
-      {"uint8", "255"},
       {"uint64", "18446744073709551615"},
       {"sint64", "-9223372036854775808"},
       {"real32", "0.1"},
-      {"real32", "16777216.0"},
       {"real64", "3", "3.0"},
       {"real64", "1.7976931348623157e+308"},
       {"real64", "5e-324", "5.0e-324"},
-      {"real64", "1.0E20", "1.0e+20"},
       {"real64", "-0.0"},
       {"real64", "-INF"},
       {"real32", "NaN"},
@@ -61,7 +58,6 @@ TEST_F(KeptProperty, Scalars) {
       {"string", "&#65;&#x20AC;", "A\xE2\x82\xAC"},
       {"string", "\x7F\xC3\xA9\xE2\x82\xAC\xF0\x9F\x98\x80"},
       {"char16", "\xE2\x82\xAC"},
-      {"datetime", "20260131235959.123456-060"},
       {"datetime", "00000001******.******:000"},
   };
   for (const auto& row : cases) {
