@@ -351,9 +351,9 @@ TEST_F(OperationsTest, AssociationFiltersFollowTheDeclarations) {
       {"Test_Disk", filterOf("", "", "Port"), {}},  // the other end
       {"Test_Disk", filterOf("", "", "1 \xC3\xA9"), {}},
       {"Test_Disk", filterOf("", "", "", "PORT"), port},
-      {"Test_Disk", filterOf("", "", "", "Disk"), {}},      // this end
-      {"Test_Disk", filterOf("", "", "", "Copy"), {}},      // the role is for another class
-      {"Test_Disk", filterOf("", "", "Copy", "Copy"), {}},  // an end is not the other
+      {"Test_Disk", filterOf("", "", "", "Disk"), {}},  // this end
+      {"Test_Disk", filterOf("", "", "", "Copy"), {}},  // the role is for another class
+      {"Test_Disk", filterOf("Link_Half"), {}},         // it has no other end
   };
   for (const auto& row : cases) {
     SCOPED_TRACE(&row - cases);

@@ -9,59 +9,11 @@ namespace cimhost::test {
 
 using namespace Pegasus;
 
-bool RecordingSink::deliverInstance(const CIMInstance& instance) {
-  String name;
-  const Uint32 position = instance.findProperty(CIMName("Name"));
-  if (position != PEG_NOT_FOUND) instance.getProperty(position).getValue().get(name);
-  names.push_back(toUtf8(name));
-  instances.push_back(instance);
-  return true;
-}
-
-bool RecordingSink::deliverPath(const CIMObjectPath& path) {
-  names.push_back(toUtf8(path.toString()));
-  return true;
-}
-
-bool RecordingSink::deliverClass(const CIMClass& declaration) {
-  classes.push_back(declaration);
-  return deliverClassName(declaration.getClassName());
-}
-
-bool RecordingSink::deliverClassName(const CIMName& name) {
-  names.push_back(toUtf8(name.getString()));
-  return true;
-}
-
-bool RecordingSink::deliverMethodResult(const CIMValue& returned,
-                                        const Array<CIMParamValue>& parameters) {
-  returnValue = returned.isNull() ? "null" : toUtf8(returned.toString());
-  for (Uint32 i = 0; i < parameters.size(); ++i) {
-    names.push_back(toUtf8(parameters[i].getParameterName()) + "=" +
-                    toUtf8(parameters[i].getValue().toString()));
-  }
-  return true;
-}
-
 CIMClass readClass(const std::string& mof, const char* name) {
   ClassRepository repository;
   MofReader reader(repository);
   if (!reader.readText(mof, "test.mof", kNamespace)) throw std::runtime_error("malformed MOF");
   return repository.getClass(kNamespace, name, false, true, true, {});
-}
-
-CIMObjectPath pathOf(const std::string& className) {
-  return CIMObjectPath(String((className + ".Name=\"a\"").c_str()));
-}
-
-CIMPropertyList listOf(const std::vector<const char*>& names) {
-  Array<CIMName> list;
-  for (const char* name : names) list.append(CIMName(name));
-  return CIMPropertyList(list);
-}
-
-std::string textOf(const OperationStatus& status) {
-  return std::to_string(static_cast<int>(status.code)) + " " + status.message;
 }
 
 namespace {
@@ -83,6 +35,7 @@ class Test_Typed {
 [Association] class Link_Port { [Key] Test_Disk REF Disk; [Key] Test_Port REF Port; };
 class Link_FastPort : Link_Port {};
 [Association] class Link_Copy { [Key] Test_Base REF Original; [Key] Test_Base REF Copy; };
+[Association] class Link_Half { [Key] Test_Disk REF Disk; };
 [Association] class Link_Unserved { [Key] Test_Disk REF A; [Key] Test_Port REF B; };
 )";
 
@@ -99,7 +52,8 @@ constexpr const char* kNames =
 
 TestHost::TestHost(const std::string& providerName) {
   std::string mof = kClasses;
-  for (const char* name : {"Link_Port", "Link_FastPort", "Link_Copy"}) serve(name, true);
+  for (const char* name : {"Link_Port", "Link_FastPort", "Link_Copy", "Link_Half"})
+    serve(name, true);
   std::istringstream names(kNames);
   for (std::string name; names >> name;) {
     const bool link = name[0] == 'L';

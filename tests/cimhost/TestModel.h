@@ -17,17 +17,36 @@ class RecordingSink : public InstanceSink,
                       public ClassNameSink,
                       public MethodResultSink {
  public:
-  bool deliverInstance(const Pegasus::CIMInstance& instance) override;
-  bool deliverPath(const Pegasus::CIMObjectPath& path) override;
-  bool deliverClass(const Pegasus::CIMClass& declaration) override;
-  bool deliverClassName(const Pegasus::CIMName& name) override;
+  bool deliverInstance(const Pegasus::CIMInstance& instance) override {
+    Pegasus::String name;
+    const Pegasus::Uint32 position = instance.findProperty(Pegasus::CIMName("Name"));
+    if (position != Pegasus::PEG_NOT_FOUND) instance.getProperty(position).getValue().get(name);
+    instances.push_back(instance);
+    return note(name);
+  }
+  bool deliverPath(const Pegasus::CIMObjectPath& path) override { return note(path.toString()); }
+  bool deliverClass(const Pegasus::CIMClass& declaration) override {
+    return note(declaration.getClassName().getString());
+  }
+  bool deliverClassName(const Pegasus::CIMName& name) override { return note(name.getString()); }
   bool deliverMethodResult(const Pegasus::CIMValue& returned,
-                           const Pegasus::Array<Pegasus::CIMParamValue>& parameters) override;
+                           const Pegasus::Array<Pegasus::CIMParamValue>& parameters) override {
+    returnValue = returned.isNull() ? "null" : toUtf8(returned.toString());
+    for (Pegasus::Uint32 i = 0; i < parameters.size(); ++i) {
+      note(parameters[i].getParameterName() + "=" + parameters[i].getValue().toString());
+    }
+    return true;
+  }
 
   std::vector<std::string> names;
   std::vector<Pegasus::CIMInstance> instances;
-  std::vector<Pegasus::CIMClass> classes;
   std::string returnValue = "not delivered";
+
+ private:
+  bool note(const Pegasus::String& text) {
+    names.push_back(toUtf8(text));
+    return true;
+  }
 };
 
 /// A repository with the classes of the test provider in root/test, that provider loaded, and the
@@ -57,11 +76,19 @@ inline const Pegasus::CIMNamespaceName kNamespace("root/test");
 Pegasus::CIMClass readClass(const std::string& mof, const char* name);
 
 /// The object with the key Name="a" of a class.
-Pegasus::CIMObjectPath pathOf(const std::string& className);
+inline Pegasus::CIMObjectPath pathOf(const std::string& className) {
+  return Pegasus::CIMObjectPath((className + ".Name=\"a\"").c_str());
+}
 
-Pegasus::CIMPropertyList listOf(const std::vector<const char*>& names);
+inline Pegasus::CIMPropertyList listOf(const std::vector<const char*>& names) {
+  Pegasus::Array<Pegasus::CIMName> list;
+  for (const char* name : names) list.append(Pegasus::CIMName(name));
+  return Pegasus::CIMPropertyList(list);
+}
 
 /// The code and the message: "2 not for you"; "0 " for success.
-std::string textOf(const OperationStatus& status);
+inline std::string textOf(const OperationStatus& status) {
+  return std::to_string(static_cast<int>(status.code)) + " " + status.message;
+}
 
 }  // namespace cimhost::test
