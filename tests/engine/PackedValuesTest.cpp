@@ -150,29 +150,25 @@ TEST_F(PackedLists, EndAnywhereWithinTheBuffer) {
 
 // What fits exactly arrives; one byte more is an error, and the plug-in is not called.
 TEST_F(PackedLists, InputsFitUpTo1024Bytes) {
-  const auto text = [](size_t size) { return std::string(size, 'x'); };
-  const auto list = [&](size_t size) { return Values{7, text(size)}; };
   Values outputs;
-  const struct {
-    const char* function;
-    std::function<void(bool)> call;
-  } cases[] = {
-      {"setAI", [&](bool over) { function("setAI").set(Ints(over ? 128 : 127, 9)); }},
-      {"setIv", [&](bool over) { function("setIv").set(1, Ints(over ? 128 : 127, 9)); }},
-      {"getIv", [&](bool over) { function("getIv").get(Texts{text(over ? 1008 : 1007)}); }},
-      {"execB", [&](bool over) { function("execB").exec(list(over ? 1004 : 1003)); }},
-      {"execC", [&](bool over) { function("execC").exec(list(over ? 1004 : 1003), outputs); }},
-      {"execCv",
-       [&](bool over) { function("execCv").exec(Ints(over ? 128 : 127, 9), {}, outputs); }},
-  };
   answer("\x63");
-  for (const auto& c : cases) {
-    recorder_->calls = 0;
-    EXPECT_EQ(errorOf([&] { c.call(true); }),
-              "The input of function "s + c.function + " does not fit into its buffer");
-    EXPECT_EQ(recorder_->calls, 0) << c.function;
-    EXPECT_EQ(errorOf([&] { c.call(false); }), "");
-    EXPECT_EQ(recorder_->calls, 1) << c.function;
+  for (const bool over : {true, false}) {
+    const Ints ints(over ? 128 : 127, 9);
+    const Values list{7, std::string(over ? 1004 : 1003, 'x')};
+    const std::pair<const char*, std::function<void()>> calls[] = {
+        {"setAI", [&] { function("setAI").set(ints); }},
+        {"setIv", [&] { function("setIv").set(1, ints); }},
+        {"getIv", [&] { function("getIv").get(Texts{std::string(over ? 1008 : 1007, 'x')}); }},
+        {"execB", [&] { function("execB").exec(list); }},
+        {"execC", [&] { function("execC").exec(list, outputs); }},
+        {"execCv", [&] { function("execCv").exec(ints, {}, outputs); }},
+    };
+    for (const auto& [name, call] : calls) {
+      recorder_->calls = 0;
+      EXPECT_EQ(errorOf(call),
+                over ? "The input of function "s + name + " does not fit into its buffer" : "");
+      EXPECT_EQ(recorder_->calls, over ? 0 : 1) << name;
+    }
   }
 }
 
