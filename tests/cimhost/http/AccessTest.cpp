@@ -36,10 +36,9 @@ std::string basic(const std::string& encoded) {
 
 class UsersTest : public HttpServerTest {
  protected:
-  std::string write(const std::string& text) {
-    const std::string file = (tree_.root() / "users").string();
-    TemporaryTree::write(file, text);
-    return file;
+  static std::string write(const std::string& text) {
+    TemporaryTree::write("users", text);
+    return "users";
   }
   void startWithUsers() {
     settings.users = std::make_shared<Authenticator>(
@@ -148,47 +147,31 @@ TEST(FailureDelaysTest, AttemptsOfAnAddressGetTheirTurnsOneByOne) {
   EXPECT_EQ(delays.size(), FailureDelays::kAddresses);
 }
 
-class TlsTest : public HttpServerTest {
- protected:
-  void SetUp() override {
-    ASSERT_EQ(openssl("req -x509 -newkey rsa:2048 -nodes -days 2 -subj /CN=localhost -addext "
-                      "subjectAltName=IP:127.0.0.1 -keyout " +
-                      key() + " -out " + certificate()),
-              0);
-  }
-
-  std::string key() const { return (tree_.root() / "key.pem").string(); }
-  std::string certificate() const { return (tree_.root() / "cert.pem").string(); }
-
-  static int openssl(const std::string& words) {
-    return runProgram({"/bin/sh", "-c", "/usr/bin/openssl " + words}).code;
-  }
-  ProgramResult curl(const std::string& options) {
-    return runProgram({"/bin/sh", "-c",
-                       "/usr/bin/curl -sS --max-time 20 --cacert " + certificate() + " " + options +
-                           " https://127.0.0.1:" + std::to_string(port()) + "/cimom"});
-  }
-
-  TemporaryTree tree_;
-};
-
-TEST_F(TlsTest, RepliesCrossItWholeFromVersion12On) {
-  settings.tls = readTlsFiles(certificate(), key());
+TEST_F(HttpServerTest, RepliesCrossTlsWholeFromVersion12On) {
+  const TemporaryTree tree;
+  const auto openssl = [](const std::string& words) {
+    ASSERT_EQ(runProgram({"/bin/sh", "-c", "/usr/bin/openssl " + words}).code, 0) << words;
+  };
+  openssl(
+      "req -x509 -newkey rsa:2048 -nodes -days 2 -subj /CN=localhost -addext "
+      "subjectAltName=IP:127.0.0.1 -keyout key -out certificate");
+  openssl("genrsa -out other 2048");
+  EXPECT_THROW(readTlsFiles("certificate", "other"), HostError);
+  EXPECT_THROW(readTlsFiles("key", "key"), HostError);
+  EXPECT_THROW(readTlsFiles("certificate", "/"), HostError);
+  settings.tls = readTlsFiles("certificate", "key");
   start();
+  const auto curl = [this](const std::string& options) {
+    return runProgram({"/bin/sh", "-c",
+                       "/usr/bin/curl -sS --max-time 20 --cacert certificate " + options +
+                           " https://127.0.0.1:" + std::to_string(port()) + "/cimom"});
+  };
   EXPECT_EQ(curl("--data-binary hello --tlsv1.3").out, ":hello");
   EXPECT_EQ(curl("--data-binary hello --tls-max 1.2").out, ":hello");
   EXPECT_NE(curl("--data-binary hello --tls-max 1.1 --ciphers DEFAULT@SECLEVEL=0").code, 0);
   EXPECT_EQ(curl("--data-binary size=1000000").out.size(), 1000000U);
   // Plain HTTP is no handshake.
   EXPECT_EQ(ask(post("x")).status, 0);
-}
-
-TEST_F(TlsTest, FilesThatDoNotFitAreTold) {
-  const std::string other = (tree_.root() / "other.pem").string();
-  ASSERT_EQ(openssl("genrsa -out " + other + " 2048"), 0);
-  EXPECT_THROW(readTlsFiles(certificate(), other), HostError);
-  EXPECT_THROW(readTlsFiles(key(), key()), HostError);
-  EXPECT_THROW(readTlsFiles(certificate(), tree_.root().string()), HostError);
 }
 
 }  // namespace
