@@ -140,7 +140,7 @@ class ProviderTest : public testing::Test {
   }
 
   std::vector<std::string> invoke(const char* path, const char* method, Properties inputs = {}) {
-    Array<Pegasus::CIMParamValue> sent;
+    Array<CIMParamValue> sent;
     for (const auto& [name, value] : inputs) {
       sent.append(CIMParamValue(String(name), value));
     }
@@ -160,7 +160,7 @@ class ProviderTest : public testing::Test {
 
   std::vector<std::string> associators(const char* object, const char* associationClass = "",
                                        const char* resultClass = "") {
-    const CIMPropertyList nothing{Array<Pegasus::CIMName>()};
+    const CIMPropertyList nothing{Array<CIMName>()};
     RecordingHandler handler;
     provider->associators(context, pathOf(object), nameOrNull(associationClass),
                           nameOrNull(resultClass), String(), String(), true, true, nothing,
@@ -171,7 +171,7 @@ class ProviderTest : public testing::Test {
   TemporaryTree tree;
   LogLevel quiet{0};
   TestHost host;
-  std::optional<Pegasus::CIMOMHandle> handle;
+  std::optional<CIMOMHandle> handle;
   void* plugin = dlopen(PROVIDER_TEST_PLUGIN, RTLD_NOW);
   TestPluginState* state = nullptr;
   Vaneth::CommonProvider* provider = nullptr;

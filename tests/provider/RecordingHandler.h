@@ -25,12 +25,12 @@ class RecordingHandler : public InstanceResponseHandler,
     events.push_back("object " + textOf(CIMInstance(object)));
   }
   void deliver(const CIMValue& value) override { events.push_back("returns " + textOf(value)); }
-  void deliver(const Array<Pegasus::CIMInstance>&) override { unexpected(); }
-  void deliver(const Array<Pegasus::CIMObjectPath>&) override { unexpected(); }
-  void deliver(const Array<Pegasus::CIMObject>&) override { unexpected(); }
+  void deliver(const Array<CIMInstance>&) override { unexpected(); }
+  void deliver(const Array<CIMObjectPath>&) override { unexpected(); }
+  void deliver(const Array<CIMObject>&) override { unexpected(); }
 
   void deliverParamValue(const CIMParamValue&) override { unexpected(); }
-  void deliverParamValue(const Array<Pegasus::CIMParamValue>& values) override {
+  void deliverParamValue(const Array<CIMParamValue>& values) override {
     std::string text = "out";
     for (Uint32 i = 0; i < values.size(); ++i) {
       text += " " + textOf(values[i].getParameterName()) + "=(" + textOf(values[i].getValue()) +
@@ -40,7 +40,7 @@ class RecordingHandler : public InstanceResponseHandler,
   }
 
   std::vector<std::string> events;
-  Array<Pegasus::CIMInstance> instances;
+  Array<CIMInstance> instances;
 
  private:
   void unexpected() { events.push_back("unexpected delivery"); }

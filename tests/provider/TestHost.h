@@ -6,7 +6,6 @@
 
 #include <cstdint>
 #include <initializer_list>
-#include <mutex>
 #include <string>
 #include <vector>
 
@@ -49,15 +48,14 @@ class TestHost : public CIMOMHandleRep {
     throw CIMException(CIM_ERR_NOT_FOUND, path.toString());
   }
 
-  Array<Pegasus::CIMInstance> enumerateInstances(const OperationContext&,
-                                                 const CIMNamespaceName& nameSpace,
-                                                 const CIMName& className, Boolean deepInheritance,
-                                                 Boolean localOnly, Boolean includeQualifiers,
-                                                 Boolean includeClassOrigin,
-                                                 const CIMPropertyList& propertyList) override {
+  Array<CIMInstance> enumerateInstances(const OperationContext&, const CIMNamespaceName& nameSpace,
+                                        const CIMName& className, Boolean deepInheritance,
+                                        Boolean localOnly, Boolean includeQualifiers,
+                                        Boolean includeClassOrigin,
+                                        const CIMPropertyList& propertyList) override {
     note("enumerateInstances", nameSpace, textOf(className.getString()),
          {deepInheritance, localOnly, includeQualifiers, includeClassOrigin}, propertyList);
-    Array<Pegasus::CIMInstance> found;
+    Array<CIMInstance> found;
     for (const CIMInstance& instance : foreign_) {
       if (instance.getClassName() == className) found.append(instance.clone());
     }
@@ -67,15 +65,13 @@ class TestHost : public CIMOMHandleRep {
  private:
   /// Gives how many calls there are now.
   size_t note(const char* operation, const CIMNamespaceName& nameSpace, const std::string& object,
-              std::initializer_list<Pegasus::Boolean> flags, const CIMPropertyList& propertyList) {
+              std::initializer_list<Boolean> flags, const CIMPropertyList& propertyList) {
     std::string call = std::string(operation) + " " + textOf(nameSpace.getString()) + " " + object;
     for (const Boolean flag : flags) call += flag ? " 1" : " 0";
-    const std::lock_guard<std::mutex> lock(mutex_);
     calls.push_back(call + (propertyList.isNull() ? " null" : " list"));
     return calls.size();
   }
 
-  std::mutex mutex_;
-  std::vector<Pegasus::CIMClass> classes_;
-  std::vector<Pegasus::CIMInstance> foreign_;
+  std::vector<CIMClass> classes_;
+  std::vector<CIMInstance> foreign_;
 };

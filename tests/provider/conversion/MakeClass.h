@@ -45,15 +45,15 @@ inline CIMParameter parameter(const char* name, CIMType type, const char* letter
 
 /// A method with a qualifier "Static" of that value.
 inline CIMMethod method(const char* name, bool isStatic,
-                        std::initializer_list<Pegasus::CIMParameter> parameters = {}) {
+                        std::initializer_list<CIMParameter> parameters = {}) {
   CIMMethod declaration(CIMName(name), CIMTYPE_SINT32);
   declaration.addQualifier(flag("Static", isStatic));
   for (const CIMParameter& each : parameters) declaration.addParameter(each);
   return declaration;
 }
 
-inline CIMClass makeClass(const char* name, std::initializer_list<Pegasus::CIMProperty> properties,
-                          std::initializer_list<Pegasus::CIMMethod> methods = {}) {
+inline CIMClass makeClass(const char* name, std::initializer_list<CIMProperty> properties,
+                          std::initializer_list<CIMMethod> methods = {}) {
   CIMClass cimClass{CIMName(name)};
   for (const CIMProperty& property : properties) cimClass.addProperty(property);
   for (const CIMMethod& each : methods) cimClass.addMethod(each);
