@@ -49,15 +49,6 @@ TEST_F(GetInstance, NamesAreThePathsOfTheEnumeration) {
   EXPECT_THAT(instanceNames("root/t:T_Nothing").events, ElementsAre("processing", "complete"));
 }
 
-TEST_F(GetInstance, ErrorsOfTheHandlerPass) {
-  struct Strict : RecordingHandler {
-    void complete() override { throw CIMException(CIM_ERR_FAILED, String("Too few")); }
-  } strict;
-  EXPECT_THROW(provider->getInstance(context, pathOf("root/t:T_Item.Name=\"z\""), false, false,
-                                     CIMPropertyList(), strict),
-               CIMException);
-}
-
 TEST(CompareBindings, BothWays) {
   const struct {
     const char *a, *b;  // Paths with these bindings.
