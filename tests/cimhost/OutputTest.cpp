@@ -262,7 +262,7 @@ TEST(XmlText, WhatXmlHasNoFormForIsReplaced) {
        {0x0, 0x1, 0x8, 0xB, 0xC, 0xE, 0x1F, 0xD800, 0xDBFF, 0xDC00, 0xDFFF, 0xFFFE, 0xFFFF}) {
     EXPECT_EQ(escaped({'a', unit, 'b'}), "a\uFFFDb") << unit;
   }
-  EXPECT_EQ(escaped({0xDC00, 0xD800}), "\uFFFD\uFFFD");
+  EXPECT_EQ(escaped({0xDC00, 0xD800, 0xD800, 0xDC00}), "\uFFFD\uFFFD\U00010000");
   EXPECT_EQ(escaped({'\t', '\n', '\r', 0x7F, 0x80, 0x7FF, 0x800, 0xFFFD}),
             "\t\n\r\x7F\xC2\x80\u07FF\u0800\uFFFD");
   EXPECT_EQ(escaped({0xD800, 0xDC00, 0xDBFF, 0xDFFF}), "\U00010000\U0010FFFF");
