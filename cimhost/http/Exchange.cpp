@@ -19,6 +19,7 @@ Rejection unauthorized(const std::string& reason) {
 }  // namespace
 
 std::shared_ptr<Authenticator> ExchangeServices::users() const {
+  if (!asksUsers_) return nullptr;
   const std::lock_guard<std::mutex> lock(usersMutex_);
   return users_;
 }
@@ -26,24 +27,23 @@ std::shared_ptr<Authenticator> ExchangeServices::users() const {
 void ExchangeServices::setUsers(std::shared_ptr<Authenticator> users) {
   const std::lock_guard<std::mutex> lock(usersMutex_);
   users_ = std::move(users);
+  asksUsers_ = users_ != nullptr;
 }
 
-Exchange::Exchange(ExchangeServices& services, std::shared_ptr<ClientConnection> connection,
-                   ReplyPipe::Callback wake)
+Exchange::Exchange(ExchangeServices& services, std::size_t source,
+                   std::shared_ptr<ClientConnection> connection, ReplyPipe::Callback wake)
     : services_(services),
+      source_(source),
       connection_(std::move(connection)),
       pipe_(std::move(wake)),
       start_(Clock::now()) {
-  const std::lock_guard<std::mutex> lock(services_.countMutex);
   ++services_.count;
 }
 
 Exchange::~Exchange() {
   releaseBody();
   if (!health_) services_.log(takeRecord());
-  const std::lock_guard<std::mutex> lock(services_.countMutex);
   --services_.count;
-  services_.ended.notify_all();
 }
 
 RequestRecord Exchange::takeRecord() {
@@ -134,7 +134,7 @@ void Exchange::submit() {
 }
 
 void Exchange::enqueue() {
-  if (services_.pool.tryPush([self = shared_from_this()] { self->run(); })) return;
+  if (services_.pool.tryPush(source_, [self = shared_from_this()] { self->run(); })) return;
   note_ = "too many requests wait";
   pipe_.cut(kUnavailable);
 }

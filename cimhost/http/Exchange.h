@@ -11,7 +11,6 @@
 #include "cimhost/http/WorkerPool.h"
 
 #include <atomic>
-#include <condition_variable>
 #include <functional>
 #include <memory>
 #include <mutex>
@@ -42,15 +41,13 @@ struct ExchangeServices {
   std::atomic<bool> draining{false};
   std::atomic<std::size_t> bodyBytes{0};  // Of all requests.
   FailureDelays delays;
-  // How many exchanges are alive.
-  std::mutex countMutex;
-  std::condition_variable ended;
-  std::size_t count = 0;
+  std::atomic<std::size_t> count{0};  // How many exchanges are alive.
   // Last, so that their threads end before anything that these use.
   WorkerPool pool;
   Housekeeper housekeeper;
 
  private:
+  std::atomic<bool> asksUsers_{false};
   mutable std::mutex usersMutex_;
   std::shared_ptr<Authenticator> users_;
 };
@@ -61,8 +58,9 @@ struct ExchangeServices {
 /// log.
 class Exchange final : public std::enable_shared_from_this<Exchange> {
  public:
-  Exchange(ExchangeServices& services, std::shared_ptr<ClientConnection> connection,
-           ReplyPipe::Callback wake);
+  /// `source`: the connection's one in the pool.
+  Exchange(ExchangeServices& services, std::size_t source,
+           std::shared_ptr<ClientConnection> connection, ReplyPipe::Callback wake);
   ~Exchange();
   Exchange(const Exchange&) = delete;
   Exchange& operator=(const Exchange&) = delete;
@@ -107,6 +105,7 @@ class Exchange final : public std::enable_shared_from_this<Exchange> {
   void releaseBody();
 
   ExchangeServices& services_;
+  const std::size_t source_;
   std::shared_ptr<ClientConnection> connection_;
   HttpRequest request_;
   ReplyPipe pipe_;

@@ -6,6 +6,7 @@
 #include <fcntl.h>
 #include <limits.h>
 #include <poll.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 #include <algorithm>
@@ -21,19 +22,26 @@ namespace {
 
 constexpr std::size_t kMaximumText = 200;
 constexpr std::size_t kUsualLine = 256;
+// Of a writer that hangs.
+constexpr std::size_t kMaximumPending = 1U << 20U;
 
 // ISO 8601, UTC, milliseconds.
 std::string timeText(std::chrono::system_clock::time_point time) {
   using std::chrono::milliseconds;
   const auto sinceEpoch = std::chrono::duration_cast<milliseconds>(time.time_since_epoch());
+  // The conversion takes a lock of the whole process: once a second will do.
+  thread_local time_t lastSecond = -1;
+  thread_local char text[32];
   const auto seconds = static_cast<time_t>(sinceEpoch.count() / 1000);
-  tm parts{};
-  gmtime_r(&seconds, &parts);
-  char text[32];
-  const std::size_t length = strftime(text, sizeof text, "%Y-%m-%dT%H:%M:%S", &parts);
+  if (seconds != lastSecond) {
+    tm parts{};
+    gmtime_r(&seconds, &parts);
+    strftime(text, sizeof text, "%Y-%m-%dT%H:%M:%S", &parts);
+    lastSecond = seconds;
+  }
   std::string fraction = std::to_string(1000 + sinceEpoch.count() % 1000);
   fraction[0] = '.';
-  return std::string(text, length) + fraction + "Z";
+  return text + fraction + "Z";
 }
 
 bool isPlain(const std::string& text) {
@@ -67,6 +75,29 @@ template <class Number>
 void appendNumber(std::string& line, const char* name, Number number) {
   line += name;
   line += std::to_string(number);
+}
+
+// What a write may have so that it takes everything without a wait when the descriptor is ready:
+// whole lines, unless one is longer than that.
+std::string_view portion(std::string_view lines, bool regular) {
+  if (regular || lines.size() <= PIPE_BUF) return lines;
+  const std::size_t end = lines.rfind('\n', PIPE_BUF - 1);
+  return lines.substr(0, end == std::string_view::npos ? PIPE_BUF : end + 1);
+}
+
+// What cannot be written is lost.
+void writeAtOnce(int descriptor, std::string_view lines) {
+  struct stat status {};
+  const bool regular = fstat(descriptor, &status) == 0 && S_ISREG(status.st_mode);
+  while (!lines.empty()) {
+    pollfd entry{descriptor, POLLOUT, 0};
+    if (!regular && poll(&entry, 1, 0) == 0) return;
+    const std::string_view part = portion(lines, regular);
+    const ssize_t written = ::write(descriptor, part.data(), part.size());
+    if (written < 0 && errno == EINTR) continue;
+    if (written <= 0) return;
+    lines.remove_prefix(static_cast<std::size_t>(written));
+  }
 }
 
 int openLog(const std::string& file) {
@@ -105,11 +136,16 @@ RequestLog::~RequestLog() {
 }
 
 void RequestLog::write(const RequestRecord& record) {
-  append(toLogLine(record, std::chrono::system_clock::now()));
+  const std::string line = toLogLine(record, std::chrono::system_clock::now());
+  Lock lock(mutex_);
+  append(line, lock);
 }
 
 void RequestLog::message(const std::string& text) {
-  append(timeText(std::chrono::system_clock::now()) + " " + text);
+  const std::string line = timeText(std::chrono::system_clock::now()) + " " + text;
+  Lock lock(mutex_);
+  append(line, lock);
+  written_.wait(lock, [this] { return !writing_; });
 }
 
 void RequestLog::reopen() {
@@ -119,24 +155,25 @@ void RequestLog::reopen() {
     message(file_ + ": " + std::strerror(errno));
     return;
   }
-  const std::lock_guard<std::mutex> lock(mutex_);
+  Lock lock(mutex_);
+  written_.wait(lock, [this] { return !writing_; });
   close(std::exchange(descriptor_, descriptor));
 }
 
-void RequestLog::append(std::string line) {
-  line += '\n';
-  const std::lock_guard<std::mutex> lock(mutex_);
-  std::string_view rest = line;
-  while (!rest.empty()) {
-    pollfd entry{descriptor_, POLLOUT, 0};
-    if (poll(&entry, 1, 0) == 0) return;
-    // A pipe that is ready takes as much without a wait.
-    const ssize_t written =
-        ::write(descriptor_, rest.data(), std::min<std::size_t>(rest.size(), PIPE_BUF));
-    if (written < 0 && errno == EINTR) continue;
-    if (written <= 0) return;
-    rest.remove_prefix(static_cast<std::size_t>(written));
+void RequestLog::append(const std::string& line, Lock& lock) {
+  if (pending_.size() > kMaximumPending) return;
+  pending_ += line;
+  pending_ += '\n';
+  if (std::exchange(writing_, true)) return;
+  while (!pending_.empty()) {
+    lines_.swap(pending_);
+    lock.unlock();
+    writeAtOnce(descriptor_, lines_);
+    lines_.clear();
+    lock.lock();
   }
+  writing_ = false;
+  written_.notify_all();
 }
 
 }  // namespace cimhost

@@ -3,6 +3,7 @@
 #include "cimhost/xml/CimXmlService.h"
 
 #include <chrono>
+#include <condition_variable>
 #include <cstdint>
 #include <mutex>
 #include <string>
@@ -25,9 +26,9 @@ struct RequestRecord {
 /// quotes with escapes. `-` is an empty one.
 std::string toLogLine(const RequestRecord& record, std::chrono::system_clock::time_point time);
 
-/// Writes lines to a file or to standard error, each with one system call unless it is very long.
-/// May be used from several threads. Lines that cannot be written at once are lost: nobody waits
-/// for the reader of a pipe.
+/// Writes lines to a file or to standard error, whole ones with each system call unless they are
+/// very long. May be used from several threads: one that finds another one writing leaves its line
+/// to it. Lines that cannot be written at once are lost: nobody waits for the reader of a pipe.
 class RequestLog {
  public:
   /// Appends to `file`; empty: standard error. Throws HostError.
@@ -44,10 +45,16 @@ class RequestLog {
   void reopen();
 
  private:
-  void append(std::string line);
+  using Lock = std::unique_lock<std::mutex>;
+
+  void append(const std::string& line, Lock& lock);
 
   std::string file_;
   std::mutex mutex_;
+  std::condition_variable written_;
+  std::string pending_;
+  bool writing_ = false;  // Who sets it alone uses what follows.
+  std::string lines_;
   int descriptor_;
 };
 

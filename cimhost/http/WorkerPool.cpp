@@ -6,7 +6,6 @@
 #include <sys/eventfd.h>
 #include <unistd.h>
 
-#include <algorithm>
 #include <cerrno>
 #include <cstring>
 #include <string>
@@ -28,22 +27,25 @@ constexpr int kQuietTicks = 100;
 
 }  // namespace
 
+WorkerPool::Watched::Watched(Source itsSource)
+    : source(std::move(itsSource)), kicked(openEvent()) {}
+
+WorkerPool::Watched::~Watched() {
+  close(kicked);
+}
+
 WorkerPool::WorkerPool(std::size_t threads, std::size_t queue)
     : threadsLimit_(threads), queue_(queue) {}
 
 WorkerPool::~WorkerPool() {
   stop();
-  for (const Watched& each : sources_) close(each.kicked);
   if (stopEvent_ >= 0) close(stopEvent_);
 }
 
 void WorkerPool::start(std::vector<Source> sources) {
   stopEvent_ = openEvent();
-  sources_.reserve(sources.size());
   for (Source& source : sources) {
-    sources_.emplace_back();
-    sources_.back().kicked = openEvent();
-    sources_.back().source = std::move(source);
+    sources_.push_back(std::make_unique<Watched>(std::move(source)));
   }
   // All tasks may take their time, and every source is watched still, and one is spare.
   const std::size_t count = threadsLimit_ + sources_.size() + 1;
@@ -55,101 +57,133 @@ void WorkerPool::start(std::vector<Source> sources) {
   }
 }
 
-bool WorkerPool::tryPush(Task task) {
-  const std::lock_guard<std::mutex> lock(mutex_);
-  if (stopped_ || tasks_.size() >= queue_) return false;
-  tasks_.push_back(std::move(task));
-  if (standbySleeps_) standby_.notify_one();
+bool WorkerPool::tryPush(std::size_t source, Task task) {
+  if (waiting_.fetch_add(1) >= queue_) {
+    --waiting_;
+    return false;
+  }
+  Watched& watched = *sources_[source];
+  {
+    const Lock lock(watched.mutex);
+    if (stopped_) return false;
+    watched.tasks.push_back(std::move(task));
+    ++watched.come;
+  }
+  wakeStandby();
   return true;
 }
 
-bool WorkerPool::isFull() {
-  const Lock lock(mutex_);
-  return !tasks_.empty() && running_ >= threadsLimit_;
-}
-
-void WorkerPool::kick(std::size_t index) {
-  const std::lock_guard<std::mutex> lock(mutex_);
-  if (index >= sources_.size()) return;
-  Watched& watched = sources_[index];
-  if (std::exchange(watched.hurry, true)) return;
+void WorkerPool::kick(std::size_t source) {
+  Watched& watched = *sources_[source];
+  if (watched.hurry.exchange(true)) return;
   if (watched.polling) eventfd_write(watched.kicked, 1);
 }
 
 void WorkerPool::stop() {
-  std::deque<Task> dropped;
   {
-    const std::lock_guard<std::mutex> lock(mutex_);
-    if (std::exchange(stopped_, true)) return;
-    dropped.swap(tasks_);
+    const Lock lock(mutex_);
+    if (stopped_.exchange(true)) return;
   }
   if (stopEvent_ >= 0) eventfd_write(stopEvent_, 1);
   rest_.notify_all();
   standby_.notify_all();
+  for (const auto& each : sources_) {
+    std::deque<Task> dropped;
+    const Lock lock(each->mutex);
+    dropped.swap(each->tasks);
+  }
   for (std::thread& thread : threads_) thread.join();
 }
 
 void WorkerPool::work() {
-  Lock lock(mutex_);
   while (!stopped_) {
-    // Whoever is going to be busy leaves a spare one behind.
-    if (!hasStandby_ && resting_ > 0) rest_.notify_one();
-    if (hasTask()) {
-      runTask(lock);
-    } else if (Watched* source = unwatched()) {
-      watch(*source, lock);
+    if (Watched* watched = inNeed()) {
+      serve(*watched);
     } else {
-      rest(lock);
+      rest();
     }
   }
 }
 
-WorkerPool::Watched* WorkerPool::unwatched() {
-  const auto found = std::find_if(sources_.begin(), sources_.end(),
-                                  [](const Watched& each) { return !each.busy; });
-  return found == sources_.end() ? nullptr : &*found;
+// One that was in the same state when the spare thread last looked.
+WorkerPool::Watched* WorkerPool::inNeed() {
+  for (const auto& each : sources_) {
+    const Lock lock(each->mutex);
+    const bool forgotten = !each->watched && each->turns == each->turnsSeen;
+    const bool delayed = !each->tasks.empty() && each->begun < each->comeSeen;
+    if (forgotten || (delayed && running_ < threadsLimit_)) return each.get();
+  }
+  return nullptr;
 }
 
-void WorkerPool::runTask(Lock& lock) {
-  Task task = std::move(tasks_.front());
-  tasks_.pop_front();
-  ++running_;
-  ++begun_;
-  if (standbySleeps_) standby_.notify_one();
+// Until another thread watches it.
+void WorkerPool::serve(Watched& watched) {
+  {
+    // Whoever may become busy leaves a spare one behind.
+    const Lock lock(mutex_);
+    if (!hasStandby_ && resting_ > 0) rest_.notify_one();
+  }
+  Lock lock(watched.mutex);
+  while (!stopped_) {
+    if (!watched.tasks.empty() && claimRun()) {
+      runTask(watched, lock);
+    } else if (!watched.watched) {
+      watch(watched, lock);
+    } else {
+      return;
+    }
+  }
+}
+
+bool WorkerPool::claimRun() {
+  if (running_.fetch_add(1) < threadsLimit_) return true;
+  --running_;
+  return false;
+}
+
+void WorkerPool::runTask(Watched& watched, Lock& lock) {
+  Task task = std::move(watched.tasks.front());
+  watched.tasks.pop_front();
+  ++watched.begun;
   lock.unlock();
+  --waiting_;
   task();
   task = nullptr;
-  lock.lock();
   --running_;
+  ++watched.ended;
+  // Tasks of other sources may have waited for the end of this one.
+  if (waiting_ > 0) wakeStandby();
+  lock.lock();
 }
 
 void WorkerPool::watch(Watched& watched, Lock& lock) {
-  watched.busy = true;
+  watched.watched = true;
   ++watched.turns;
-  watched.polling = !watched.hurry;
-  if (watched.polling) {
-    lock.unlock();
-    awaitEvent(watched);
-    lock.lock();
-    watched.polling = false;
-  }
-  watched.hurry = false;
   lock.unlock();
+  awaitEvent(watched);
   watched.source.run();
   lock.lock();
-  watched.busy = false;
+  watched.watched = false;
 }
 
-void WorkerPool::awaitEvent(const Watched& watched) const {
-  pollfd entries[] = {{watched.source.descriptor(), POLLIN, 0},
-                      {watched.kicked, POLLIN, 0},
-                      {stopEvent_, POLLIN, 0}};
-  poll(entries, 3, static_cast<int>(watched.source.due().count()));
-  eventfd_t kicks = 0;
-  if (entries[1].revents != 0) eventfd_read(watched.kicked, &kicks);
+void WorkerPool::awaitEvent(Watched& watched) const {
+  const auto due = watched.source.due();
+  watched.polling = true;
+  if (!watched.hurry && due.count() > 0) {
+    pollfd entries[] = {{watched.source.descriptor(), POLLIN, 0},
+                        {watched.kicked, POLLIN, 0},
+                        {stopEvent_, POLLIN, 0}};
+    poll(entries, 3, static_cast<int>(due.count()));
+    eventfd_t kicks = 0;
+    if (entries[1].revents != 0) eventfd_read(watched.kicked, &kicks);
+  }
+  watched.polling = false;
+  watched.hurry = false;
 }
 
-void WorkerPool::rest(Lock& lock) {
+void WorkerPool::rest() {
+  Lock lock(mutex_);
+  if (stopped_) return;
   if (hasStandby_) {
     ++resting_;
     rest_.wait(lock);
@@ -162,38 +196,45 @@ void WorkerPool::rest(Lock& lock) {
 }
 
 void WorkerPool::standBy(Lock& lock) {
-  lacksHands();
+  look();
   std::uint64_t before = activity();
   int quiet = 0;
   while (!stopped_) {
-    if (quiet < kQuietTicks) {
+    // Who does something after it says that it sleeps, wakes it.
+    standbySleeps_ = quiet >= kQuietTicks;
+    if (!standbySleeps_) {
       standby_.wait_for(lock, kTick);
-    } else {
-      standbySleeps_ = true;
+    } else if (activity() == before) {
       standby_.wait(lock);
-      standbySleeps_ = false;
-      quiet = 0;
     }
-    if (lacksHands()) return;
+    standbySleeps_ = false;
+    if (inNeed() != nullptr) return;
+    look();
     quiet = activity() == before ? quiet + 1 : 0;
     before = activity();
   }
 }
 
-// Remembers what it saw for the next time.
-bool WorkerPool::lacksHands() {
-  const bool task = hasTask();
-  bool lacks = std::exchange(taskSeen_, task) && task;
-  for (Watched& each : sources_) {
-    if (!each.busy && each.turns == each.turnsSeen) lacks = true;
-    each.turnsSeen = each.turns;
-  }
-  return lacks;
+void WorkerPool::wakeStandby() {
+  if (!standbySleeps_) return;
+  const Lock lock(mutex_);
+  standby_.notify_one();
 }
 
-std::uint64_t WorkerPool::activity() const {
-  std::uint64_t sum = begun_;
-  for (const Watched& each : sources_) sum += each.turns;
+void WorkerPool::look() {
+  for (const auto& each : sources_) {
+    const Lock lock(each->mutex);
+    each->turnsSeen = each->turns;
+    each->comeSeen = each->come;
+  }
+}
+
+std::uint64_t WorkerPool::activity() {
+  std::uint64_t sum = 0;
+  for (const auto& each : sources_) {
+    const Lock lock(each->mutex);
+    sum += each->turns + each->come + each->begun + each->ended;
+  }
   return sum;
 }
 

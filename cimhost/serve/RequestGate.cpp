@@ -3,15 +3,24 @@
 namespace cimhost {
 
 RequestGate::Pass::Pass(RequestGate& gate) : gate_(gate) {
-  std::unique_lock<std::mutex> lock(gate_.mutex_);
-  gate_.changed_.wait(lock, [this] { return !gate_.closed_; });
+  // Either this sees that the gate is closed, or close() sees it inside.
   ++gate_.inside_;
+  while (gate_.closed_) {
+    gate_.leave();
+    std::unique_lock<std::mutex> lock(gate_.mutex_);
+    gate_.changed_.wait(lock, [this] { return !gate_.closed_; });
+    ++gate_.inside_;
+  }
 }
 
 RequestGate::Pass::~Pass() {
-  const std::lock_guard<std::mutex> lock(gate_.mutex_);
-  --gate_.inside_;
-  if (gate_.closed_ && gate_.inside_ == 0) gate_.changed_.notify_all();
+  gate_.leave();
+}
+
+void RequestGate::leave() {
+  if (--inside_ > 0 || !closed_) return;
+  const std::lock_guard<std::mutex> lock(mutex_);
+  changed_.notify_all();
 }
 
 bool RequestGate::close(std::chrono::milliseconds time) {

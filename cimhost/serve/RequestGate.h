@@ -1,5 +1,6 @@
 #pragma once
 
+#include <atomic>
 #include <chrono>
 #include <condition_variable>
 #include <cstddef>
@@ -31,10 +32,12 @@ class RequestGate {
   void open();
 
  private:
+  void leave();
+
+  std::atomic<std::size_t> inside_{0};
+  std::atomic<bool> closed_{false};  // Written under the mutex.
   std::mutex mutex_;
   std::condition_variable changed_;
-  std::size_t inside_ = 0;
-  bool closed_ = false;
 };
 
 }  // namespace cimhost
