@@ -150,9 +150,6 @@ void WorkerPool::runTask(Watched& watched, Lock& lock) {
   task();
   task = nullptr;
   --running_;
-  ++watched.ended;
-  // Tasks of other sources may have waited for the end of this one.
-  if (waiting_ > 0) wakeStandby();
   lock.lock();
 }
 
@@ -233,7 +230,7 @@ std::uint64_t WorkerPool::activity() {
   std::uint64_t sum = 0;
   for (const auto& each : sources_) {
     const Lock lock(each->mutex);
-    sum += each->turns + each->come + each->begun + each->ended;
+    sum += each->turns + each->come + each->begun;
   }
   return sum;
 }

@@ -71,12 +71,11 @@ class WorkerPool {
     int kicked;                        // An eventfd.
     std::atomic<bool> polling{false};  // Kicks must be heard.
     std::atomic<bool> hurry{false};    // There is something to do, whatever the descriptor says.
-    // How often it has been watched, and how many of its tasks have come, begun and ended.
+    std::mutex mutex;                  // Of what follows.
+    // How often it has been watched, and how many of its tasks have come and begun.
     std::uint64_t turns = 0;
     std::uint64_t come = 0;
     std::uint64_t begun = 0;
-    std::atomic<std::uint64_t> ended{0};
-    std::mutex mutex;  // Of all but the atomic ones.
     std::deque<Task> tasks;
     bool watched = false;
     // At the spare thread's last look.
