@@ -1,3 +1,5 @@
+#include "../support/TemporaryTree.h"
+
 #include "cimhost/ConfigurationCheck.h"
 
 #include <gtest/gtest.h>
@@ -30,6 +32,21 @@ TEST(ConfigurationCheck, ProblemsPointAtTheCharacter) {
   EXPECT_EQ(check(" =9").substr(0, 20), "c.ini:1:2: error: no");
   EXPECT_EQ(check("LogLevel=").substr(0, 40), "c.ini:1:10: error: LogLevel has no value");
   EXPECT_EQ(check("loglevel=9").substr(0, 40), "c.ini:1:1: warning: unknown key loglevel");
+}
+
+TEST(ConfigurationCheck, FilesOfAnotherKindOrSizeAreNotRead) {
+  const TemporaryTree tree;
+  const auto checkFile = [&tree](const char* name) {
+    const auto problems = cimhost::checkConfigurationFile((tree.root() / name).string(), name);
+    return problems.empty() ? "" : problems.front().toString();
+  };
+  std::filesystem::create_directory(tree.root() / "directory");
+  TemporaryTree::write(tree.root() / "limit", std::string(1U << 20U, '\n'));
+  TemporaryTree::write(tree.root() / "beyond", std::string((1U << 20U) + 1, '\n'));
+  EXPECT_EQ(checkFile("absent"), "");
+  EXPECT_EQ(checkFile("directory"), "directory: error: not a regular file");
+  EXPECT_EQ(checkFile("limit"), "");
+  EXPECT_EQ(checkFile("beyond"), "beyond: error: larger than 1 MiB");
 }
 
 TEST(ConfigurationCheck, AFloodOfProblemsIsBounded) {

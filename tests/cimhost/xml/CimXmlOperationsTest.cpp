@@ -112,6 +112,9 @@ TEST_F(CimXmlTest, Classes) {
                 "</METHOD></CLASS>"));
   EXPECT_THAT(ask("EnumerateClasses", className("ClassName", "Link_Port")),
               StartsWith("<IRETURNVALUE><CLASS NAME='Link_FastPort' SUPERCLASS='Link_Port'>"));
+  EXPECT_EQ(ask("EnumerateClasses", "").find(" SUPERCLASS="), std::string::npos);
+  EXPECT_THAT(ask("EnumerateClasses", value("DeepInheritance", "TRUE")),
+              HasSubstr("SUPERCLASS='Test_Base'"));
 }
 
 TEST_F(CimXmlTest, Qualifiers) {
