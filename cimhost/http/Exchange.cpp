@@ -1,5 +1,7 @@
 #include "cimhost/http/Exchange.h"
 
+#include <malloc.h>
+
 namespace cimhost {
 
 namespace {
@@ -9,7 +11,8 @@ using Clock = std::chrono::steady_clock;
 constexpr int kUnavailable = 503;
 // All bodies together may take this many times what one may.
 constexpr std::size_t kBodiesAtOnce = 8;
-// A body up to this size is read although nobody wants it, so that the connection stays usable.
+// A body up to this size is read although nobody wants it, so that the connection stays usable, and
+// leaves no memory behind that is worth giving back.
 constexpr std::size_t kSmallBody = 64U << 10U;
 
 Rejection unauthorized(const std::string& reason) {
@@ -143,6 +146,10 @@ void Exchange::run() {
   if (!pipe_.isOver()) {
     if (!authenticate()) return;
     summary_ = services_.handler(request_, pipe_);
+    // What reading it took would stay with the thread: ten times as much as the body has.
+    const bool large = request_.body().size() > kSmallBody;
+    releaseBody();
+    if (large) malloc_trim(0);
   }
   pipe_.finish();
 }

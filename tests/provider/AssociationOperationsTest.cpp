@@ -53,9 +53,9 @@ TEST_F(AssociationOperations, UnmatchedClassesAreNotSupported) {
                                                   {kItemA, "T_Link", "T_Volume"},
                                                   {kItemA, "T_Link", "T_Item"}};
   const std::string text = "CommonProvider::associatorNames";
-  for (const auto& [object, association, result] : kRequests) {
-    EXPECT_EQ(refusal([&] { associatorNames(object, association, result); }), text) << object;
-    EXPECT_EQ(refusal([&] { associators(object, association, result); }), text) << object;
+  for (const auto& each : kRequests) {
+    EXPECT_EQ(refusal([&] { associatorNames(each[0], each[1], each[2]); }), text) << each[0];
+    EXPECT_EQ(refusal([&] { associators(each[0], each[1], each[2]); }), text) << each[0];
   }
 }
 
