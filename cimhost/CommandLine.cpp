@@ -34,8 +34,10 @@ struct FormatRow {
   OutputFormat format;
 };
 
-constexpr FormatRow kFormats[] = {
-    {"table", OutputFormat::table}, {"mof", OutputFormat::mof}, {"json", OutputFormat::json}};
+constexpr FormatRow kFormats[] = {{"table", OutputFormat::table},
+                                  {"mof", OutputFormat::mof},
+                                  {"json", OutputFormat::json},
+                                  {"xml", OutputFormat::xml}};
 
 // The texts as given, before they become CIM names.
 struct Arguments {
@@ -198,7 +200,7 @@ void addGlobalOptions(CLI::App& app, CommandLine& line, Arguments& arguments) {
   app.add_option("--provider", line.providerFile, "Provider library instead of the one found")
       ->type_name("FILE");
   app.add_option("--format", arguments.format, "How results are printed; default: table")
-      ->check(CLI::IsMember({"table", "mof", "json"}))
+      ->check(CLI::IsMember({"table", "mof", "json", "xml"}))
       ->type_name("FORMAT");
   app.add_flag("--trace", line.trace, "Show the provider's trace lines on standard error");
 }

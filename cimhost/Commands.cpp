@@ -213,7 +213,7 @@ int runCommand(const CommandLine& line, const Host& host, std::ostream& out, std
   if (line.command == Command::registration) return runRegistration(line, host, out, error);
   print(host.diagnostics(), error);
   if (line.command == Command::qualifiers) return runQualifiers(line, host, out, error);
-  CommandWriter writer(makeResultWriter(line.format, out, formOf(line.command)),
+  CommandWriter writer(makeResultWriter(line.format, out, formOf(line.command), line.method),
                        host.operations().hostName());
   OperationStatus status;
   try {

@@ -54,12 +54,14 @@ std::unique_ptr<ResultWriter> makeMofWriter(std::ostream& out) {
 }
 
 std::unique_ptr<ResultWriter> makeResultWriter(OutputFormat format, std::ostream& out,
-                                               ResultForm form) {
+                                               ResultForm form, const std::string& method) {
   switch (format) {
     case OutputFormat::mof:
       return makeMofWriter(out);
     case OutputFormat::json:
       return makeJsonWriter(out, form);
+    case OutputFormat::xml:
+      return makeXmlWriter(out, method);
     case OutputFormat::table:
       break;
   }

@@ -4,10 +4,11 @@
 
 #include <memory>
 #include <ostream>
+#include <string>
 
 namespace cimhost {
 
-enum class OutputFormat { table, mof, json };
+enum class OutputFormat { table, mof, json, xml };
 
 /// Prints what an operation delivers. UTF-8 whatever the data; nothing is printed before the first
 /// object or finish(). One result kind per writer.
@@ -29,7 +30,10 @@ enum class ResultForm { list, single };
 std::unique_ptr<ResultWriter> makeTableWriter(std::ostream& out, ResultForm form);
 std::unique_ptr<ResultWriter> makeMofWriter(std::ostream& out);
 std::unique_ptr<ResultWriter> makeJsonWriter(std::ostream& out, ResultForm form);
+/// An XML document with the elements of CIM-XML (DSP0201). `method`: the one whose result it will
+/// be, or empty.
+std::unique_ptr<ResultWriter> makeXmlWriter(std::ostream& out, const std::string& method);
 std::unique_ptr<ResultWriter> makeResultWriter(OutputFormat format, std::ostream& out,
-                                               ResultForm form);
+                                               ResultForm form, const std::string& method = "");
 
 }  // namespace cimhost

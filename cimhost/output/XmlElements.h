@@ -33,6 +33,10 @@ inline void appendOptionalAttribute(XmlBuffer& out, std::string_view start,
   out.append("\"");
 }
 
+/// `TYPE` is "PARAMTYPE" or "TYPE": TYPE="uint8", and for objects TYPE="string"
+/// EmbeddedObject="instance". With a blank in front.
+void appendTypeAttributes(XmlBuffer& out, std::string_view attribute, Pegasus::CIMType type);
+
 void appendArraySize(XmlBuffer& out, Pegasus::Uint32 size);
 
 /// PROPERTY, PROPERTY.ARRAY or PROPERTY.REFERENCE.

@@ -263,6 +263,15 @@ void appendInstancePath(XmlBuffer& out, const CIMObjectPath& path) {
   out.append("</INSTANCEPATH>");
 }
 
+void appendReturnValue(XmlBuffer& out, const CIMValue& value) {
+  if (value.isNull()) return;
+  out.append("<RETURNVALUE");
+  appendTypeAttributes(out, "PARAMTYPE", value.getType());
+  out.append(">");
+  appendValue(out, value);
+  out.append("</RETURNVALUE>");
+}
+
 void appendParamValue(XmlBuffer& out, const CIMParamValue& parameter) {
   const CIMValue value = parameter.getValue();
   out.append("<PARAMVALUE NAME=\"");

@@ -17,10 +17,6 @@ namespace cimhost {
 /// VALUE, VALUE.ARRAY, VALUE.REFERENCE or VALUE.REFARRAY; nothing for null.
 void appendValue(XmlBuffer& out, const Pegasus::CIMValue& value);
 
-/// `TYPE` is "PARAMTYPE" or "TYPE": TYPE="uint8", and for objects TYPE="string"
-/// EmbeddedObject="instance". With a blank in front.
-void appendTypeAttributes(XmlBuffer& out, std::string_view attribute, Pegasus::CIMType type);
-
 /// INSTANCE, without its path.
 void appendInstance(XmlBuffer& out, const Pegasus::CIMConstInstance& instance);
 
@@ -46,6 +42,9 @@ void appendQualifier(XmlBuffer& out, const Pegasus::CIMConstQualifier& qualifier
 /// QUALIFIER.DECLARATION; `scope` has the bits of QualifierScope.
 void appendQualifierDeclaration(XmlBuffer& out, const Pegasus::CIMConstQualifier& declaration,
                                 unsigned scope);
+
+/// RETURNVALUE; nothing for null.
+void appendReturnValue(XmlBuffer& out, const Pegasus::CIMValue& value);
 
 /// PARAMVALUE, as in a method's result.
 void appendParamValue(XmlBuffer& out, const Pegasus::CIMParamValue& parameter);

@@ -50,8 +50,8 @@ HttpSettings settingsOf(const ServeOptions& options, const std::string& usersFil
   return settings;
 }
 
-// A large request takes ten times its size for a moment. The system gets it back at once: by default
-// each thread would keep up to 64 MiB.
+// A large request takes ten times its size for a moment. The system gets it back at once: by
+// default each thread would keep up to 64 MiB.
 void keepLittleFreeMemory() {
   constexpr int kEnough = 1 << 20;
   mallopt(M_MMAP_THRESHOLD, kEnough);

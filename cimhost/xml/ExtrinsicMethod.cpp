@@ -22,7 +22,10 @@ class MethodReply final : public MethodResultSink {
 
   bool deliverMethodResult(const CIMValue& returnValue,
                            const Array<CIMParamValue>& parameters) override {
-    if (!returnValue.isNull()) writeReturnValue(returnValue);
+    if (!returnValue.isNull()) {
+      appendReturnValue(writer_.next(), returnValue);
+      writer_.written();
+    }
     for (Uint32 i = 0; i < parameters.size(); ++i) {
       appendParamValue(writer_.next(), parameters[i]);
       if (!writer_.written()) return false;
@@ -31,16 +34,6 @@ class MethodReply final : public MethodResultSink {
   }
 
  private:
-  void writeReturnValue(const CIMValue& value) {
-    XmlBuffer& out = writer_.next();
-    out.append("<RETURNVALUE");
-    appendTypeAttributes(out, "PARAMTYPE", value.getType());
-    out.append(">");
-    appendValue(out, value);
-    out.append("</RETURNVALUE>");
-    writer_.written();
-  }
-
   ReplyWriter& writer_;
 };
 

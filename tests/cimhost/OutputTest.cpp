@@ -14,6 +14,7 @@ namespace {
 
 using namespace cimhost;
 using namespace Pegasus;
+using testing::ContainsRegex;
 using testing::HasSubstr;
 using Json = nlohmann::json;
 
@@ -200,7 +201,14 @@ TEST(Output, PathsAndNames) {
   } cases[] = {
       {OutputFormat::table, "root/demo:Demo_Disk.Name=\"a\"\nDemo_Disk\n"},
       {OutputFormat::mof, "\"root/demo:Demo_Disk.Name=\\\"a\\\"\"\nDemo_Disk\n"},
-      {OutputFormat::json, "[\n\"root/demo:Demo_Disk.Name=\\\"a\\\"\",\n\"Demo_Disk\"\n]\n"}};
+      {OutputFormat::json, "[\n\"root/demo:Demo_Disk.Name=\\\"a\\\"\",\n\"Demo_Disk\"\n]\n"},
+      {OutputFormat::xml,
+       "<?xml version=\"1.0\" encoding=\"utf-8\"?>\n<IRETURNVALUE>\n<VALUE.REFERENCE>"
+       "<LOCALINSTANCEPATH><LOCALNAMESPACEPATH><NAMESPACE NAME=\"root\"/><NAMESPACE NAME=\"demo\"/>"
+       "</LOCALNAMESPACEPATH><INSTANCENAME CLASSNAME=\"Demo_Disk\"><KEYBINDING NAME=\"Name\">"
+       "<KEYVALUE VALUETYPE=\"string\">a</KEYVALUE></KEYBINDING></INSTANCENAME>"
+       "</LOCALINSTANCEPATH></VALUE.REFERENCE>\n<CLASSNAME "
+       "NAME=\"Demo_Disk\"/>\n</IRETURNVALUE>\n"}};
   for (const auto& row : cases) {
     EXPECT_EQ(print(row.format, ResultForm::list,
                     [](ResultWriter& writer) {
@@ -215,6 +223,19 @@ TEST(Output, PathsAndNames) {
   }
 }
 
+TEST(Output, InstancesAsXml) {
+  CIMInstance remote = disk("b");
+  CIMObjectPath path = remote.getPath();
+  path.setHost("h");
+  remote.setPath(path);
+  EXPECT_EQ(printed(OutputFormat::xml, ResultForm::list, {}),
+            "<?xml version=\"1.0\" encoding=\"utf-8\"?>\n<IRETURNVALUE>\n</IRETURNVALUE>\n");
+  const std::string both = printed(OutputFormat::xml, ResultForm::list, {disk("a"), remote});
+  EXPECT_THAT(both, ContainsRegex("\n<VALUE.OBJECTWITHLOCALPATH><LOCALINSTANCEPATH>.*</INSTANCE>"
+                                  "</VALUE.OBJECTWITHLOCALPATH>\n<VALUE.OBJECTWITHPATH>"
+                                  "<INSTANCEPATH>.*</VALUE.OBJECTWITHPATH>\n</IRETURNVALUE>\n$"));
+}
+
 TEST(Output, MethodResults) {
   Array<CIMParamValue> parameters;
   parameters.append(CIMParamValue("Flags", arrayOf({Uint32(1), Uint32(2)})));
@@ -226,6 +247,17 @@ TEST(Output, MethodResults) {
   const auto result = [&](OutputFormat format) {
     return print(format, ResultForm::single, deliver);
   };
+  std::ostringstream xml;
+  const auto writer = makeResultWriter(OutputFormat::xml, xml, ResultForm::single, "Set");
+  deliver(*writer);
+  writer->finish();
+  EXPECT_EQ(xml.str(),
+            "<?xml version=\"1.0\" encoding=\"utf-8\"?>\n<METHODRESPONSE NAME=\"Set\">\n"
+            "<RETURNVALUE PARAMTYPE=\"sint32\"><VALUE>-1</VALUE></RETURNVALUE>"
+            "<PARAMVALUE NAME=\"Flags\" PARAMTYPE=\"uint32\"><VALUE.ARRAY><VALUE>1</VALUE>"
+            "<VALUE>2</VALUE></VALUE.ARRAY></PARAMVALUE><PARAMVALUE NAME=\"Odd\ufffd\" "
+            "PARAMTYPE=\"string\"><VALUE>a\nb</VALUE></PARAMVALUE><PARAMVALUE NAME=\"None\" "
+            "PARAMTYPE=\"string\"></PARAMVALUE>\n</METHODRESPONSE>\n");
   EXPECT_EQ(result(OutputFormat::table),
             "Parameter       Value\n"
             "--------------  ------\n"

@@ -38,7 +38,7 @@ offers 'cimhost en' enumerate
 offers 'cimhost --home home cl' class classes
 offers 'cimhost --home home associator' associators associator-names
 offers 'cimhost --f' --format
-offers 'cimhost --format ' table mof json
+offers 'cimhost --format ' table mof json xml
 offers 'cimhost --format=j' json
 offers 'cimhost --home h' home
 offers 'cimhost --home=h' home
