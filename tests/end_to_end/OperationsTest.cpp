@@ -103,12 +103,12 @@ TEST_F(HostOperations, ModifiedPropertyIsReadBackByAnotherProcess) {
 
 TEST_F(HostOperations, MethodOfTheClassDeliversAnArray) {
   const json systems = enumerate("Host_FileSystem");
-  const std::string type = textOf(systems[0], "FileSystemType");
+  const std::string type = textOf(systems.at(0), "FileSystemType");
   json ofType = json::array();
   for (const json& system : systems) {
     if (textOf(system, "FileSystemType") == type) ofType.push_back(textOf(system, "Name"));
   }
-  const json first = json::array({textOf(systems[0], "Name")});
+  const json first = json::array({textOf(systems.at(0), "Name")});
   const std::tuple<std::string, std::size_t, json> cases[] = {
       {"FileSystemType=" + type, ofType.size(), ofType}, {"Limit=1", systems.size(), first}};
   for (const auto& [input, count, names] : cases) {
