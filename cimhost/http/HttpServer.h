@@ -36,8 +36,9 @@ struct HttpSettings {
 /// Takes CIM operations over HTTP/1.1 (DSP0200, 7): POST and M-POST to any path, and `GET
 /// /healthz`.
 ///
-/// A few threads move bytes and never wait for anything else; requests run on limits.threads
-/// others. Malformed, oversized, slow and unauthorized requests never reach the handler.
+/// Its threads move bytes and run requests, at most limits.threads of these at once, and none that
+/// takes its time keeps others from theirs. Malformed, oversized, slow and unauthorized requests
+/// never reach the handler.
 class HttpServer {
  public:
   /// Listens at once. Throws HostError.

@@ -127,6 +127,24 @@ TEST_F(CimXmlTest, HeadersMayBeWrittenInOtherWays) {
   }
 }
 
+TEST_F(CimXmlTest, ElementsAndAttributesAreLimited) {
+  const auto statusOf = [&](std::size_t count, const std::string& value) {
+    std::string list = "<IPARAMVALUE NAME='PropertyList'><VALUE.ARRAY>";
+    for (std::size_t i = 0; i < count; ++i) list += value;
+    const std::string all =
+        className("ClassName", "Test_Disk") + list + "</VALUE.ARRAY></IPARAMVALUE>";
+    return answer(intrinsic("EnumerateInstances", all)).status;
+  };
+  EXPECT_EQ(statusOf(199900, "<VALUE/>"), 200);
+  EXPECT_EQ(statusOf(200000, "<VALUE/>"), 400);
+  EXPECT_EQ(statusOf(99900, "<VALUE a='1'/>"), 200);
+  EXPECT_EQ(statusOf(100000, "<VALUE a='1'/>"), 400);
+  std::string attributes;
+  for (int i = 0; i < 16; ++i) attributes += " a" + std::to_string(i) + "='1'";
+  EXPECT_EQ(statusOf(1, "<VALUE" + attributes + "/>"), 200);
+  EXPECT_EQ(statusOf(1, "<VALUE" + attributes + " b='1'/>"), 400);
+}
+
 TEST_F(CimXmlTest, OtherEncodingsAndTheUserReachTheOperations) {
   Request latin = intrinsic("EnumerateInstances", className("ClassName", "M\xFCll"));
   replace(latin.text, "utf-8", "ISO-8859-1");
