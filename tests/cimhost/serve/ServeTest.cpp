@@ -266,6 +266,7 @@ TEST(RequestGateTest, ClosingWaitsForThoseInsideAndHoldsTheOthers) {
     const RequestGate::Pass pass(gate);
     ++inside;
   });
+  std::this_thread::sleep_for(std::chrono::milliseconds(50));
   EXPECT_EQ(inside, 0);
   gate.open();
   late.join();
