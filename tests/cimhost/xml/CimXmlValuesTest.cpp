@@ -223,8 +223,6 @@ TEST_F(Parameters, WrongOnesAreRefused) {
 
 TEST_F(CimXmlTest, MethodResults) {
   const auto invoke = [this](const char* method) { return answer(extrinsic(method, "")).result(); };
-  EXPECT_EQ(invoke("Nothing"), "") << "a null return value";
-  EXPECT_EQ(invoke("ThrowsCim"), "<ERROR CODE='2' DESCRIPTION='not for you'/>");
   EXPECT_THAT(invoke("1x"), StartsWith("<ERROR CODE='4'"));
   const Reply reply = answer(extrinsic("Format", ""));
   EXPECT_THAT(reply.body, testing::HasSubstr("<METHODRESPONSE NAME=\"Format\">\n<RETURNVALUE"));
