@@ -34,20 +34,6 @@ class Debug : public testing::Test {
 
 }  // namespace
 
-TEST_F(Debug, WritesWhatTheLevelAllows) {
-  const std::pair<const char*, const char*> cases[] = {
-      {"0", ""},       {"1", "1\n"},       {"6", "1\n"},
-      {"7", "1\n7\n"}, {"8", "1\n7\n8\n"}, {"9", "1\n7\n8\n9\n"},
-  };
-  for (const auto& [level, expected] : cases) {
-    tree_.setLogLevel(level);
-    forgetLogConfiguration();
-    logAll();
-    EXPECT_EQ(tree_.log(), expected) << level;
-    std::filesystem::remove(tree_.logs() / "CommonProvider.log");
-  }
-}
-
 TEST_F(Debug, ReadsTheLevelAsADecimalNumber) {
   const std::pair<std::string, int> cases[] = {
       {"LogLevel=+7", 7},

@@ -1,4 +1,4 @@
-// Which operation a call's arguments choose, and the properties, methods and classes on top of it.
+// Which operation a call's arguments choose, and the instances that a class counts.
 
 #include "engine/ProviderDefClass.h"
 #include "tests/engine/RecorderTest.h"
@@ -51,7 +51,6 @@ class FunctionCall : public RecorderTest {
 
 const Case kGetCases[] = {
     {"getI", "", "0 11", true},
-    {"getIi", kIndex, "0 11", true, 4},
     {"getLi", kNumber, "6 12", true, 9},
     {"getIi", kQuery, "0 11", true, 0},
     {"getI", kInput, "1 Not Supported", false},
@@ -64,8 +63,6 @@ const Case kGetCases[] = {
 
 const Case kSetCases[] = {
     {"setI", "", "0 11", true},
-    {"setIi", kIndex, "0 11", true, 4},
-    {"setSi", kNumber, "0 11", true, 9},
     {"setIi", kInput, "0 0", false},
     {"setIi", kOutput, "0 0", false},
     {"setIv", kIndex + kText, "0 11", true, 0, "", kFour + kSeven},
@@ -74,7 +71,6 @@ const Case kSetCases[] = {
 
 const Case kExecCases[] = {
     {"execA", "", "0 11", true},
-    {"execAi", kIndex, "0 11", true, 4},
     {"execAw", kText, "0 11", true, 0, "seven"},
     {"execB", kInput, "0 11", true},
     {"execC", kOutput, "0 11", true},
@@ -82,8 +78,6 @@ const Case kExecCases[] = {
     {"execB", kInput + kInput, "0 0", false},
     {"execC", kOutput + kOutput, "0 0", false},
     {"execBi", kInput + kIndex, "0 11", true, 4},
-    {"execBw", kText + kInput, "0 11", true, 0, "seven"},
-    {"execCi", kInput + kOutput + kIndex, "0 11", true, 4},
     {"execCi", kOutput + kIndex, "0 11", true, 4},
     {"execBi", kInput + kOutput + kIndex, "0 99", false},
     {"execB", kIndex + kIndex, "0 0", false},
@@ -123,14 +117,6 @@ TEST_F(FunctionCall, GetValueWithoutIndexIgnoresTheArguments) {
   EXPECT_EQ(call("getIi", kIndex).getValue(), 0);
 }
 
-TEST_F(FunctionCall, ExecHandsInputsInAndOutputsOut) {
-  answer(words({0, 5, 99}));
-  Values outputs{1};
-  EXPECT_EQ(call("execCi", kIndex + kInput + kOutput).exec(Values{9}, outputs, 4), 11);
-  EXPECT_EQ(trimmed(recorder_->in), kNine + "\x63");
-  EXPECT_EQ(valueText(outputs), "0 1; 0 5; ");
-}
-
 TEST_F(FunctionCall, NestedCallsAreEvaluatedFirstWithTheSameIndex) {
   answer(words({77, 1, 77, 7}));
   const std::string inner = callText("alltypes", "getAIi", "getAIi", kIndex);
@@ -138,48 +124,15 @@ TEST_F(FunctionCall, NestedCallsAreEvaluatedFirstWithTheSameIndex) {
   EXPECT_EQ(recorder_->calls, 2);
   EXPECT_EQ(recorder_->number, 4);
   EXPECT_EQ(trimmed(recorder_->extra), trimmed(words({2, 1, 0, 7})));
-
-  const std::string deep = callText("alltypes", "getIi", "getIi",
-                                    element(callText("alltypes", "getIi", "getIi", kIndex)));
-  EXPECT_EQ(valueText(call("getLi", element(deep)).getValue(4)), "6 12");
-  EXPECT_EQ(recorder_->calls, 5);
-  EXPECT_EQ(recorder_->number, 11);
 }
 
-TEST_F(FunctionCall, PropertiesUseTheirSidesOrConstants) {
-  const auto property = [](const std::string& get, const std::string& set) {
-    return fromText<ProviderDefProperty>("<property name=\"P\"><get>" + get + "</get>" + set +
-                                         "</property>");
-  };
-  const std::string constant = "<constant type=\"string\">fixed</constant>";
-  const auto fixed = property(constant, "");
-  EXPECT_EQ(valueText(fixed.getValue(0)), "1 fixed");
-  EXPECT_EQ(fixed.setValue(5, 0), 0);
-  EXPECT_EQ(recorder_->calls, 0);
-
-  const auto called = property(callText("alltypes", "getIi", "getIi", kIndex),
-                               "<set>" + callText("alltypes", "setIi", "setIi", kIndex) + "</set>");
-  EXPECT_EQ(valueText(called.getValue(3)), "0 11");
-  EXPECT_EQ(recorder_->number, 3);
-  EXPECT_EQ(called.setValue(5, 2), 11);
-  EXPECT_EQ(recorder_->value, 5);
-  EXPECT_EQ(recorder_->number, 2);
-}
-
-TEST_F(FunctionCall, ClassesCountTheirInstancesAndMethodsHandOn) {
-  const auto counted = fromText<ProviderDefClass>(
-      "<class name=\"C\" namespace=\"root\"><instances>" + callText("alltypes", "getI", "getI") +
-      "</instances><method name=\"M\">" +
-      callText("alltypes", "execBi", "execBi", kIndex + kInput) + "</method></class>");
+TEST_F(FunctionCall, ClassesCountTheirInstances) {
+  const auto counted =
+      fromText<ProviderDefClass>("<class name=\"C\" namespace=\"root\"><instances>" +
+                                 callText("alltypes", "getI", "getI") + "</instances></class>");
   for (const int count : {0, 5, -1, kMaxInstances, kMaxInstances + 1}) {
     recorder_->result = count;
     EXPECT_EQ(counted.getNumberOfInstances(), count);
     EXPECT_EQ(boundedNumberOfInstances(counted), std::min(count, 1000000));
   }
-  Values outputs;
-  recorder_->result = 6;
-  ASSERT_NE(counted.getMethod("M"), nullptr);
-  EXPECT_EQ(counted.getMethod("M")->exec(Values{9}, outputs, 4), 6);
-  EXPECT_EQ(recorder_->number, 4);
-  EXPECT_EQ(counted.getMethod("m"), nullptr);
 }

@@ -36,19 +36,6 @@ TEST_F(Registry, NotesAMissOnStandardOutputAtLevel9) {
   EXPECT_EQ(tree_.log(), "");
 }
 
-TEST_F(Registry, ReplacesModulesFromAPositionOn) {
-  ProviderDefModule* from = &module("a");
-  ProviderDefModule* to = &module("b");
-  for (int i = 0; i < 3; ++i) {
-    registerFunction(std::make_unique<ProviderDefFunction>("f", 100, i == 1 ? to : from));
-  }
-  ProviderDefFunction* first = getFunction("f");
-  ProviderDefFunction* last = &function("a", "last", "getI");
-  replaceModule(from, to, 1);
-  EXPECT_EQ(first->getModule(), from);
-  EXPECT_EQ(last->getModule(), to);
-}
-
 TEST_F(Registry, AFunctionWhoseModuleIsGoneCannotBeLoaded) {
   ProviderDefFunction orphan("size", 100, nullptr);
   EXPECT_EQ(errorOf([&] { orphan.get(); }), "Couldn't load function size");

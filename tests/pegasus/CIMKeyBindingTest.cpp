@@ -44,8 +44,6 @@ TEST(CIMKeyBinding, ComparesByType) {
   expectEquality(kString, false, {{"abc", "ABC"}, {"1", "01"}});
   expectEquality(kReference, true, {{"root/demo:A.k=\"v\"", "ROOT/DEMO:a.K=\"v\""}});
   expectEquality(kReference, true, {{"A.a=1,b=2", "A.b=2,a=0x1"}, {"not a path!", "not a path!"}});
-  expectEquality(kReference, true, {{"C.r=\"A.a=1,b=2\"", "C.r=\"a.B=2,A=0x1\""}});
-  expectEquality(kReference, false, {{"A.k=\"v\"", "A.k=\"V\""}, {"root:A.k=1", "A.k=1"}});
   expectEquality(kReference, false, {{"//h/root:A.k=1", "root:A.k=1"}, {"A.a=1", "not a path!"}});
   const CIMKeyBinding key("Key", "1", kNumeric);
   EXPECT_FALSE(key == CIMKeyBinding("Key", "1", kString));
@@ -55,10 +53,6 @@ TEST(CIMKeyBinding, ComparesByType) {
 TEST(CIMKeyBinding, TakesTypeAndTextFromAValue) {
   const std::tuple<CIMValue, CIMKeyBinding::Type, std::string> cases[] = {
       {Boolean(true), kBoolean, "TRUE"},
-      {Uint8(5), kNumeric, "5"},
-      {2.9f, kNumeric, "2.9000000953674316e+00"},
-      {Char16('A'), kString, "A"},
-      {CIMDateTime(), kString, "00000000000000.000000:000"},
       {CIMObjectPath(String("root/demo:B.z=1,a=\"x\"")), kReference, "root/demo:B.a=\"x\",z=1"},
       {CIMValue(CIMTYPE_UINT32, false), kNumeric, ""},
       {CIMValue(CIMTYPE_REFERENCE, false), kReference, ""},
@@ -77,26 +71,19 @@ TEST(CIMKeyBinding, TakesTypeAndTextFromAValue) {
 
 TEST(CIMKeyBinding, ReadsItsTextAsTheTypeOfAValue) {
   const std::tuple<const char*, CIMKeyBinding::Type, CIMValue, bool> cases[] = {
-      {"true", kBoolean, Boolean(true), true},
       {"1", kBoolean, Boolean(true), false},
       {"0x10", kNumeric, Uint8(16), true},
-      {"256", kNumeric, Uint8(0), false},
-      {"-128", kNumeric, Sint8(-128), true},
       {"-129", kNumeric, Sint8(127), false},
       {"18446744073709551615", kNumeric, Uint64(-1), true},
       {"18446744073709551616", kNumeric, Uint64(0), false},
       {"", kNumeric, Uint32(0), false},
-      {"", kNumeric, 0.0, false},
       {".05", kNumeric, 0.05, true},
       {"+1.5E+2", kNumeric, 150.0f, true},
       {"1", kNumeric, 1.0, false},
-      {"1.", kNumeric, 1.0, false},
       {"1e0", kNumeric, 1.0, false},
-      {"1.5e", kNumeric, 1.5, false},
       {" 1.5", kNumeric, 1.5, false},
       {"1.5e400", kNumeric, HUGE_VAL, false},
       {"AB", kString, Char16('A'), true},
-      {"", kString, Char16(0), true},
       {"a", kString, String("A"), false},
       {"00000000000000.000000:000", kString, CIMDateTime(), true},
       {"no date", kString, CIMDateTime(), false},

@@ -62,7 +62,6 @@ TEST(CIMObjectPath, RefusesMalformedText) {
   const std::string pair = "invalid key-value pair, ";
   const std::pair<const char*, std::string> cases[] = {
       {"", "class name  not a legal CIM name"},
-      {"root:", "class name  not a legal CIM name"},
       {"A\xC3\xA9-.k=1", "class name A\xC3\xA9- not a legal CIM name"},
       {":A", "invalid namespace name"},
       {"a b:A", "invalid namespace name"},
@@ -98,7 +97,6 @@ TEST(CIMObjectPath, RefusesMalformedText) {
       {R"(A.b="x\)", pair + "malformed value"},
       {"A.b=1, a=2", pair + "invalid key name: a"},
       {"A.1b=\"x\"", pair + "invalid key name:1b"},
-      {"A.B.C=1", pair + "invalid key name:B.C"},
       {"A.b=1,,c=2", pair + "invalid key name:,c"},
   };
   for (const auto& [given, reason] : cases) {

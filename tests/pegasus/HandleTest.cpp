@@ -1,4 +1,4 @@
-// Handles share, clones do not. CloneModelTest.cpp holds qualifiers to the same at random.
+// Handles share, clones do not.
 #include <Pegasus/Common/CIMClass.h>
 #include <Pegasus/Common/CIMParamValue.h>
 
@@ -97,6 +97,25 @@ TEST(Clones, AHandleFromAfterTheCloneChangesItsSideOnly) {
     EXPECT_TRUE(other.identical(makeClass()));
     EXPECT_FALSE(changed.identical(other));
   }
+}
+
+// The handle and all its containers see the change, the clone of one of them does not.
+TEST(Clones, AHandleFromBeforeTheCloneStaysInItsContainers) {
+  CIMClass one = makeClass(), two = makeClass();
+  CIMQualifier shared(CIMName("shared"), Uint32(1));
+  CIMProperty first = one.getProperty(0), second = two.getProperty(0);
+  first.addQualifier(shared);
+  second.addQualifier(shared);
+  const CIMClass clone = one.clone();
+  shared.setValue(Uint32(2));
+  one.getProperty(0).getQualifier(2).setValue(Uint32(number(shared) + 1));
+  EXPECT_EQ(number(two.getProperty(0).getQualifier(2)), 3u);
+  EXPECT_EQ(number(clone.getProperty(0).getQualifier(2)), 1u);
+  two.clone();  // gone at once
+  CIMQualifier own = two.getQualifier(0);
+  const CIMClass later = two.clone();
+  own.setValue(Uint32(2));
+  EXPECT_EQ(number(later.getQualifier(0)), 1u);
 }
 
 /// Changes every kind of element of a clone; true when the result is as expected.

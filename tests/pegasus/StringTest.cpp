@@ -1,10 +1,8 @@
 #include <Pegasus/Common/String.h>
 
 #include <sstream>
-#include <thread>
 #include <tuple>
 #include <utility>
-#include <vector>
 
 #include "PegasusText.h"
 
@@ -165,22 +163,6 @@ TEST(String, HoldsLongText) {
   EXPECT_EQ(text(str), longText + "\xE2\x82\xAC");
   EXPECT_THROW(str.reserveCapacity(0xFFFFFFF0u), std::bad_alloc);
   EXPECT_EQ(str.size(), longText.size() + 1);
-}
-
-TEST(String, IsSharedBetweenThreads) {
-  const String shared("shared text");
-  std::vector<std::thread> threads;
-  for (int t = 0; t < 4; ++t) {
-    threads.emplace_back([&shared] {
-      for (int i = 0; i < 2000; ++i) {
-        String copy(shared);
-        copy.append(Char16('!'));
-        ASSERT_EQ(copy.size(), shared.size() + 1);
-      }
-    });
-  }
-  for (std::thread& thread : threads) thread.join();
-  EXPECT_EQ(text(shared), "shared text");
 }
 
 }  // namespace

@@ -5,7 +5,6 @@ commonprovider_test(pegasus_objects_test
   SOURCES
     "$<$<STREQUAL:${CIM_API},embedded>:${embedded_only}>"
     CIMValueTest.cpp
-    CloneModelTest.cpp
     HandleTest.cpp
     ObjectRulesTest.cpp
     OperationContextTest.cpp
